@@ -1,0 +1,22 @@
+#ifndef TARVO_EXPORT_H
+#define TARVO_EXPORT_H
+
+// What every header of the library begins with: the marks of an exported class and of
+// its members that stay hidden, and the short names
+// of the types that all interfaces pass.
+
+#include <vector>
+
+#include "Port_StringBase.h"
+
+#define TARVO_EXPORT __attribute__((visibility("default")))
+#define TARVO_LOCAL __attribute__((visibility("hidden")))
+
+namespace Tarvo {
+
+using StringBase = Port::StringBase<char>;
+using StringList = std::vector<StringBase>;
+
+}  // namespace Tarvo
+
+#endif

@@ -1,0 +1,124 @@
+#ifndef TARVO_GUARD_H
+#define TARVO_GUARD_H
+
+#include <array>
+#include <cstddef>
+#include <exception>
+#include <string_view>
+#include <tuple>
+#include <type_traits>
+
+#include "Tarvo_Report.h"
+
+// The boundary of the exported operations: nothing thrown behind it reaches a caller. Each guarded
+// operation is one row of an output, a failure and the work:
+//
+//     return Guard(list, Failure(kModule, "Unable to list ports for IP %s\n%s\n", key),
+//                  [&] { list = parser.ListPorts(); });
+namespace Tarvo {
+
+// What a failure's literal ends in; its "%s" stands for the text of the exception.
+constexpr std::string_view kFailureTail = "\n%s\n";
+
+// What becomes of that tail when something arrives that has no text.
+enum class WithoutText {
+  SaysUnknown,  // ", unknown exception\n"
+  IsCutOff      // "\n"
+};
+
+// A literal for these arguments and the tail, and the line it stands at.
+template <class... Arguments>
+struct FailureFormat {
+  static constexpr std::size_t kLongest = 128;
+
+  template <std::size_t Size>
+  consteval FailureFormat(const char (&literal)[Size], int sourceLine = __builtin_LINE())
+      : whole(literal, sourceLine) {
+    static_assert(Size <= kLongest);
+    if (!std::string_view(literal).ends_with(kFailureTail)) throw "a failure ends in its tail";
+  }
+
+  Report::Format<Arguments..., const char*> whole;
+};
+
+// What an operation reports when it fails. Refers to its arguments, so it lives no longer than the
+// statement that makes it.
+template <class... Arguments>
+class Failure {
+ public:
+  Failure(const Report::Module& issuer, FailureFormat<std::type_identity_t<Arguments>...> literal,
+          const Arguments&... values)
+      : module(issuer), format(literal.whole), arguments(values...) {}
+
+  Failure WithoutExceptionText(WithoutText form) const {
+    Failure copy = *this;
+    copy.withoutText = form;
+    return copy;
+  }
+
+  void Issue(const char* exceptionText) const noexcept {
+    std::apply(
+        [&](const auto&... values) {
+          module.template Error<Arguments..., const char*>(format, values..., exceptionText);
+        },
+        arguments);
+  }
+
+  void IssueUnknown() const noexcept {
+    constexpr std::string_view unknown = ", unknown exception\n";
+    const std::string_view tail = withoutText == WithoutText::IsCutOff ? "\n" : unknown;
+    const std::string_view head(format.text,
+                                std::string_view(format.text).size() - kFailureTail.size());
+    std::array<char, FailureFormat<Arguments...>::kLongest + unknown.size()> companion{};
+    tail.copy(companion.data() + head.copy(companion.data(), head.size()), tail.size());
+    std::apply(
+        [&](const auto&... values) { module.IssueError(format.line, companion.data(), values...); },
+        arguments);
+  }
+
+ private:
+  const Report::Module& module;
+  Report::Format<Arguments..., const char*> format;
+  std::tuple<const Arguments&...> arguments;
+  WithoutText withoutText = WithoutText::SaysUnknown;
+};
+
+// Outputs of guarded operations, and how they are cleared.
+struct NoOutput {};
+inline void Clear(NoOutput /*none*/) noexcept {}
+inline void Clear(StringBase& text) noexcept { text.Empty(); }
+inline void Clear(StringList& list) noexcept { list.clear(); }
+
+// Clears the output and does the work. If the work throws, clears the output again and issues the
+// failure. True when the work came to its end, or what it returned if it returns a bool.
+template <class Output, class FailureType, class Work>
+bool Guard(Output&& output, const FailureType& failure, const Work& work) noexcept {
+  Clear(output);
+  try {
+    if constexpr (std::is_same_v<decltype(work()), bool>) {
+      return work();
+    } else {
+      work();
+      return true;
+    }
+  } catch (const std::exception& exception) {
+    Clear(output);
+    failure.Issue(exception.what());
+  } catch (...) {
+    Clear(output);
+    failure.IssueUnknown();
+  }
+  return false;
+}
+
+// The text that the work gives, or the empty text with the failure issued.
+template <class FailureType, class Work>
+StringBase GuardText(const FailureType& failure, const Work& work) noexcept {
+  StringBase text;
+  Guard(text, failure, [&] { text = work(); });
+  return text;
+}
+
+}  // namespace Tarvo
+
+#endif
