@@ -1,0 +1,102 @@
+#include "Tarvo_Kel_Key.h"
+
+#include <tuple>
+#include <utility>
+
+#include "Port_Regexp.h"
+
+namespace Tarvo {
+
+namespace {
+
+const char* const kVersionSuffix = "[_][vV][0-9]+[_][0-9][0-9][_][a-zA-Z]$";
+
+// The range of the version suffix. A text that goes on behind a NUL byte, where the expression sees
+// its end, has none.
+Port_Range FindSuffix(const StringBase& text) {
+  const Port_Range match = Port_Regexp(kVersionSuffix).GetRangeOfMatch(text, 0);
+  return match.IsEmpty() || match.last + 1 == text.GetLength() ? match : Port_Range();
+}
+
+}  // namespace
+
+Kel_Key::Kel_Key() = default;
+
+Kel_Key::Kel_Key(const StringBase& text) { valid = ExtractVersion(text); }
+
+Kel_Key::Kel_Key(const Kel_Key&) = default;
+
+Kel_Key::Kel_Key(Kel_Key&&) noexcept = default;
+
+Kel_Key& Kel_Key::operator=(const Kel_Key&) = default;
+
+Kel_Key& Kel_Key::operator=(Kel_Key&&) noexcept = default;
+
+Kel_Key::~Kel_Key() = default;
+
+// The text may be a part of this key, so it is read to the end before anything changes.
+bool Kel_Key::ExtractVersion(const StringBase& text) {
+  const Port_Range suffix = FindSuffix(text);
+  const bool onlySuffix = !suffix.IsEmpty() && suffix.first == 0;
+  if (!onlySuffix) valid = !suffix.IsEmpty() && ReadSuffix(text, suffix);
+  if (!valid) BecomeBareName(text);
+  return valid;
+}
+
+// From the suffix's first character: "_", "v", the major digits, "_", two minor digits, "_",
+// letter. False, with nothing changed, for a number that does not fit.
+bool Kel_Key::ReadSuffix(const StringBase& text, const Port_Range& suffix) {
+  unsigned int majorNumber = 0;
+  unsigned int minorNumber = 0;
+  if (!text.GetUINT32({suffix.first + 2, suffix.last - 5}, &majorNumber) ||
+      !text.GetUINT32({suffix.last - 3, suffix.last - 2}, &minorNumber)) {
+    return false;
+  }
+  StringBase base = text.Extract({0, suffix.first - 1});
+  StringBase lowered = text.Extract({suffix.first + 1, suffix.last});
+  lowered.MakeLower();
+  key = StringBase::doFormat("%s_%s", base.GetText(), lowered.GetText());
+  name = std::move(base);
+  major = majorNumber;
+  minor = minorNumber;
+  revision = lowered.Extract({lowered.GetLength() - 1, lowered.GetLength() - 1});
+  version = StringBase::doFormat("%u.%02u.%s", major, minor, revision.GetText());
+  return true;
+}
+
+void Kel_Key::BecomeBareName(const StringBase& text) {
+  key = text;
+  name = text;
+  version.Empty();
+  major = 0;
+  minor = 0;
+  revision.Empty();
+}
+
+bool Kel_Key::IsValid() const { return valid; }
+
+const StringBase& Kel_Key::GetKey() const { return key; }
+
+const StringBase& Kel_Key::GetName() const { return name; }
+
+const StringBase& Kel_Key::GetVersion() const { return version; }
+
+const StringBase& Kel_Key::GetRevision() const { return revision; }
+
+unsigned int Kel_Key::GetMajorVersion() const { return major; }
+
+unsigned int Kel_Key::GetMinorVersion() const { return minor; }
+
+bool Kel_Key::operator==(const Kel_Key& other) const { return key == other.key; }
+
+bool Kel_Key::operator!=(const Kel_Key& other) const { return key != other.key; }
+
+bool Kel_Key::operator<(const Kel_Key& other) const {
+  if (version.GetLength() == 0) return false;
+  if (other.version.GetLength() == 0) return true;
+  return std::tie(major, minor, revision) < std::tie(other.major, other.minor, other.revision);
+}
+
+bool Kel_Key::operator>(const Kel_Key& other) const { return other < *this; }
+
+}  // namespace Tarvo
