@@ -1,0 +1,96 @@
+#ifndef TARVO_KEL_INDEX_H
+#define TARVO_KEL_INDEX_H
+
+#include <cstddef>
+#include <map>
+#include <unordered_map>
+#include <utility>
+
+#include "Port_FileName.h"
+#include "Tarvo_Export.h"
+#include "Tarvo_Kel_Key.h"
+
+namespace Tarvo {
+
+// The catalogue of what repositories hold: for each core its versions, newest first, each with the
+// directory that it lies in (its location) and, if its core description exists, its options.
+//
+// A key that is not valid stands for a bare core name: lookups answer for that core's newest
+// version. A valid key is found only as that very version.
+//
+// Lookups that find nothing throw AppException with level NotFound; nothing is caught here. Any
+// operation that stores or builds text may throw std::bad_alloc.
+//
+// Lifetime: instances and parsers made from an index keep a reference to it, so it must outlive
+// them. Threads: for one at a time.
+class TARVO_EXPORT Kel_Index {
+ public:
+  // The layout of a repository, REPOSITORY/ipmods/KEY/..., where KEY names a version directory:
+  //
+  //     data/NAME_v2_1_0.qvr   core description      hdl/vhdl/      VHDL sources
+  //     data/NAME_v2_1_0.ldx   analyse order         hdl/verilog/   Verilog sources
+  //     data/NAME_v2_1_0.tew   black-box list        netlist/       netlists
+  //
+  // NAME is the core's base name, and `_v2_1_0` the version of the family of data files, the same
+  // for every core.
+  static const StringBase KEL_VERSION;
+  static const StringBase KEL_QVR_EXTENSION;
+  static const StringBase KEL_LDX_EXTENSION;
+  static const StringBase KEL_TEW_EXTENSION;
+  static const StringBase KEL_DATA_SUBDIRECTORY;
+  static const StringBase KEL_NETLIST_SUBDIRECTORY;
+  static const StringBase KEL_HDL_SUBDIRECTORY;
+  static const StringBase KEL_VHDL_SUBDIRECTORY;
+  static const StringBase KEL_VERILOG_SUBDIRECTORY;
+
+  // The name of a version's data file with that extension. Whether it exists is not asked.
+  static Port::FileName GetDataFile(const Port::FileName& location, const Kel_Key& key,
+                                    const StringBase& extension);
+
+  // An empty index.
+  Kel_Index();
+  ~Kel_Index();
+  Kel_Index(const Kel_Index&) = delete;
+  Kel_Index& operator=(const Kel_Index&) = delete;
+
+  // Adds a version. False, with an error issued and nothing changed, for an invalid key or a
+  // location that does not exist. The first location added for a key wins: adding it again gives
+  // true and changes nothing. Of keys that differ in text but not in version, such as `abc_v1_00_a`
+  // and `abc_v01_00_a`, the one added later stands in front.
+  bool AddIP(const Kel_Key& key, const Port::FileName& location);
+
+  // Empties the index.
+  void ClearIP();
+
+  // Among the versions with a core description: the number of cores, and of versions.
+  unsigned int GetBaseIPCount() const;
+  unsigned int GetFullIPCount() const;
+
+  // The directory of a version, and its key as it was added. Versions without a core description
+  // are found too. Throw AppException.
+  Port::FileName GetIPLocation(const Kel_Key& key) const;
+  Kel_Key GetIPKey(const Kel_Key& key) const;
+
+ private:
+  using Options = std::vector<std::pair<StringBase, StringBase>>;
+
+  struct NewestFirst {
+    bool operator()(const Kel_Key& left, const Kel_Key& right) const { return right < left; }
+  };
+  struct NameHash {
+    TARVO_LOCAL std::size_t operator()(const StringBase& name) const noexcept;
+  };
+  // By base name, the versions of that core. No list is ever empty.
+  template <class Value>
+  using Table =
+      std::unordered_map<StringBase, std::multimap<Kel_Key, Value, NewestFirst>, NameHash>;
+
+  TARVO_LOCAL bool AddIPOptions(const Kel_Key& key, const Port::FileName& location);
+
+  Table<Port::FileName> locations;
+  Table<Options> options;
+};
+
+}  // namespace Tarvo
+
+#endif

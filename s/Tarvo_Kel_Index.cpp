@@ -1,0 +1,153 @@
+#include "Tarvo_Kel_Index.h"
+
+#include <algorithm>
+#include <boost/filesystem.hpp>
+#include <cstdint>
+
+#include "Tarvo_Report.h"
+
+namespace Tarvo {
+
+using Port::FileName;
+
+const StringBase Kel_Index::KEL_VERSION = "_v2_1_0";
+const StringBase Kel_Index::KEL_QVR_EXTENSION = "qvr";
+const StringBase Kel_Index::KEL_LDX_EXTENSION = "ldx";
+const StringBase Kel_Index::KEL_TEW_EXTENSION = "tew";
+const StringBase Kel_Index::KEL_DATA_SUBDIRECTORY = "data";
+const StringBase Kel_Index::KEL_NETLIST_SUBDIRECTORY = "netlist";
+const StringBase Kel_Index::KEL_HDL_SUBDIRECTORY = "hdl";
+const StringBase Kel_Index::KEL_VHDL_SUBDIRECTORY = "vhdl";
+const StringBase Kel_Index::KEL_VERILOG_SUBDIRECTORY = "verilog";
+
+namespace {
+
+constexpr Report::Module kModule{"s/Tarvo_Kel_Index", "1.0"};
+
+constexpr std::size_t kBucketHint = 100;
+
+// What can't be asked for, as behind a directory without permission, counts as missing.
+bool Exists(const FileName& location) {
+  boost::system::error_code error;
+  return boost::filesystem::exists(location.GetName().GetText(), error);
+}
+
+// The entry of this very key: entries of equal versions stand together.
+template <class Versions>
+auto FindKey(Versions& versions, const Kel_Key& key) {
+  const auto [first, last] = versions.equal_range(key);
+  const auto found =
+      std::find_if(first, last, [&](const auto& entry) { return entry.first == key; });
+  return found == last ? versions.end() : found;
+}
+
+// The entry that a key stands for, or null.
+template <class Table>
+auto Find(const Table& table, const Kel_Key& key) {
+  const typename Table::mapped_type::value_type* entry = nullptr;
+  const auto core = table.find(key.GetName());
+  if (core == table.end()) return entry;
+  const auto& versions = core->second;
+  const auto found = key.IsValid() ? FindKey(versions, key) : versions.begin();
+  if (found != versions.end()) entry = &*found;
+  return entry;
+}
+
+// Adds the entry, in front of the entries of equal versions, unless its key is there already. Gives
+// the entry of that key and whether it is new. A new list enters the table with its first entry in
+// it, so that none is empty when memory runs out between.
+template <class Table, class Value>
+auto Insert(Table& table, const Kel_Key& key, const Value& value) {
+  const auto core = table.find(key.GetName());
+  if (core == table.end()) {
+    typename Table::mapped_type versions;
+    const auto entry = versions.emplace(key, value);
+    table.emplace(key.GetName(), std::move(versions));
+    return std::make_pair(entry, true);
+  }
+  auto& versions = core->second;
+  const auto known = FindKey(versions, key);
+  if (known != versions.end()) return std::make_pair(known, false);
+  return std::make_pair(versions.emplace_hint(versions.lower_bound(key), key, value), true);
+}
+
+}  // namespace
+
+std::size_t Kel_Index::NameHash::operator()(const StringBase& name) const noexcept {
+  std::uint32_t hash = 0;
+  for (const char c : name.View()) {
+    hash = 5 * hash + static_cast<std::uint32_t>(static_cast<signed char>(c));
+  }
+  return hash;
+}
+
+FileName Kel_Index::GetDataFile(const FileName& location, const Kel_Key& key,
+                                const StringBase& extension) {
+  StringBase base = key.GetName();
+  base.Append(KEL_VERSION);
+  FileName file = location;
+  file.PushPathEnd(KEL_DATA_SUBDIRECTORY);
+  file.SetBase(base);
+  file.SetExtension(extension);
+  return file;
+}
+
+Kel_Index::Kel_Index() : locations(kBucketHint), options(kBucketHint) {
+  locations.max_load_factor(1.0F);
+  options.max_load_factor(1.0F);
+}
+
+Kel_Index::~Kel_Index() = default;
+
+bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
+  if (!key.IsValid() || !Exists(location)) {
+    kModule.Error("Invalid IP index entry %s at %s\n", key.GetKey(), location.GetName());
+    return false;
+  }
+  const auto inserted = Insert(locations, key, location);
+  const bool added = inserted.second;
+  if (!added) {
+    TARVO_TRACE("Duplicate IP index entry %s at %s\nPrecedence given to %s\n", key.GetKey(),
+                location.GetName(), inserted.first->second.GetName());
+  }
+  const bool withOptions = added && AddIPOptions(key, location);
+  if (!withOptions) {
+    TARVO_TRACE("Library IP %s found at %s\n", key.GetKey(), location.GetName());
+  }
+  return true;
+}
+
+// Nothing reads options yet, so no version has any.
+// NOLINTNEXTLINE(readability-convert-member-functions-to-static)
+bool Kel_Index::AddIPOptions(const Kel_Key& key, const FileName& location) {
+  TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
+  return false;
+}
+
+void Kel_Index::ClearIP() {
+  locations.clear();
+  options.clear();
+}
+
+unsigned int Kel_Index::GetBaseIPCount() const { return static_cast<unsigned>(options.size()); }
+
+unsigned int Kel_Index::GetFullIPCount() const {
+  std::size_t count = 0;
+  for (const auto& core : options) count += core.second.size();
+  return static_cast<unsigned>(count);
+}
+
+FileName Kel_Index::GetIPLocation(const Kel_Key& key) const {
+  const auto* const entry = Find(locations, key);
+  if (entry) return entry->second;
+  throw Report::Exception(AppException::NotFound, "Cannot find IP index entry for %s\n",
+                          key.GetKey());
+}
+
+Kel_Key Kel_Index::GetIPKey(const Kel_Key& key) const {
+  const auto* const entry = Find(locations, key);
+  if (entry) return entry->first;
+  throw Report::Exception(AppException::NotFound, "Cannot find IP key for %s\n", key.GetKey());
+}
+
+}  // namespace Tarvo
