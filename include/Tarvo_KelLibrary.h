@@ -1,0 +1,71 @@
+#ifndef TARVO_KELLIBRARY_H
+#define TARVO_KELLIBRARY_H
+
+#include <memory>
+
+#include "Tarvo_Export.h"
+
+namespace Tarvo {
+
+class KelLibraryImpl;
+
+// The front door: finds the IP cores in a list of repositories and answers questions about them.
+//
+//     Tarvo::KelLibrary library;
+//     library.SetRepositoryPath("project/ip;company/ip");
+//     std::cout << library.GetLocation("abc") << '\n';
+//
+// A repository is a directory with a subdirectory `ipmods`, which holds one directory for each
+// version of each core, named by its key (see Kel_Key). Nothing else of it is read by a walk, and
+// nothing is ever written.
+//
+// Wherever a key is asked for, it is the text of a version, such as "abc_v1_00_a", or a bare core
+// name, which stands for the newest version of that core.
+//
+// Failures: the operations throw nothing. What goes wrong is issued as a message (see
+// Port_MsgManData), and the result says so. Constructor and destructor are the exception: making a
+// library may throw std::bad_alloc.
+//
+// Lifetime: the caller owns the library. Threads: for one at a time; separate libraries may work in
+// separate threads.
+class TARVO_EXPORT KelLibrary {
+ public:
+  // An empty library. Nothing is read, neither from disk nor from the environment.
+  KelLibrary();
+  ~KelLibrary();
+  KelLibrary(const KelLibrary&) = delete;
+  KelLibrary& operator=(const KelLibrary&) = delete;
+
+  // Reads the repositories of a path, directories split at ";". Of a version that stands in more
+  // than one, the first counts.
+  //
+  // True if every repository was read. False, with an error, if a piece of the path is no
+  // directory: then the library goes on answering from the repositories it had. False, too, if a
+  // repository has no `ipmods` (a warning), if a version can't be entered or if reading a directory
+  // fails (errors): then what was found stays usable. Directories whose names are no keys are
+  // passed over in silence.
+  bool SetRepositoryPath(const StringBase& path);
+
+  // Reads the same repositories again. The result is that of SetRepositoryPath; the path itself is
+  // not tested again.
+  bool RefreshLibrary();
+
+  // The absolute directory of a version. Empty, with an error, for a key that is not in the
+  // library; so are the other queries.
+  StringBase GetLocation(const StringBase& key) const;
+
+  // The full key of the newest version of the core that the key belongs to, whether the version
+  // that it names exists or not.
+  StringBase GetLatestIPKey(const StringBase& key) const;
+
+  // The base name of a version's core, and its version as dotted text such as "1.00.a".
+  StringBase GetName(const StringBase& key) const;
+  StringBase GetVersion(const StringBase& key) const;
+
+ private:
+  std::unique_ptr<KelLibraryImpl> impl;
+};
+
+}  // namespace Tarvo
+
+#endif

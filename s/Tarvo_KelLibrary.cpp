@@ -1,0 +1,154 @@
+#include "Tarvo_KelLibrary.h"
+
+#include <boost/filesystem.hpp>
+
+#include "Port_FileName.h"
+#include "Tarvo_Guard.h"
+#include "Tarvo_KelLibrary_Utils.h"
+#include "Tarvo_Kel_Index.h"
+#include "Tarvo_Kel_Key.h"
+#include "Tarvo_Report.h"
+
+namespace Tarvo {
+
+namespace fs = boost::filesystem;
+
+namespace {
+
+constexpr Report::Module kModule{"s/Tarvo_KelLibrary", "1.0"};
+
+const char* const kVersionsSubdirectory = "ipmods";
+
+// A directory, or something that may not be looked at: adding that to the index reports it. A link
+// to nowhere is neither.
+bool MayBeVersion(const fs::directory_entry& entry) {
+  boost::system::error_code error;
+  return fs::is_directory(entry.status(error)) || error == boost::system::errc::permission_denied;
+}
+
+}  // namespace
+
+class KelLibraryImpl {
+ public:
+  KelLibraryImpl();
+
+  bool SetRepositoryPath(const StringBase& path);
+  bool RefreshLibrary();
+
+  StringBase GetLocation(const StringBase& key) const;
+  StringBase GetLatestIPKey(const StringBase& key) const;
+  StringBase GetName(const StringBase& key) const;
+  StringBase GetVersion(const StringBase& key) const;
+
+ private:
+  bool AddRepository(const StringBase& repository);
+  bool AddVersion(const fs::path& directory);
+
+  Kel_Index index;
+  StringList repositories;
+};
+
+KelLibraryImpl::KelLibraryImpl() { TARVO_TRACE("Constructing empty KEL Library\n"); }
+
+bool KelLibraryImpl::SetRepositoryPath(const StringBase& path) {
+  return Guard(NoOutput(),
+               Failure(kModule, "Unable to set repository path to %s\n%s\n", path)
+                   .WithoutExceptionText(WithoutText::IsCutOff),
+               [&] {
+                 TARVO_TRACE("KEL Library: Reading repository path %s\n", path);
+                 repositories = KelLibrary_Utils::GetPathVector(path);
+                 const bool complete = RefreshLibrary();
+                 TARVO_TRACE("KEL Library: repository path set to %s\n", path);
+                 return complete;
+               });
+}
+
+// Goes through all repositories, whatever became of the ones before.
+bool KelLibraryImpl::RefreshLibrary() {
+  const bool complete = Guard(NoOutput(),
+                              Failure(kModule, "Unable to analyse repository\n%s\n")
+                                  .WithoutExceptionText(WithoutText::IsCutOff),
+                              [&] {
+                                index.ClearIP();
+                                bool all = true;
+                                for (const StringBase& repository : repositories) {
+                                  all = AddRepository(repository) && all;
+                                }
+                                return all;
+                              });
+  TARVO_TRACE("  Detected %d valid cores (%d all versions)\n", index.GetBaseIPCount(),
+              index.GetFullIPCount());
+  return complete;
+}
+
+bool KelLibraryImpl::AddRepository(const StringBase& repository) {
+  TARVO_TRACE("KEL Library: Analysing repository %s\n", repository);
+  const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
+  boost::system::error_code error;
+  if (!fs::is_directory(versions, error)) {
+    kModule.Warning("Unable to add directory %s to library\n", repository);
+    return false;
+  }
+  bool all = true;
+  for (const fs::directory_entry& entry : fs::directory_iterator(versions)) {
+    if (MayBeVersion(entry)) all = AddVersion(entry.path()) && all;
+  }
+  return all;
+}
+
+// A description that can't be read costs the version its options, and nobody else anything.
+bool KelLibraryImpl::AddVersion(const fs::path& directory) {
+  const Kel_Key key(StringBase(directory.filename().c_str()));
+  if (!key.IsValid()) return true;
+  Port::FileName location;
+  location.SetHead(directory.c_str());
+  try {
+    return index.AddIP(key, location);
+  } catch (const AppException& exception) {
+    kModule.Error("Invalid IP index entry %s at %s\n%s\n", key.GetKey(), location.GetName(),
+                  exception.what());
+    return true;
+  }
+}
+
+StringBase KelLibraryImpl::GetLocation(const StringBase& key) const {
+  return GuardText(Failure(kModule, "Unable to get location for IP %s\n%s\n", key),
+                   [&] { return index.GetIPLocation(Kel_Key(key)).GetAbsolutePath(); });
+}
+
+StringBase KelLibraryImpl::GetLatestIPKey(const StringBase& key) const {
+  return GuardText(Failure(kModule, "Unable to get latest IP key for IP %s\n%s\n", key), [&] {
+    const Kel_Key core(Kel_Key(key).GetName());
+    return index.GetIPKey(core).GetKey();
+  });
+}
+
+StringBase KelLibraryImpl::GetName(const StringBase& key) const {
+  return GuardText(Failure(kModule, "Unable to get name for IP %s\n%s\n", key),
+                   [&] { return index.GetIPKey(Kel_Key(key)).GetName(); });
+}
+
+StringBase KelLibraryImpl::GetVersion(const StringBase& key) const {
+  return GuardText(Failure(kModule, "Unable to get version for IP %s\n%s\n", key),
+                   [&] { return index.GetIPKey(Kel_Key(key)).GetVersion(); });
+}
+
+KelLibrary::KelLibrary() : impl(std::make_unique<KelLibraryImpl>()) {}
+
+KelLibrary::~KelLibrary() = default;
+
+bool KelLibrary::SetRepositoryPath(const StringBase& path) { return impl->SetRepositoryPath(path); }
+
+bool KelLibrary::RefreshLibrary() { return impl->RefreshLibrary(); }
+
+StringBase KelLibrary::GetLocation(const StringBase& key) const { return impl->GetLocation(key); }
+
+StringBase KelLibrary::GetLatestIPKey(const StringBase& key) const {
+  return impl->GetLatestIPKey(key);
+}
+
+StringBase KelLibrary::GetName(const StringBase& key) const { return impl->GetName(key); }
+
+StringBase KelLibrary::GetVersion(const StringBase& key) const { return impl->GetVersion(key); }
+
+}  // namespace Tarvo

@@ -1,0 +1,209 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <string>
+
+#include "AllocationFault.h"
+#include "MessageRecorder.h"
+#include "OrdinaryUser.h"
+#include "RepositoryBuilder.h"
+#include "Tarvo_KelLibrary.h"
+
+namespace {
+
+using namespace Tarvo;
+namespace fs = std::filesystem;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+const std::string kLibrary = "error s/Tarvo_KelLibrary: ";
+
+bool SetPath(KelLibrary& library, const std::string& path) {
+  return library.SetRepositoryPath(path.c_str());
+}
+
+// All four queries for a key in one line.
+std::string Ask(const KelLibrary& library, const char* key) {
+  std::string answers = library.GetLocation(key).GetText();
+  answers += std::string(" ") + library.GetName(key).GetText();
+  answers += std::string(" ") + library.GetVersion(key).GetText();
+  return answers + " " + library.GetLatestIPKey(key).GetText();
+}
+
+class Library : public testing::Test {
+ protected:
+  std::string At(const std::string& key) const { return repo / "ipmods/" + key; }
+
+  RepositoryBuilder repo;
+  RepositoryBuilder other;
+  MessageRecorder recorder;
+  KelLibrary library;
+};
+
+TEST_F(Library, AnswersForVersionsAndBareNames) {
+  repo.Core("abc_v1_00_a");
+  repo.Core("abc_V2_00_B");
+  other.Core("abc_v1_00_a");
+  other.Core("xyz_v1_00_a");
+  EXPECT_TRUE(SetPath(library, repo.Path() + ";" + other.Path()));
+  EXPECT_EQ(Ask(library, "abc_v1_00_a"), At("abc_v1_00_a") + " abc 1.00.a abc_v2_00_b");
+  EXPECT_EQ(Ask(library, "abc"), At("abc_V2_00_B") + " abc 2.00.b abc_v2_00_b");
+  EXPECT_EQ(Ask(library, "xyz"), other / "ipmods/xyz_v1_00_a xyz 1.00.a xyz_v1_00_a");
+  EXPECT_EQ(library.GetLatestIPKey("abc_v9_99_z"), "abc_v2_00_b");
+  EXPECT_THAT(recorder.Take(), IsEmpty());
+}
+
+TEST_F(Library, ReportsUnknownKeysAsGiven) {
+  EXPECT_EQ(Ask(library, "Ab%s_V1_00_A"), "   ");
+  const std::string entry = "\nCannot find IP index entry for Ab%s_v1_00_a\n\n";
+  const std::string key = "\nCannot find IP key for Ab%s_v1_00_a\n\n";
+  EXPECT_THAT(recorder.Take(),
+              ElementsAre(kLibrary + "Unable to get location for IP Ab%s_V1_00_A" + entry,
+                          kLibrary + "Unable to get name for IP Ab%s_V1_00_A" + key,
+                          kLibrary + "Unable to get version for IP Ab%s_V1_00_A" + key,
+                          kLibrary + "Unable to get latest IP key for IP Ab%s_V1_00_A\n"
+                                     "Cannot find IP key for Ab%s\n\n"));
+}
+
+TEST_F(Library, PassesOverWhatIsNoVersionDirectory) {
+  repo.Core("abc_v1_00_a");
+  repo.Core("docs");
+  repo.Core("_v1_00_a");
+  repo.Core("abc_v99999999999_00_a");
+  repo.File("ipmods/plain_v1_00_a", "");
+  fs::create_symlink("nowhere", repo / "ipmods/gone_v1_00_a");
+  fs::create_symlink("loop_v1_00_a", repo / "ipmods/loop_v1_00_a");
+  fs::create_symlink("abc_v1_00_a", repo / "ipmods/link_v1_00_a");
+  EXPECT_TRUE(SetPath(library, repo.Path()));
+  EXPECT_THAT(recorder.Take(), IsEmpty());
+  EXPECT_EQ(library.GetLocation("link").View(), At("link_v1_00_a"));
+  for (const char* key : {"docs", "plain", "gone", "loop"}) EXPECT_EQ(library.GetName(key), "");
+}
+
+TEST_F(Library, KeepsItsRepositoriesWhenAPathIsBad) {
+  repo.Core("abc_v1_00_a");
+  EXPECT_TRUE(SetPath(library, repo.Path()));
+  const std::string bad = repo.Path() + ";" + repo / "none";
+  EXPECT_FALSE(SetPath(library, bad));
+  EXPECT_THAT(recorder.Take(), ElementsAre(kLibrary + "Unable to set repository path to " + bad +
+                                           "\nInvalid path directory " + repo / "none" + "\n\n"));
+  repo.Core("abc_v2_00_a");
+  EXPECT_EQ(library.GetVersion("abc"), "1.00.a");
+  EXPECT_TRUE(library.RefreshLibrary());
+  EXPECT_EQ(library.GetVersion("abc"), "2.00.a");
+  EXPECT_TRUE(SetPath(library, ""));
+  EXPECT_EQ(library.GetVersion("abc"), "");
+}
+
+TEST_F(Library, GoesOnBehindARepositoryWithoutCores) {
+  repo.Core("abc_v1_00_a");
+  other.File("ipmods", "not a directory");
+  EXPECT_FALSE(SetPath(library, other.Path() + ";" + repo.Path()));
+  EXPECT_EQ(library.GetVersion("abc"), "1.00.a");
+  EXPECT_THAT(recorder.Take(), ElementsAre("warning s/Tarvo_KelLibrary: Unable to add directory " +
+                                           other.Path() + " to library\n"));
+}
+
+TEST_F(Library, KeepsWhatItFoundWhenReadingFails) {
+  repo.Core("abc_v1_00_a");
+  other.Core("xyz_v1_00_a");
+  fs::permissions(other / "ipmods", fs::perms::none);
+  {
+    const OrdinaryUser user;
+    EXPECT_FALSE(SetPath(library, repo.Path() + ";" + other.Path() + ";" + repo.Path()));
+  }
+  fs::permissions(other / "ipmods", fs::perms::all);
+  EXPECT_EQ(library.GetVersion("abc"), "1.00.a");
+  EXPECT_THAT(recorder.Take(),
+              ElementsAre(testing::StartsWith(kLibrary + "Unable to analyse repository\nboost")));
+}
+
+// A directory that may be listed but not entered: each version is refused by itself.
+TEST_F(Library, ReportsVersionsThatItCannotReach) {
+  repo.Core("abc_v1_00_a");
+  other.Core("xyz_v1_00_a");
+  fs::permissions(other / "ipmods", fs::perms(0744));
+  {
+    const OrdinaryUser user;
+    EXPECT_FALSE(SetPath(library, other.Path() + ";" + repo.Path()));
+  }
+  EXPECT_EQ(library.GetVersion("abc"), "1.00.a");
+  EXPECT_THAT(recorder.Take(),
+              ElementsAre("error s/Tarvo_Kel_Index: Invalid IP index entry xyz_v1_00_a at " +
+                          other / "ipmods/xyz_v1_00_a" + "\n"));
+}
+
+TEST(LibraryTraces, TellTheWalkInOrder) {
+  RepositoryBuilder repo;
+  repo.Core("abc_v1_00_a");
+  MessageRecorder recorder(MessageRecorder::MessagesAndTraces);
+  KelLibrary library;
+  EXPECT_TRUE(library.RefreshLibrary());
+  EXPECT_TRUE(SetPath(library, repo.Path()));
+  const std::string version = repo / "ipmods/abc_v1_00_a\n";
+  EXPECT_THAT(recorder.Take(),
+              ElementsAre("trace: Constructing empty KEL Library\n",
+                          "trace:   Detected 0 valid cores (0 all versions)\n",
+                          "trace: KEL Library: Reading repository path " + repo.Path() + "\n",
+                          "trace: KEL Library: Analysing repository " + repo.Path() + "\n",
+                          "trace: Unable to define options for IP abc_v1_00_a at " + version,
+                          "trace: Library IP abc_v1_00_a found at " + version,
+                          "trace:   Detected 0 valid cores (0 all versions)\n",
+                          "trace: KEL Library: repository path set to " + repo.Path() + "\n"));
+}
+
+// Each operation with its n-th allocation failing, for every n until it succeeds: nothing escapes,
+// the result says so, one message tells it, and the library goes on answering.
+struct Operation {
+  const char* heads;  // what the message may begin with, as a regular expression
+  const char* tail;   // what it ends in when that which failed has no text
+  bool (*run)(KelLibrary& library, const StringBase& path, const StringBase& key);
+};
+
+const Operation kOperations[] = {
+    {"Unable to (set repository path to [^\n]*|analyse repository)", "\n",
+     [](auto& library, auto& path, auto&) { return library.SetRepositoryPath(path); }},
+    {"Unable to analyse repository", "\n",
+     [](auto& library, auto&, auto&) { return library.RefreshLibrary(); }},
+    {"Unable to get location for IP a_core_whose_name_is_long", ", unknown exception\n",
+     [](auto& library, auto&, auto& key) { return library.GetLocation(key).GetLength() > 0; }},
+    {"Unable to get latest IP key for IP a_core_whose_name_is_long", ", unknown exception\n",
+     [](auto& library, auto&, auto& key) { return library.GetLatestIPKey(key).GetLength() > 0; }},
+    {"Unable to get name for IP a_core_whose_name_is_long", ", unknown exception\n",
+     [](auto& library, auto&, auto& key) { return library.GetName(key).GetLength() > 0; }},
+    {"Unable to get version for IP a_core_whose_name_is_long", ", unknown exception\n",
+     [](auto& library, auto&, auto& key) { return library.GetVersion(key).GetLength() > 0; }}};
+
+bool RunWithFault(const Operation& operation, KelLibrary& library, const StringBase& path,
+                  const StringBase& key, int count, AllocationFault::Kind kind) {
+  const AllocationFault fault(count, kind);
+  return operation.run(library, path, key);
+}
+
+TEST_F(Library, LetsNothingEscape) {
+  repo.Core("a_core_whose_name_is_long_v1_00_a");
+  const StringBase path = repo.Path().c_str();
+  const StringBase key = "a_core_whose_name_is_long";
+  for (const Operation& operation : kOperations) {
+    for (const auto kind : {AllocationFault::BadAlloc, AllocationFault::SomethingElse}) {
+      const std::string tail = kind == AllocationFault::BadAlloc ? "\n[^\n]+\n" : operation.tail;
+      int count = 0;
+      for (;; ++count) {
+        ASSERT_TRUE(library.SetRepositoryPath(path));
+        const bool done = RunWithFault(operation, library, path, key, count, kind);
+        if (!AllocationFault::Fired()) {
+          EXPECT_TRUE(done);
+          break;
+        }
+        EXPECT_FALSE(done);
+        EXPECT_THAT(recorder.Take(),
+                    ElementsAre(testing::MatchesRegex(kLibrary + operation.heads + tail)))
+            << count;
+      }
+      EXPECT_GT(count, 0) << operation.heads;
+    }
+  }
+}
+
+}  // namespace
