@@ -1,0 +1,81 @@
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "CommandLine.h"
+#include "RepositoryBuilder.h"
+
+namespace {
+
+const std::string kKel = KEL_COMMAND;
+const std::string kExamples = KEL_EXAMPLES;
+
+CommandResult Kel(const std::string& arguments) {
+  return RunCommand("cd '" + kExamples + "' && '" + kKel + "' " + arguments);
+}
+
+std::string Line(const std::string& name, const std::string& version, const std::string& suffix,
+                 const std::string& repository) {
+  const std::string key = name + suffix;
+  return key + "\t" + name + "\t" + version + "\t" + kExamples + "/" + repository + "/ipmods/" +
+         key + "\n";
+}
+
+TEST(KelWhich, WritesOneLineForEachKey) {
+  const CommandResult result =
+      Kel("-L repository which word_fifo pulse_counter_V1_01_B pulse_counter");
+  EXPECT_EQ(result.status, 0);
+  EXPECT_EQ(result.output, Line("word_fifo", "1.00.a", "_v1_00_a", "repository") +
+                               Line("pulse_counter", "1.01.b", "_v1_01_b", "repository") +
+                               Line("pulse_counter", "2.00.a", "_v2_00_a", "repository"));
+  EXPECT_EQ(result.errors, "");
+}
+
+TEST(KelWhich, TakesTheFirstRepository) {
+  const std::string overlaid = Line("pulse_counter", "2.00.a", "_v2_00_a", "overlay");
+  EXPECT_EQ(Kel("-L overlay -L repository which pulse_counter").output, overlaid);
+  EXPECT_EQ(Kel("which pulse_counter --library 'overlay;repository'").output, overlaid);
+  EXPECT_EQ(Kel("-L repository -L overlay which pulse_counter").output,
+            Line("pulse_counter", "2.00.a", "_v2_00_a", "repository"));
+}
+
+TEST(KelWhich, TellsBadInputByItsStatus) {
+  const RepositoryBuilder empty;
+  struct Row {
+    std::string arguments;
+    int status;
+    std::string errors;  // how they begin
+    bool answers;
+  };
+  const Row rows[] = {
+      {"-L repository which nope word_fifo", 1,
+       "kel: error: Unable to get location for IP nope\n  Cannot find IP index entry for nope\n",
+       true},
+      {"-L nowhere which word_fifo", 3,
+       "kel: error: Unable to set repository path to nowhere\n  Invalid path directory nowhere\n",
+       false},
+      {"-L '" + empty.Path() + "' -L repository which word_fifo", 0,
+       "kel: warning: Unable to add directory " + empty.Path() + " to library\n", true},
+      {"-L repository which", 2, "KEY is required", false},
+      {"which word_fifo", 2, "--library is required", false},
+      {"-L repository", 2, "A subcommand is required", false},
+      {"-L repository which --nonsense word_fifo", 2, "The following argument", false},
+      {"-L repository which word_fifo >/dev/full", 1,
+       "kel: error: Unable to write to standard output\n", false}};
+  for (const Row& row : rows) {
+    SCOPED_TRACE(row.arguments);
+    const CommandResult result = Kel(row.arguments);
+    EXPECT_EQ(result.status, row.status);
+    EXPECT_EQ(result.errors.substr(0, row.errors.size()), row.errors);
+    EXPECT_EQ(result.output,
+              row.answers ? Line("word_fifo", "1.00.a", "_v1_00_a", "repository") : "");
+  }
+}
+
+TEST(Kel, ShowsHelpAndVersion) {
+  EXPECT_EQ(Kel("--help").status, 0);
+  EXPECT_NE(Kel("which --help").output.find("KEY"), std::string::npos);
+  EXPECT_EQ(Kel("--version").output.substr(0, 4), "kel ");
+}
+
+}  // namespace
