@@ -1,0 +1,44 @@
+#include "MessageRecorder.h"
+
+#include <utility>
+
+#include "Tarvo_DebugMessenger.h"
+
+namespace {
+
+const char* NameOf(Port_Message::Severity severity) {
+  static const char* const names[] = {"warning ", "error ", "fatal "};
+  return names[severity];
+}
+
+// The domain is the same for all of the library's messages, so only another one shows.
+std::string Dump(const Port_Message& message) {
+  const std::string domain = message.domain;
+  return NameOf(message.severity) + (domain == "tarvomsg" ? "" : domain + " ") +
+         std::string(message.file) + ": " + message.text;
+}
+
+Tarvo::DebugMessenger& Logger() {
+  return *Tarvo::DebugMessengerFactory::GetLogger(Port::StringBase<char>("BaseIP"));
+}
+
+}  // namespace
+
+MessageRecorder::MessageRecorder(What what) {
+  previous = Port_MsgManData::setHandler([this](const Port_Message& message) {
+    entries.push_back(Dump(message));
+    lines.push_back(message.line);
+  });
+  if (what == MessagesAndTraces) {
+    Logger().SetSink([this](const Port::StringBase<char>& text) {
+      entries.push_back(std::string("trace: ") + text.GetText());
+    });
+  }
+}
+
+MessageRecorder::~MessageRecorder() {
+  Port_MsgManData::setHandler(previous);
+  Logger().SetSink({});
+}
+
+std::vector<std::string> MessageRecorder::Take() { return std::exchange(entries, {}); }
