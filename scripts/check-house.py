@@ -1,0 +1,110 @@
+#!/usr/bin/env python3
+"""Checks the house rules that no compiler knows: who may include whom, and how long a source is.
+
+Each rule has a sample in tests/data/house that must fail; one that passes is a failure of the
+check itself.
+"""
+
+import pathlib
+import re
+import subprocess
+import sys
+
+ROOT = pathlib.Path(__file__).resolve().parent.parent
+SAMPLES = ROOT / "tests/data/house"
+LONGEST_SOURCE = 600
+
+# A module may include itself and modules of a lower rank. The first pattern that fits a file's
+# path counts.
+RANKS = [
+    (0, r"platform/.*"),
+    (0.5, r"include/Tarvo_Export\.h"),
+    (1, r"s/Tarvo_(Report|PropertyList|TokenReader)\..*"),
+    (2, r"(include|s)/Tarvo_(Guard|Kel_Key|KelLibrary_Utils|FileScanner)\..*"),
+    (3, r"(include|s)/Tarvo_QVRStatement\..*"),
+    (4, r"(include|s)/Tarvo_OptionScanner\..*"),
+    (5, r"(include|s)/Tarvo_Kel_Index\..*"),
+    (6, r"(include|s)/Tarvo_QVRParser\..*"),
+    (7, r"(include|s)/Tarvo_(LDXParser|LDXParser_Hdl|TEWParser)\..*"),
+    (8, r"(include|s)/Tarvo_KelIP\..*"),
+    (9, r"(include|s)/Tarvo_KelLibrary\..*"),
+    (10, r"(tools|tests|bench|examples|fuzz)/.*"),
+]
+# What one of these may not include, whatever its rank.
+FORBIDDEN = [
+    (r"(platform/)?include/.*", r"boost/.*", "exported headers include no Boost header"),
+    (r".*", r"regex", "the Standard Library's regular expressions are not used"),
+    (r"(tools|examples)/.*", r"Tarvo_(Report|Guard|PropertyList|TokenReader|QVRStatement)\.h",
+     "clients see exported headers only"),
+    (r"(s|include)/.*", r"(unistd|fcntl|sys/.*|dirent)\.h", "only platform/ makes system calls"),
+]
+INCLUDE = re.compile(r'^\s*#\s*include\s*[<"]([^>"]+)[>"]')
+
+
+def rank_of(path):
+    """The rank and the module of a file, or None for one that the table does not know."""
+    for rank, pattern in RANKS:
+        if re.fullmatch(pattern, path):
+            module = path.split("/")[0] if rank in (0, 10) else pathlib.Path(path).stem
+            return rank, module
+    return None
+
+
+def resolve(name, headers):
+    """The project's header that an include names, or None for one from elsewhere."""
+    return headers.get(pathlib.PurePosixPath(name).name)
+
+
+def breaches(path, lines, headers):
+    """What is wrong with a file, as texts with file and line."""
+    own = rank_of(path)
+    if own is None:
+        yield f"{path}: no rank is known for this file; add it to RANKS"
+        return
+    if len(lines) > LONGEST_SOURCE:
+        yield f"{path}: {len(lines)} lines, more than {LONGEST_SOURCE}"
+    for number, line in enumerate(lines, 1):
+        match = INCLUDE.match(line)
+        if not match:
+            continue
+        name = match.group(1)
+        for where, what, reason in FORBIDDEN:
+            if re.fullmatch(where, path) and re.fullmatch(what, name):
+                yield f"{path}:{number}: includes {name}: {reason}"
+        header = resolve(name, headers)
+        other = header and rank_of(header)
+        if other and other[0] >= own[0] and other[1] != own[1]:
+            yield f"{path}:{number}: rank {own[0]} includes {name} of rank {other[0]}"
+
+
+def project_sources():
+    listed = subprocess.run(
+        ["git", "ls-files", "--cached", "--others", "--exclude-standard", "*.h", "*.cpp"],
+        cwd=ROOT, check=True, capture_output=True, text=True).stdout.split()
+    return [path for path in listed if not path.startswith("tests/data/") and (ROOT / path).exists()]
+
+
+def sample_failures(headers):
+    """Each sample names in its first line the path to take it for, and must breach a rule."""
+    if not any(breaches("s/Tarvo_Kel_Key.cpp", [""] * (LONGEST_SOURCE + 1), headers)):
+        yield "a source that is too long passes"
+    for sample in sorted(SAMPLES.glob("*.sample")):
+        lines = sample.read_text().splitlines()
+        if not any(breaches(lines[0].removeprefix("// as "), lines, headers)):
+            yield f"{sample.name}: a sample that must fail passes"
+
+
+def main():
+    sources = project_sources()
+    headers = {pathlib.Path(path).name: path for path in sources if path.endswith(".h")}
+    found = list(sample_failures(headers))
+    for path in sources:
+        found += breaches(path, (ROOT / path).read_text().splitlines(), headers)
+    for text in found:
+        print(text)
+    print(f"{len(sources)} sources, {len(found)} breaches of the house rules")
+    return 1 if found else 0
+
+
+if __name__ == "__main__":
+    sys.exit(main())

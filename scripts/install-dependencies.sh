@@ -1,0 +1,26 @@
+#!/usr/bin/env bash
+# Installs the Debian packages that are missing, as root or through sudo.
+# Usage: install-dependencies.sh GROUP...   with the groups build, test and check
+set -euo pipefail
+
+declare -A groups=(
+  [build]="g++ cmake ninja-build pkg-config libboost-filesystem-dev libpcre2-dev libcli11-dev"
+  [test]="libgtest-dev libgmock-dev libbenchmark-dev"
+  [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3"
+)
+
+missing=()
+for group in "$@"; do
+  for package in ${groups[$group]}; do
+    status=$(dpkg-query --show --showformat '${Status}' "$package" 2>/dev/null || true)
+    [ "$status" = "install ok installed" ] || missing+=("$package")
+  done
+done
+[ ${#missing[@]} -gt 0 ] || exit 0
+
+as_root=()
+[ "$(id -u)" -eq 0 ] || as_root=(sudo)
+echo "Installing ${missing[*]}"
+"${as_root[@]}" apt-get update -qq
+"${as_root[@]}" env DEBIAN_FRONTEND=noninteractive \
+  apt-get install -y -qq --no-install-recommends "${missing[@]}" >/dev/null
