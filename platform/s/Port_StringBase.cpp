@@ -100,9 +100,9 @@ void String::MakeLower() noexcept { std::transform(text.begin(), text.end(), tex
 
 unsigned String::ReplaceChars(char from, char to) noexcept {
   unsigned count = 0;
-  for (char& c : text) {
-    if (c != from) continue;
-    c = to;
+  std::size_t at = 0;
+  while ((at = text.find(from, at)) != std::string::npos) {
+    text[at++] = to;
     ++count;
   }
   return count;
