@@ -5,6 +5,7 @@
 // its members that stay hidden, and the short names
 // of the types that all interfaces pass.
 
+#include <utility>
 #include <vector>
 
 #include "Port_StringBase.h"
@@ -16,6 +17,10 @@ namespace Tarvo {
 
 using StringBase = Port::StringBase<char>;
 using StringList = std::vector<StringBase>;
+
+// Names with their values, in order. A name may stand more than once; its first entry counts.
+using Property = std::pair<StringBase, StringBase>;
+using PropertyList = std::vector<Property>;
 
 }  // namespace Tarvo
 

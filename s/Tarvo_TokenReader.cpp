@@ -1,0 +1,58 @@
+#include "Tarvo_TokenReader.h"
+
+namespace Tarvo {
+
+TokenReader::TokenReader(std::string_view text, const char* delimiters, Groups withGroups)
+    : line(text),
+      groups(withGroups),
+      tokenizer(text.data(), text.data() + text.size(),
+                boost::char_separator<char>("", delimiters, boost::drop_empty_tokens)),
+      token(tokenizer.begin()) {}
+
+bool TokenReader::MoreTokens() {
+  while (!token.at_end() && GetToken() == " ") ++token;
+  return !token.at_end();
+}
+
+std::string_view TokenReader::GetRest() const {
+  return token.at_end() ? std::string_view() : line.substr(PositionOf(GetToken()));
+}
+
+void TokenReader::Step() {
+  if (!token.at_end()) ++token;
+}
+
+TokenReader::Value TokenReader::ReadValue() {
+  if (!MoreTokens()) return {{}, false};
+  const std::string_view first = GetToken();
+  if (first == "\"" || first == "'") return ReadQuoted();
+  if (groups == WithGroups && first == "(") return ReadGroup(")");
+  if (groups == WithGroups && first == "[") return ReadGroup("]");
+  return {first, true};
+}
+
+// From the opening quote to the token equal to it.
+TokenReader::Value TokenReader::ReadQuoted() {
+  const std::string_view quote = GetToken();
+  const std::size_t start = PositionOf(quote) + 1;
+  for (Step(); !token.at_end(); ++token) {
+    if (GetToken() == quote) return {line.substr(start, PositionOf(GetToken()) - start), true};
+  }
+  return {line.substr(start), false};
+}
+
+// From the opening bracket to the one that closes it, both included.
+TokenReader::Value TokenReader::ReadGroup(std::string_view closing) {
+  const std::string_view opening = GetToken();
+  const std::size_t start = PositionOf(opening);
+  std::size_t depth = 1;
+  for (Step(); !token.at_end(); ++token) {
+    if (GetToken() == opening) ++depth;
+    if (GetToken() == closing && --depth == 0) {
+      return {line.substr(start, PositionOf(GetToken()) + 1 - start), true};
+    }
+  }
+  return {line.substr(start), false};
+}
+
+}  // namespace Tarvo
