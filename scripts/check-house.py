@@ -22,6 +22,7 @@ RANKS = [
     (1, r"s/Tarvo_(Report|PropertyList|TokenReader)\..*"),
     (2, r"(include|s)/Tarvo_(Guard|Kel_Key|KelLibrary_Utils|FileScanner)\..*"),
     (3, r"(include|s)/Tarvo_QVRStatement\..*"),
+    (3.5, r"s/Tarvo_OptionDefaults\.h"),
     (4, r"(include|s)/Tarvo_OptionScanner\..*"),
     (5, r"(include|s)/Tarvo_Kel_Index\..*"),
     (6, r"(include|s)/Tarvo_QVRParser\..*"),

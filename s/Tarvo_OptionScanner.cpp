@@ -1,0 +1,85 @@
+#include "Tarvo_OptionScanner.h"
+
+#include <utility>
+
+#include "Tarvo_FileScanner.h"
+#include "Tarvo_OptionDefaults.h"
+#include "Tarvo_PropertyList.h"
+#include "Tarvo_QVRStatement.h"
+#include "Tarvo_Report.h"
+
+namespace Tarvo {
+
+const StringBase OptionScanner::QVR_TRUE = "TRUE";
+const StringBase OptionScanner::QVR_FALSE = "FALSE";
+const StringBase OptionScanner::QVR_OPTION = "OPTION";
+const StringBase OptionScanner::QVR_OPTION_NAME = "NAME";
+const StringBase OptionScanner::QVR_OPTION_VERSION = "VERSION";
+const StringBase OptionScanner::QVR_OPTION_IMP_NETLIST = "IMP_NETLIST";
+const StringBase OptionScanner::QVR_OPTION_RUN_TRAMFOLD = "RUN_TRAMFOLD";
+const StringBase OptionScanner::QVR_OPTION_STYLE = "STYLE";
+const StringBase OptionScanner::QVR_OPTION_STYLE_HDL = "HDL";
+const StringBase OptionScanner::QVR_OPTION_USAGE_LEVEL = "USAGE_LEVEL";
+const StringBase OptionScanner::QVR_OPTION_USAGE_LEVEL_ADVANCED = "ADVANCED_USER";
+
+const DefaultRow kOptionDefaults[4] = {
+    {&OptionScanner::QVR_OPTION_IMP_NETLIST, &OptionScanner::QVR_FALSE},
+    {&OptionScanner::QVR_OPTION_RUN_TRAMFOLD, &OptionScanner::QVR_FALSE},
+    {&OptionScanner::QVR_OPTION_STYLE, &OptionScanner::QVR_OPTION_STYLE_HDL},
+    {&OptionScanner::QVR_OPTION_USAGE_LEVEL, &OptionScanner::QVR_OPTION_USAGE_LEVEL_ADVANCED}};
+
+namespace {
+
+constexpr Report::Module kModule{"s/Tarvo_OptionScanner", "1.0"};
+
+// Appends the option of a line that states one. False for a bad statement.
+bool ReadLine(const StringBase& line, PropertyList& options) {
+  using namespace QVRStatement;
+  if (!BeginsWith(line, OptionScanner::QVR_OPTION, kScannerDelimiters)) return true;
+  Property option;
+  const Result result = ReadOption(line, kScannerDelimiters, option);
+  if (result == Read) options.push_back(std::move(option));
+  return result != Unparsable;
+}
+
+// The value of an option for a trace, which looks no further when it is missing.
+StringBase ValueOrEmpty(const PropertyList& options, const StringBase& name) {
+  const StringBase* const value = FindValue(options, name);
+  return value ? *value : StringBase();
+}
+
+}  // namespace
+
+// Goes on behind a bad statement, so that each gets its own error.
+OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
+  const StringBase name = file.GetName();
+  if (!key.IsValid()) {
+    throw Report::Exception(AppException::Failure, "Invalid IP key %s for file %s\n", key.GetKey(),
+                            name);
+  }
+  TARVO_TRACE("  Parsing QVR File %s\n", name);
+  FileScanner lines(file);
+  options = {{QVR_OPTION_NAME, key.GetName()}, {QVR_OPTION_VERSION, key.GetVersion()}};
+  bool ok = true;
+  StringBase line;
+  for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
+    if (ReadLine(line, options)) continue;
+    kModule.Error("QVR unparsable OPTION: %s line %d, %s\n", name, lineNumber, line);
+    ok = false;
+  }
+  AppendMissing(options, kOptionDefaults);
+  if (!ok) throw Report::Exception(AppException::Failure, "Unable to parse QVR %s\n", name);
+}
+
+OptionScanner::~OptionScanner() = default;
+
+PropertyList OptionScanner::GetOptions() const { return options; }
+
+StringBase OptionScanner::GetOptionValue(const PropertyList& options, const StringBase& name) {
+  if (const StringBase* const value = FindValue(options, name)) return *value;
+  TARVO_TRACE("Cannot find option %s on IP %s version %s\n", name,
+              ValueOrEmpty(options, QVR_OPTION_NAME), ValueOrEmpty(options, QVR_OPTION_VERSION));
+  return {};
+}
+
+}  // namespace Tarvo
