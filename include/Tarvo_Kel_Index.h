@@ -4,7 +4,6 @@
 #include <cstddef>
 #include <map>
 #include <unordered_map>
-#include <utility>
 
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
@@ -55,8 +54,9 @@ class TARVO_EXPORT Kel_Index {
 
   // Adds a version. False, with an error issued and nothing changed, for an invalid key or a
   // location that does not exist. The first location added for a key wins: adding it again gives
-  // true and changes nothing. Of keys that differ in text but not in version, such as `abc_v1_00_a`
-  // and `abc_v01_00_a`, the one added later stands in front.
+  // true and changes nothing. Throws AppException if the version's core description can't be read
+  // or parsed; then the version is there, without options. Of keys that differ in text but not in
+  // version, such as `abc_v1_00_a` and `abc_v01_00_a`, the one added later stands in front.
   bool AddIP(const Kel_Key& key, const Port::FileName& location);
 
   // Empties the index.
@@ -66,14 +66,22 @@ class TARVO_EXPORT Kel_Index {
   unsigned int GetBaseIPCount() const;
   unsigned int GetFullIPCount() const;
 
+  // The options of a version, in the order of OptionScanner::GetOptions. Only versions with a core
+  // description have any, so a bare name may stand for an older version here than in the lookups
+  // below. The reference stays good until ClearIP or the end of the index. Throws AppException.
+  const PropertyList& GetIPOptions(const Kel_Key& key) const;
+
+  // The keys of all versions with a core description, and of the newest such version of each core,
+  // in the order of their bytes, each once.
+  StringList GetAllIPKeys() const;
+  StringList GetLatestIPKeys() const;
+
   // The directory of a version, and its key as it was added. Versions without a core description
   // are found too. Throw AppException.
   Port::FileName GetIPLocation(const Kel_Key& key) const;
   Kel_Key GetIPKey(const Kel_Key& key) const;
 
  private:
-  using Options = std::vector<std::pair<StringBase, StringBase>>;
-
   struct NewestFirst {
     bool operator()(const Kel_Key& left, const Kel_Key& right) const { return right < left; }
   };
@@ -88,7 +96,7 @@ class TARVO_EXPORT Kel_Index {
   TARVO_LOCAL bool AddIPOptions(const Kel_Key& key, const Port::FileName& location);
 
   Table<Port::FileName> locations;
-  Table<Options> options;
+  Table<PropertyList> options;
 };
 
 }  // namespace Tarvo

@@ -4,6 +4,7 @@
 #include <boost/filesystem.hpp>
 #include <cstdint>
 
+#include "Tarvo_OptionScanner.h"
 #include "Tarvo_Report.h"
 
 namespace Tarvo {
@@ -30,6 +31,23 @@ constexpr std::size_t kBucketHint = 100;
 bool Exists(const FileName& location) {
   boost::system::error_code error;
   return boost::filesystem::exists(location.GetName().GetText(), error);
+}
+
+// What can't be asked for may well be there: reading it then tells what is wrong.
+bool MayExist(const FileName& file) {
+  boost::system::error_code error;
+  const auto status = boost::filesystem::status(file.GetName().GetText(), error);
+  return status.type() != boost::filesystem::file_not_found;
+}
+
+// The keys of the entries that `gather` adds from each list, sorted, each once.
+template <class Table, class Gather>
+StringList SortedKeys(const Table& table, const Gather& gather) {
+  StringList keys;
+  for (const auto& core : table) gather(core.second, keys);
+  std::sort(keys.begin(), keys.end());
+  keys.erase(std::unique(keys.begin(), keys.end()), keys.end());
+  return keys;
 }
 
 // The entry of this very key: entries of equal versions stand together.
@@ -117,11 +135,14 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
   return true;
 }
 
-// Nothing reads options yet, so no version has any.
-// NOLINTNEXTLINE(readability-convert-member-functions-to-static)
 bool Kel_Index::AddIPOptions(const Kel_Key& key, const FileName& location) {
-  TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
-  return false;
+  const FileName description = GetDataFile(location, key, KEL_QVR_EXTENSION);
+  if (!MayExist(description)) {
+    TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
+    return false;
+  }
+  Insert(options, key, OptionScanner(key, description).GetOptions());
+  return true;
 }
 
 void Kel_Index::ClearIP() {
@@ -135,6 +156,25 @@ unsigned int Kel_Index::GetFullIPCount() const {
   std::size_t count = 0;
   for (const auto& core : options) count += core.second.size();
   return static_cast<unsigned>(count);
+}
+
+const PropertyList& Kel_Index::GetIPOptions(const Kel_Key& key) const {
+  const auto* const entry = Find(options, key);
+  if (entry) return entry->second;
+  throw Report::Exception(AppException::NotFound, "Cannot find IP index entry for %s\n",
+                          key.GetKey());
+}
+
+StringList Kel_Index::GetAllIPKeys() const {
+  return SortedKeys(options, [](const auto& versions, StringList& keys) {
+    for (const auto& version : versions) keys.push_back(version.first.GetKey());
+  });
+}
+
+StringList Kel_Index::GetLatestIPKeys() const {
+  return SortedKeys(options, [](const auto& versions, StringList& keys) {
+    keys.push_back(versions.begin()->first.GetKey());
+  });
 }
 
 FileName Kel_Index::GetIPLocation(const Kel_Key& key) const {
