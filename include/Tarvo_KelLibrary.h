@@ -23,8 +23,7 @@ class KelLibraryImpl;
 // name, which stands for the newest version of that core.
 //
 // Failures: the operations throw nothing. What goes wrong is issued as a message (see
-// Port_MsgManData), and the result says so. Constructor and destructor are the exception: making a
-// library may throw std::bad_alloc.
+// Port_MsgManData), and the result says so. Only the constructor and what says so may throw.
 //
 // Lifetime: the caller owns the library. Threads: for one at a time; separate libraries may work in
 // separate threads.
@@ -61,6 +60,23 @@ class TARVO_EXPORT KelLibrary {
   // The base name of a version's core, and its version as dotted text such as "1.00.a".
   StringBase GetName(const StringBase& key) const;
   StringBase GetVersion(const StringBase& key) const;
+
+  // The value of an option of a version. True with an empty value for an option that is not there.
+  // False, with an error and the value untouched, for a key without a core description.
+  bool GetIPProperty(const StringBase& key, const StringBase& property, StringBase& value) const;
+
+  // Replaces the list by the names of a version's options: NAME, VERSION, those of the description
+  // in its order, and the defaults that it leaves out. False, with an error and an empty list, for
+  // a key without a core description.
+  bool ListIPProperties(const StringBase& key, StringList& list) const;
+
+  // Replaces the list by the keys of all versions with a core description, in the order of their
+  // bytes. Always true; may throw std::bad_alloc.
+  bool ListAllIPKeys(StringList& list) const;
+
+  // Replaces the list by the names of all options that have a meaning, whatever the repositories
+  // hold. Always true; may throw std::bad_alloc.
+  bool ListAllIPProperties(StringList& list) const;
 
  private:
   std::unique_ptr<KelLibraryImpl> impl;

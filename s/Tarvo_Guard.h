@@ -23,7 +23,8 @@ constexpr std::string_view kFailureTail = "\n%s\n";
 // What becomes of that tail when something arrives that has no text.
 enum class WithoutText {
   SaysUnknown,  // ", unknown exception\n"
-  IsCutOff      // "\n"
+  IsCutOff,     // "\n"
+  IsEmpty       // the tail with an empty text
 };
 
 // A literal for these arguments and the tail, and the line it stands at.
@@ -65,6 +66,7 @@ class Failure {
   }
 
   void IssueUnknown() const noexcept {
+    if (withoutText == WithoutText::IsEmpty) return Issue("");
     constexpr std::string_view unknown = ", unknown exception\n";
     const std::string_view tail = withoutText == WithoutText::IsCutOff ? "\n" : unknown;
     const std::string_view head(format.text,

@@ -1,12 +1,15 @@
 #include "Tarvo_KelLibrary.h"
 
 #include <boost/filesystem.hpp>
+#include <iterator>
 
 #include "Port_FileName.h"
 #include "Tarvo_Guard.h"
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
+#include "Tarvo_OptionScanner.h"
+#include "Tarvo_PropertyList.h"
 #include "Tarvo_Report.h"
 
 namespace Tarvo {
@@ -18,6 +21,31 @@ namespace {
 constexpr Report::Module kModule{"s/Tarvo_KelLibrary", "1.0"};
 
 const char* const kVersionsSubdirectory = "ipmods";
+
+const char* const kIPProperties[] = {"NAME",
+                                     "VERSION",
+                                     "ALERT",
+                                     "ARCH_SUPPORT",
+                                     "ARCH_SUPPORT_MAP",
+                                     "BUS_STD",
+                                     "CORE_STATE",
+                                     "DESC",
+                                     "EARLY_ACCESS_ARCH_SUPPORT",
+                                     "HDL",
+                                     "IMP_NETLIST",
+                                     "IP_GROUP",
+                                     "IPLEVEL_DRC_PROC",
+                                     "IPTYPE",
+                                     "LAST_UPDATED",
+                                     "LONG_DESC",
+                                     "MAX_MASTERS",
+                                     "MAX_SLAVES",
+                                     "RUN_TRAMFOLD",
+                                     "SPECIAL",
+                                     "STYLE",
+                                     "SYSLEVEL_DRC_PROC",
+                                     "TCL_FILE",
+                                     "USAGE_LEVEL"};
 
 // A directory, or something that may not be looked at: adding that to the index reports it. A link
 // to nowhere is neither.
@@ -39,6 +67,10 @@ class KelLibraryImpl {
   StringBase GetLatestIPKey(const StringBase& key) const;
   StringBase GetName(const StringBase& key) const;
   StringBase GetVersion(const StringBase& key) const;
+
+  bool GetIPProperty(const StringBase& key, const StringBase& property, StringBase& value) const;
+  bool ListIPProperties(const StringBase& key, StringList& list) const;
+  bool ListAllIPKeys(StringList& list) const;
 
  private:
   bool AddRepository(const StringBase& repository);
@@ -133,6 +165,27 @@ StringBase KelLibraryImpl::GetVersion(const StringBase& key) const {
                    [&] { return index.GetIPKey(Kel_Key(key)).GetVersion(); });
 }
 
+bool KelLibraryImpl::GetIPProperty(const StringBase& key, const StringBase& property,
+                                   StringBase& value) const {
+  return Guard(
+      NoOutput(),
+      Failure(kModule, "Unable to access IP %s property %s\n%s\n", key, property)
+          .WithoutExceptionText(WithoutText::IsEmpty),
+      [&] { value = OptionScanner::GetOptionValue(index.GetIPOptions(Kel_Key(key)), property); });
+}
+
+bool KelLibraryImpl::ListIPProperties(const StringBase& key, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to access IP %s properties\n%s\n", key)
+                   .WithoutExceptionText(WithoutText::IsEmpty),
+               [&] { list = NamesOf(index.GetIPOptions(Kel_Key(key))); });
+}
+
+bool KelLibraryImpl::ListAllIPKeys(StringList& list) const {
+  list = index.GetAllIPKeys();
+  return true;
+}
+
 KelLibrary::KelLibrary() : impl(std::make_unique<KelLibraryImpl>()) {}
 
 KelLibrary::~KelLibrary() = default;
@@ -145,6 +198,22 @@ StringBase KelLibrary::GetLocation(const StringBase& key) const { return impl->G
 
 StringBase KelLibrary::GetLatestIPKey(const StringBase& key) const {
   return impl->GetLatestIPKey(key);
+}
+
+bool KelLibrary::GetIPProperty(const StringBase& key, const StringBase& property,
+                               StringBase& value) const {
+  return impl->GetIPProperty(key, property, value);
+}
+
+bool KelLibrary::ListIPProperties(const StringBase& key, StringList& list) const {
+  return impl->ListIPProperties(key, list);
+}
+
+bool KelLibrary::ListAllIPKeys(StringList& list) const { return impl->ListAllIPKeys(list); }
+
+bool KelLibrary::ListAllIPProperties(StringList& list) const {
+  list.assign(std::begin(kIPProperties), std::end(kIPProperties));
+  return true;
 }
 
 StringBase KelLibrary::GetName(const StringBase& key) const { return impl->GetName(key); }
