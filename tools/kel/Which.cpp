@@ -1,8 +1,6 @@
-#include "Which.h"
-
-#include <iostream>
-
+#include "Table.h"
 #include "Tarvo_Kel_Key.h"
+#include "Verbs.h"
 
 namespace {
 
@@ -14,18 +12,20 @@ StringBase Resolve(const Tarvo::KelLibrary& library, const StringBase& text) {
 }
 
 // The location is asked for first: one message for an unknown key is enough.
-bool Show(const Tarvo::KelLibrary& library, const StringBase& text) {
+bool Add(Table& table, const Tarvo::KelLibrary& library, const StringBase& text) {
   const StringBase location = library.GetLocation(text);
   if (location.GetLength() == 0) return false;
-  std::cout << Resolve(library, text) << '\t' << library.GetName(text) << '\t'
-            << library.GetVersion(text) << '\t' << location << '\n';
+  table.Add({Resolve(library, text).GetText(), library.GetName(text).GetText(),
+             library.GetVersion(text).GetText(), location.GetText()});
   return true;
 }
 
 }  // namespace
 
 Status Which(const Tarvo::KelLibrary& library, const std::vector<std::string>& keys) {
+  Table table;
   bool allFound = true;
-  for (const std::string& key : keys) allFound = Show(library, key.c_str()) && allFound;
+  for (const std::string& key : keys) allFound = Add(table, library, key.c_str()) && allFound;
+  table.Write();
   return allFound ? StatusClean : StatusFindings;
 }

@@ -2,6 +2,7 @@
 
 #include <CLI/CLI.hpp>
 #include <exception>
+#include <functional>
 #include <iostream>
 #include <string>
 #include <vector>
@@ -9,7 +10,7 @@
 #include "Messages.h"
 #include "Status.h"
 #include "Tarvo_KelLibrary.h"
-#include "Which.h"
+#include "Verbs.h"
 
 namespace {
 
@@ -17,7 +18,33 @@ namespace {
 struct Call {
   std::vector<std::string> libraries;
   std::vector<std::string> keys;
+  bool allVersions = false;
+  std::function<Status(const Tarvo::KelLibrary&)> verb;
 };
+
+const char* const kKeyHelp =
+    "A key such as abc_v1_00_a, or a core's bare name for its newest version";
+
+void DescribeVerbs(CLI::App& app, Call& call) {
+  CLI::App* const list = app.add_subcommand(
+      "list", "Lists the newest version of each core: key, style, language, location, description");
+  list->add_flag("--all", call.allVersions, "List every version");
+  list->callback([&call] {
+    call.verb = [&call](const auto& library) { return List(library, call.allVersions); };
+  });
+
+  CLI::App* const show = app.add_subcommand("show", "Shows the options of a core");
+  show->add_option("KEY", call.keys, kKeyHelp)->required()->expected(1);
+  show->callback([&call] {
+    call.verb = [&call](const auto& library) { return Show(library, call.keys.front()); };
+  });
+
+  CLI::App* const which =
+      app.add_subcommand("which", "Tells key, name, version and location of each core");
+  which->add_option("KEY", call.keys, kKeyHelp)->required();
+  which->callback(
+      [&call] { call.verb = [&call](const auto& library) { return Which(library, call.keys); }; });
+}
 
 void DescribeCall(CLI::App& app, Call& call) {
   app.name("kel");
@@ -30,13 +57,7 @@ void DescribeCall(CLI::App& app, Call& call) {
       ->required();
   app.require_subcommand(1);
   app.fallthrough();
-
-  CLI::App* const which = app.add_subcommand(
-      "which", "Writes key, name, version and location of each core, with a tab between");
-  which
-      ->add_option("KEY", call.keys,
-                   "A key such as abc_v1_00_a, or a core's bare name for its newest version")
-      ->required();
+  DescribeVerbs(app, call);
 }
 
 std::string Join(const std::vector<std::string>& pieces, const char* separator) {
@@ -52,7 +73,7 @@ Status Run(const Call& call) {
   if (!library.SetRepositoryPath(Join(call.libraries, ";").c_str()) && Messages::ErrorCount() > 0) {
     return StatusUnreadable;
   }
-  const Status status = Which(library, call.keys);
+  const Status status = call.verb(library);
   std::cout.flush();
   if (!std::cout) std::cerr << "kel: error: Unable to write to standard output\n";
   return std::cout && Messages::ErrorCount() == 0 ? status : StatusFindings;

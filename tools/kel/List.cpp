@@ -1,0 +1,48 @@
+#include <algorithm>
+
+#include "Table.h"
+#include "Tarvo_Kel_Key.h"
+#include "Verbs.h"
+
+namespace {
+
+using Tarvo::Kel_Key;
+using Tarvo::KelLibrary;
+using Tarvo::StringBase;
+using Tarvo::StringList;
+
+std::string Option(const KelLibrary& library, const StringBase& key, const char* name) {
+  StringBase value;
+  library.GetIPProperty(key, name, value);
+  return value.GetText();
+}
+
+// Cores by name, and the versions of a core from the newest down.
+bool ComesBefore(const Kel_Key& left, const Kel_Key& right) {
+  return left.GetName() != right.GetName() ? left.GetName() < right.GetName() : right < left;
+}
+
+std::vector<Kel_Key> AllVersions(const KelLibrary& library) {
+  StringList texts;
+  library.ListAllIPKeys(texts);
+  std::vector<Kel_Key> keys(texts.begin(), texts.end());
+  std::stable_sort(keys.begin(), keys.end(), ComesBefore);
+  return keys;
+}
+
+}  // namespace
+
+Status List(const KelLibrary& library, bool allVersions) {
+  Table table;
+  StringBase core;
+  for (const Kel_Key& key : AllVersions(library)) {
+    const bool newest = table.IsEmpty() || key.GetName() != core;
+    core = key.GetName();
+    if (!newest && !allVersions) continue;
+    const StringBase& text = key.GetKey();
+    table.Add({text.GetText(), Option(library, text, "STYLE"), Option(library, text, "HDL"),
+               library.GetLocation(text).GetText(), Option(library, text, "DESC")});
+  }
+  table.Write();
+  return StatusClean;
+}

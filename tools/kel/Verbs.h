@@ -1,0 +1,23 @@
+#ifndef KEL_VERBS_H
+#define KEL_VERBS_H
+
+#include <string>
+#include <vector>
+
+#include "Status.h"
+#include "Tarvo_KelLibrary.h"
+
+// What the command does, one function for each verb. Each writes its answer to standard output and
+// leaves what the library does not know to the messages.
+
+// A line for each key or bare name: the key it resolves to, name, version and location.
+Status Which(const Tarvo::KelLibrary& library, const std::vector<std::string>& keys);
+
+// A line for each core with a description, or for each version of it: key, style, language,
+// location and description.
+Status List(const Tarvo::KelLibrary& library, bool allVersions);
+
+// A line for each option of a core: name and value.
+Status Show(const Tarvo::KelLibrary& library, const std::string& key);
+
+#endif
