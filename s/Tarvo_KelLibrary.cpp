@@ -95,7 +95,8 @@ bool KelLibraryImpl::SetRepositoryPath(const StringBase& path) {
                });
 }
 
-// Goes through all repositories, whatever became of the ones before.
+// A repository without versions does not keep the later ones out; one that can't be read ends the
+// walk.
 bool KelLibraryImpl::RefreshLibrary() {
   const bool complete = Guard(NoOutput(),
                               Failure(kModule, "Unable to analyse repository\n%s\n")
@@ -116,8 +117,7 @@ bool KelLibraryImpl::RefreshLibrary() {
 bool KelLibraryImpl::AddRepository(const StringBase& repository) {
   TARVO_TRACE("KEL Library: Analysing repository %s\n", repository);
   const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
-  boost::system::error_code error;
-  if (!fs::is_directory(versions, error)) {
+  if (!fs::is_directory(versions)) {
     kModule.Warning("Unable to add directory %s to library\n", repository);
     return false;
   }

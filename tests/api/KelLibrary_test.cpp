@@ -123,11 +123,12 @@ TEST_F(Library, KeepsWhatItFoundWhenReadingFails) {
 TEST_F(Library, ReportsVersionsThatItCannotReach) {
   repo.Core("abc_v1_00_a");
   other.Core("xyz_v1_00_a");
-  fs::permissions(other / "ipmods", fs::perms(0744));
+  fs::permissions(other / "ipmods", fs::perms(0444));
   {
     const OrdinaryUser user;
     EXPECT_FALSE(SetPath(library, other.Path() + ";" + repo.Path()));
   }
+  fs::permissions(other / "ipmods", fs::perms::all);
   EXPECT_EQ(library.GetVersion("abc"), "1.00.a");
   EXPECT_THAT(recorder.Take(),
               ElementsAre("error s/Tarvo_Kel_Index: Invalid IP index entry xyz_v1_00_a at " +
