@@ -56,10 +56,12 @@ TEST(KelWhich, TellsBadInputByItsStatus) {
        false},
       {"-L '" + empty.Path() + "' -L repository which word_fifo", 0,
        "kel: warning: Unable to add directory " + empty.Path() + " to library\n", true},
-      {"-L repository which", 2, "KEY is required", false},
-      {"which word_fifo", 2, "--library is required", false},
-      {"-L repository", 2, "A subcommand is required", false},
-      {"-L repository which --nonsense word_fifo", 2, "The following argument", false},
+      {"-L repository which", 2, "kel: error: KEY is required\n", false},
+      {"wich word_fifo", 2, "kel: error: 'wich' is no", false},
+      {"-L '' which word_fifo", 2, "kel: error: --library needs", false},
+      {"which word_fifo", 2, "kel: error: --library is required\n", false},
+      {"-L repository", 2, "kel: error: A subcommand is required: ", false},
+      {"-L repository which --nonsense word_fifo", 2, "kel: error: '--nonsense' is no", false},
       {"-L repository which word_fifo >/dev/full", 1,
        "kel: error: Unable to write to standard output\n", false}};
   for (const Row& row : rows) {

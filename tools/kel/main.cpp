@@ -1,6 +1,7 @@
 // The command `kel`: questions to repositories of IP cores, from a shell.
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <exception>
 #include <functional>
 #include <iostream>
@@ -9,7 +10,9 @@
 
 #include "Messages.h"
 #include "Status.h"
+#include "Tarvo_AppException.h"
 #include "Tarvo_KelLibrary.h"
+#include "Tarvo_KelLibrary_Utils.h"
 #include "Verbs.h"
 
 namespace {
@@ -46,6 +49,11 @@ void DescribeVerbs(CLI::App& app, Call& call) {
       [&call] { call.verb = [&call](const auto& library) { return Which(library, call.keys); }; });
 }
 
+const char* const kFooter =
+    "Exit status: 0 all well, 1 a key was not found or an error was reported,\n"
+    "2 the words of the call are wrong, 3 the repository path can't be set.\n"
+    "Example: kel -L project/ip -L company/ip which abc";
+
 void DescribeCall(CLI::App& app, Call& call) {
   app.name("kel");
   app.description("Answers questions about repositories of IP cores.");
@@ -53,11 +61,29 @@ void DescribeCall(CLI::App& app, Call& call) {
   app.add_option("-L,--library", call.libraries,
                  "A repository, or several with ';' between; may be repeated, the first wins")
       ->type_name("DIR")
-      ->allow_extra_args(false)
-      ->required();
-  app.require_subcommand(1);
+      ->allow_extra_args(false);
+  app.require_subcommand(0, 1);
   app.fallthrough();
+  app.allow_extras();
+  app.footer(kFooter);
   DescribeVerbs(app, call);
+}
+
+// What is wrong with a call that parsed, or an empty text.
+std::string Fault(const CLI::App& app, const Call& call) {
+  const std::vector<std::string> extras = app.remaining(true);
+  if (!extras.empty()) return "'" + extras.front() + "' is no subcommand or option";
+  if (!call.verb) return "A subcommand is required: list, show or which";
+  if (call.libraries.empty()) return "--library is required";
+  const bool empty = std::any_of(
+      call.libraries.begin(), call.libraries.end(),
+      [](const std::string& path) { return path.find_first_not_of(';') == std::string::npos; });
+  return empty ? "--library needs the name of a directory" : "";
+}
+
+Status RefuseCall(const std::string& fault) {
+  std::cerr << "kel: error: " << fault << "\nRun kel --help for more information.\n";
+  return StatusUsage;
 }
 
 std::string Join(const std::vector<std::string>& pieces, const char* separator) {
@@ -66,31 +92,48 @@ std::string Join(const std::vector<std::string>& pieces, const char* separator) 
   return joined;
 }
 
-// A repository without cores is only a warning: the others still answer.
+bool IsPath(const Tarvo::StringBase& path) {
+  try {
+    Tarvo::KelLibrary_Utils::GetPathVector(path);
+    return true;
+  } catch (const Tarvo::AppException&) {
+    return false;
+  }
+}
+
+// Answers from whatever could be read: what could not has its message, and shows in the status.
 Status Run(const Call& call) {
   Messages::Install();
   Tarvo::KelLibrary library;
-  if (!library.SetRepositoryPath(Join(call.libraries, ";").c_str()) && Messages::ErrorCount() > 0) {
-    return StatusUnreadable;
-  }
+  const Tarvo::StringBase path = Join(call.libraries, ";").c_str();
+  if (!library.SetRepositoryPath(path) && !IsPath(path)) return StatusUnreadable;
   const Status status = call.verb(library);
-  std::cout.flush();
-  if (!std::cout) std::cerr << "kel: error: Unable to write to standard output\n";
-  return std::cout && Messages::ErrorCount() == 0 ? status : StatusFindings;
+  return Messages::ErrorCount() == 0 ? status : StatusFindings;
 }
 
-}  // namespace
-
-int main(int argc, char** argv) try {
+Status ParseAndRun(int argc, char** argv) {
   CLI::App app;
   Call call;
   DescribeCall(app, call);
   try {
     app.parse(argc, argv);
+  } catch (const CLI::Success& help) {
+    app.exit(help);
+    return StatusClean;
   } catch (const CLI::ParseError& error) {
-    return app.exit(error) == 0 ? StatusClean : StatusUsage;
+    return RefuseCall(error.what());
   }
-  return Run(call);
+  const std::string fault = Fault(app, call);
+  return fault.empty() ? Run(call) : RefuseCall(fault);
+}
+
+}  // namespace
+
+int main(int argc, char** argv) try {
+  const Status status = ParseAndRun(argc, argv);
+  if (std::cout.flush()) return status;
+  std::cerr << "kel: error: Unable to write to standard output\n";
+  return StatusFindings;
 } catch (const std::exception& exception) {
   std::cerr << "kel: error: " << exception.what() << '\n';
   return StatusFindings;
