@@ -10,6 +10,8 @@ if [ "${1:-}" = --update ]; then
   shift
 fi
 build=${1:-build/gcc-release}
+[ -e "$build/CMakeCache.txt" ] || cmake --preset gcc-release >/dev/null
+cmake --build "$build" --target tarvo_kel >/dev/null
 
 result=0
 for library in libtarvo_platform libtarvo_kel; do

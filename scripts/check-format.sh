@@ -3,6 +3,11 @@
 set -euo pipefail
 cd "$(dirname "$0")/.."
 
-mode=(--dry-run --Werror)
-[ "${1:-}" != --fix ] || mode=(-i)
-git ls-files --cached --others --exclude-standard '*.cpp' '*.h' | xargs clang-format "${mode[@]}"
+case "${1:-}" in
+  "") mode=(--dry-run --Werror) ;;
+  --fix) mode=(-i) ;;
+  *) echo "usage: $0 [--fix]" >&2; exit 2 ;;
+esac
+git ls-files -z --cached --others --exclude-standard '*.cpp' '*.h' |
+  while IFS= read -r -d '' file; do [ ! -e "$file" ] || printf '%s\0' "$file"; done |
+  xargs -0 clang-format "${mode[@]}"

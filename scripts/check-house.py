@@ -14,7 +14,7 @@ ROOT = pathlib.Path(__file__).resolve().parent.parent
 SAMPLES = ROOT / "tests/data/house"
 LONGEST_SOURCE = 600
 
-# A module may include itself and modules of a lower rank. The first pattern that fits a file's
+# The modules of the whole design. One may include itself and modules of a lower rank. The first pattern that fits a file's
 # path counts.
 RANKS = [
     (0, r"platform/.*"),
@@ -34,11 +34,12 @@ RANKS = [
 # What one of these may not include, whatever its rank.
 FORBIDDEN = [
     (r"(platform/)?include/.*", r"boost/.*", "exported headers include no Boost header"),
-    (r".*", r"regex", "the Standard Library's regular expressions are not used"),
-    (r"(tools|examples)/.*", r"Tarvo_(Report|Guard|PropertyList|TokenReader|QVRStatement)\.h",
-     "clients see exported headers only"),
-    (r"(s|include)/.*", r"(unistd|fcntl|sys/.*|dirent)\.h", "only platform/ makes system calls"),
+    (r"(?!bench/).*", r"regex(\.h)?|boost/regex.*", "expressions are the platform's Port_Regexp"),
+    (r"(s|include)/.*", r"(unistd|fcntl|sys/.*|dirent)(\.h)?", "only platform/ makes system calls"),
 ]
+# A header of these folders is private, and only these may include it.
+PRIVATE = [(r"s/.*", r"s/.*|tests/unit/.*"), (r"platform/s/.*", r"platform/s/.*"),
+           (r"tools/.*", r"tools/.*"), (r"tests/.*", r"tests/.*"), (r"bench/.*", r"bench/.*")]
 INCLUDE = re.compile(r'^\s*#\s*include\s*[<"]([^>"]+)[>"]')
 
 
@@ -74,15 +75,18 @@ def breaches(path, lines, headers):
                 yield f"{path}:{number}: includes {name}: {reason}"
         header = resolve(name, headers)
         other = header and rank_of(header)
+        for folder, users in PRIVATE:
+            if header and re.fullmatch(folder, header) and not re.fullmatch(users, path):
+                yield f"{path}:{number}: includes {name}, which is private to its folder"
         if other and other[0] >= own[0] and other[1] != own[1]:
             yield f"{path}:{number}: rank {own[0]} includes {name} of rank {other[0]}"
 
 
 def project_sources():
     listed = subprocess.run(
-        ["git", "ls-files", "--cached", "--others", "--exclude-standard", "*.h", "*.cpp"],
-        cwd=ROOT, check=True, capture_output=True, text=True).stdout.split()
-    return [path for path in listed if not path.startswith("tests/data/") and (ROOT / path).exists()]
+        ["git", "ls-files", "-z", "--cached", "--others", "--exclude-standard", "*.h", "*.cpp"],
+        cwd=ROOT, check=True, capture_output=True, text=True).stdout.split("\0")
+    return [path for path in listed if path and not path.startswith("tests/data/") and (ROOT / path).exists()]
 
 
 def sample_failures(headers):

@@ -11,6 +11,10 @@ declare -A groups=(
 
 missing=()
 for group in "$@"; do
+  if [ -z "${groups[$group]:-}" ]; then
+    echo "usage: $0 GROUP...   with the groups ${!groups[*]}" >&2
+    exit 2
+  fi
   for package in ${groups[$group]}; do
     status=$(dpkg-query --show --showformat '${Status}' "$package" 2>/dev/null || true)
     [ "$status" = "install ok installed" ] || missing+=("$package")
@@ -19,7 +23,13 @@ done
 [ ${#missing[@]} -gt 0 ] || exit 0
 
 as_root=()
-[ "$(id -u)" -eq 0 ] || as_root=(sudo)
+if [ "$(id -u)" -ne 0 ]; then
+  if ! command -v sudo >/dev/null; then
+    echo "Please let root run: apt-get install ${missing[*]}" >&2
+    exit 1
+  fi
+  as_root=(sudo)
+fi
 echo "Installing ${missing[*]}"
 "${as_root[@]}" apt-get update -qq
 "${as_root[@]}" env DEBIAN_FRONTEND=noninteractive \
