@@ -1,9 +1,8 @@
 #ifndef TARVO_EXPORT_H
 #define TARVO_EXPORT_H
 
-// What every header of the library begins with: the marks of an exported class and of
-// its members that stay hidden, and the short names
-// of the types that all interfaces pass.
+// What every header of the library begins with: the marks of an exported class and of its members
+// that stay hidden, and the short names of the types that all interfaces pass.
 
 #include <utility>
 #include <vector>
