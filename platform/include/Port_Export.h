@@ -11,4 +11,11 @@
 #define PORT_PRINTF(formatPosition, firstArgument) \
   __attribute__((format(printf, formatPosition, firstArgument)))
 
+// Lets a compiler that knows how warn of a view that outlives the object it looks into.
+#ifdef __clang__
+#define PORT_LIFETIME_BOUND [[clang::lifetimebound]]
+#else
+#define PORT_LIFETIME_BOUND
+#endif
+
 #endif

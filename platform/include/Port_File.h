@@ -28,7 +28,7 @@ class PORT_EXPORT Stream {
   // Replaces the buffer by the next line, without its line end, and gives the line's length (the
   // largest int for a longer one). Gives 0 and an empty buffer for an empty line, -1 and an empty
   // buffer when no line is left. Throws std::bad_alloc, and std::length_error for a line that does
-  // not fit into a string.
+  // not fit into a string; the line is then still the next one.
   int readline(StringBase<char>& line);
 
  private:

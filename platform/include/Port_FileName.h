@@ -15,7 +15,8 @@ namespace Port {
 // bases. SetBase takes its text as it is, so a base may hold dots.
 //
 // No operation but GetAbsolutePath looks at the disk, and none changes it. Text that comes in ends
-// at its first NUL byte. Operations that build text may throw std::bad_alloc.
+// at its first NUL byte. Operations that build text may throw std::bad_alloc; one that changes the
+// name and throws leaves some of it old and some new.
 //
 // Threads: like an int. Several may read one name; who changes it must be alone.
 class PORT_EXPORT FileName {

@@ -26,9 +26,10 @@ struct Port_Message {
 // error. Issuing never throws, also when memory is short: then the end of a long text is left out.
 // A message whose handler throws goes to standard error instead.
 //
-// Threads: messages may be issued and handlers exchanged from several threads. Handler calls never
-// overlap, and once setHandler has returned in one thread, the handler that stood before is no
-// longer running in another. A handler may itself issue messages and set handlers.
+// Threads: messages may be issued and handlers exchanged from several threads. Calls of the handler
+// and of the loggers' sinks from several threads never overlap, and once setHandler has returned in
+// one thread, the handler that stood before is no longer running in another. A handler may itself
+// issue messages, write traces and set handlers, but must not wait for another thread that does.
 class PORT_EXPORT Port_MsgManData {
  public:
   using Handler = std::function<void(const Port_Message&)>;
@@ -44,6 +45,7 @@ class PORT_EXPORT Port_MsgManData {
   void issueFatal(int code, const char* format, ...) noexcept PORT_PRINTF(3, 4);
 
   // Sets the handler and gives the one that stood before; empty means the default in both places.
+  // May throw std::bad_alloc; then the handler that stood before still stands.
   static Handler setHandler(Handler handler);
 
  private:

@@ -4,6 +4,7 @@
 #include <functional>
 #include <string>
 #include <string_view>
+#include <type_traits>
 #ifdef __cpp_impl_three_way_comparison
 #include <compare>
 #endif
@@ -25,7 +26,8 @@ class StringBase;
 // content.
 //
 // Where a text is wanted as `const char*`, a string converts by itself, and the pointer is good
-// until the string changes. The comparisons below take part in overload resolution ahead of that
+// until the string changes. What reads it by that pointer sees the text end at a NUL byte; View()
+// gives all of it. The comparisons below take part in overload resolution ahead of that
 // conversion, so that `a < b` never compares addresses.
 //
 // Threads: like an int. Several may read one string; who writes must be alone.
@@ -45,22 +47,26 @@ class PORT_EXPORT StringBase<char> {
   // The bytes of the view, NULs included.
   explicit StringBase(std::string_view content);
 
-  operator const char*() const noexcept { return text.c_str(); }
-  const char* GetText() const noexcept { return text.c_str(); }
+  operator const char*() const noexcept PORT_LIFETIME_BOUND { return text.c_str(); }
+  const char* GetText() const noexcept PORT_LIFETIME_BOUND { return text.c_str(); }
   // Would be true for the empty string too: ask for GetLength() instead.
   explicit operator bool() const = delete;
 
   unsigned GetLength() const noexcept { return static_cast<unsigned>(text.size()); }
-  std::string_view View() const noexcept { return text; }
+  std::string_view View() const noexcept PORT_LIFETIME_BOUND { return text; }
 
-  // Replaces the content. The flag has no effect.
+  // Replaces the content. The flag has no effect; a count is refused, since it would be taken for
+  // the flag.
   void Assign(const StringBase& content, bool reserved = false);
-  // Replaces the content by the first `count` bytes of the text, or by the whole NUL-terminated
-  // text for All. The text may lie within this string.
+  template <class Text, class Count, class = std::enable_if_t<std::is_same_v<Text, StringBase>>>
+  void Assign(const Text& content, Count count) = delete;
+  // Replaces the content by the first `count` bytes of the text, which must have so many, or by the
+  // whole NUL-terminated text for All. The text may lie within this string.
   void Assign(const char* content, unsigned count = All);
 
   // The same two, but behind the content.
   void Append(const StringBase& content);
+  void Append(const StringBase& content, unsigned count) = delete;
   void Append(const char* content, unsigned count = All);
 
   // Makes the length 0.
@@ -90,7 +96,7 @@ class PORT_EXPORT StringBase<char> {
   // Removes the characters of the NUL-terminated set from the ends that the type names.
   void Trim(const char* set, TrimType type) noexcept;
 
-  // The text that printf would write.
+  // The text that printf would write, at most 2 GiB of it: a longer one throws std::length_error.
   static StringBase doFormat(const char* format, ...) PORT_PRINTF(1, 2);
 
  private:

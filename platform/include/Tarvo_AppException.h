@@ -9,7 +9,8 @@
 namespace Tarvo {
 
 // The one exception that the library's own code throws. what() gives the text exactly, with its
-// final line end. Thrown by value, caught by reference.
+// final line end; a text ends at its first NUL byte. Thrown by value, caught by reference. Making
+// one may throw std::bad_alloc, copying one throws nothing. Threads: like an int.
 class PORT_EXPORT AppException : public std::runtime_error {
  public:
   enum Level {

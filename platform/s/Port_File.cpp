@@ -72,10 +72,11 @@ int Stream::readline(StringBase<char>& line) {
   const std::size_t left = size - position;
   const auto* const end = static_cast<const char*>(std::memchr(start, '\n', left));
   std::size_t length = end ? static_cast<std::size_t>(end - start) : left;
-  position += end ? length + 1 : length;
+  const std::size_t next = position + (end ? length + 1 : length);
   if (end && length > 0 && start[length - 1] == '\r') --length;
   if (length >= StringBase<char>::All) throw std::length_error("line of more than 4 GiB");
   line.Assign(start, static_cast<unsigned>(length));
+  position = next;
   return static_cast<int>(std::min<std::size_t>(length, INT_MAX));
 }
 
@@ -92,7 +93,7 @@ Stream* File::open(const char* name, Access /*access*/, bool /*reserved*/) {
 
 bool File::close(Stream* stream) noexcept {
   const std::unique_ptr<Stream> owner(stream);
-  return stream && stream->Close();
+  return stream != nullptr && stream->Close();
 }
 
 }  // namespace Port

@@ -1,6 +1,8 @@
 #include "Port_FileName.h"
 
+#include <algorithm>
 #include <filesystem>
+#include <utility>
 
 namespace Port {
 
@@ -83,9 +85,8 @@ void FileName::SetHead(const char* directory) { head = directory; }
 
 void FileName::SetTail(const char* tail) {
   const auto [levels, component] = SplitLast(ToView(tail));
-  const String last(component);  // before the head changes: the text may be part of it
   PushPathEnd(String(levels));
-  Split(last.View());
+  Split(component);
 }
 
 void FileName::SetBase(const char* name) {
@@ -94,8 +95,7 @@ void FileName::SetBase(const char* name) {
 }
 
 void FileName::PushPathEnd(const char* levels) {
-  const std::string_view added = WithoutLeading(WithoutTrailing(ToView(levels)));
-  if (!added.empty()) head = Join(head.View(), added);
+  head = Join(head.View(), WithoutLeading(WithoutTrailing(ToView(levels))));
 }
 
 String FileName::PopPathEnd() {

@@ -16,8 +16,8 @@ namespace {
 
 using MessageChannel = Port::Channel<Port_Message>;
 
-// Never destroyed, and made without the heap: messages may come while the program ends, or when
-// memory has run out.
+// Never destroyed, as its lock, and made without the heap: messages may come when memory has run
+// out.
 MessageChannel& Messages() {
   alignas(MessageChannel) static std::array<std::byte, sizeof(MessageChannel)> place;
   static auto* const channel = new (place.data()) MessageChannel;
@@ -124,5 +124,5 @@ void Port_MsgManData::issueFatal(int /*code*/, const char* format, ...) noexcept
 }
 
 Port_MsgManData::Handler Port_MsgManData::setHandler(Handler handler) {
-  return Messages().Set(std::move(handler));
+  return Messages().Exchange(std::move(handler));
 }

@@ -37,9 +37,10 @@ struct Port_Regexp::Program {
 };
 
 // Keeps the last program only: the library has one pattern, and what callers use cannot pile up.
+// What is kept is never destroyed, since keys may be made while the program ends.
 std::shared_ptr<const Port_Regexp::Program> Port_Regexp::Compile(const char* pattern) {
-  static std::mutex mutex;
-  static std::shared_ptr<const Program> last;
+  static auto& mutex = *new std::mutex;
+  static auto& last = *new std::shared_ptr<const Program>;
   const std::lock_guard<std::mutex> lock(mutex);
   if (!last || last->pattern != pattern) last = std::make_shared<const Program>(pattern);
   return last;

@@ -27,11 +27,11 @@ void DebugMessenger::SetSink(Sink sink) { state->channel.Set(std::move(sink)); }
 // The loggers are never destroyed, so that traces may come while the program ends.
 DebugMessenger* DebugMessengerFactory::GetLogger(const String& name) {
   static std::mutex mutex;
-  static auto* const loggers = new std::unordered_map<String, std::unique_ptr<DebugMessenger>>;
+  static auto* const loggers = new std::unordered_map<String, DebugMessenger*>;
   const std::lock_guard<std::mutex> lock(mutex);
-  std::unique_ptr<DebugMessenger>& logger = (*loggers)[name];
-  if (!logger) logger.reset(new DebugMessenger);
-  return logger.get();
+  DebugMessenger*& logger = (*loggers)[name];
+  if (!logger) logger = new DebugMessenger;
+  return logger;
 }
 
 }  // namespace Tarvo

@@ -11,11 +11,12 @@ const char* NameOf(Port_Message::Severity severity) {
   return names[severity];
 }
 
-// The domain is the same for all of the library's messages, so only another one shows.
+// All of the library's messages have one domain and revision, so only others show.
 std::string Dump(const Port_Message& message) {
   const std::string domain = message.domain;
-  return NameOf(message.severity) + (domain == "tarvomsg" ? "" : domain + " ") +
-         std::string(message.file) + ": " + message.text;
+  const std::string revision = message.revision;
+  return NameOf(message.severity) + (domain == "tarvomsg" ? "" : domain + " ") + message.file +
+         (revision == "1.0" ? "" : " " + revision) + ": " + message.text;
 }
 
 Tarvo::DebugMessenger& Logger() {

@@ -60,8 +60,6 @@ TEST(FileName, BuildsTheNamesOfDataFiles) {
   file.SetTail("sub/deep/a.edn");
   EXPECT_EQ(file.GetName(), "/lib/ipmods/a.b_v1_00_a/data/sub/deep/a.edn");
   EXPECT_EQ(file.GetTail(), "a.edn");
-  file.SetTail(file.GetTail());
-  EXPECT_EQ(file.GetHead(), "/lib/ipmods/a.b_v1_00_a/data/sub/deep");
 }
 
 // What is pushed comes back level by level, down to the root or to nothing.

@@ -30,9 +30,19 @@ TEST(Messages, CarryTheirPlaceAndText) {
   Object(8).issueError("plain\n");
   Object(9).issueFatal(1, "%s", std::string(5000, 'x').c_str());
   EXPECT_THAT(recorder.Take(),
-              ElementsAre("warning dom s/File: 50%s at 3\n", "error dom s/File: plain\n",
-                          "fatal dom s/File: " + std::string(5000, 'x')));
+              ElementsAre("warning dom s/File 2.5: 50%s at 3\n", "error dom s/File 2.5: plain\n",
+                          "fatal dom s/File 2.5: " + std::string(5000, 'x')));
   EXPECT_THAT(recorder.Lines(), ElementsAre(7, 8, 9));
+}
+
+TEST(Messages, AreWholeAtEveryLength) {
+  MessageRecorder recorder;
+  for (std::size_t length = 1000; length < 1050; ++length) {
+    const std::string text(length, 'x');
+    Object().issueError("%s", text.c_str());
+    EXPECT_THAT(recorder.Take(), ElementsAre("error dom s/File 2.5: " + text));
+    EXPECT_EQ(Port::StringBase<char>::doFormat("%s", text.c_str() + 770).View(), text.substr(770));
+  }
 }
 
 TEST(Messages, GoToStandardErrorByDefault) {
@@ -46,14 +56,14 @@ TEST(Messages, GoToStandardErrorByDefault) {
 // A handler that throws loses nothing, and one may issue and exchange handlers itself.
 TEST(Messages, SurviveTheirHandlers) {
   testing::internal::CaptureStderr();
-  EXPECT_FALSE(Port_MsgManData::setHandler([](const Port_Message& message) {
-    const std::string text = message.text;
+  const std::string own(100, 'x');
+  EXPECT_FALSE(Port_MsgManData::setHandler([own](const Port_Message& message) {
     Port_MsgManData::setHandler([](const Port_Message&) { throw 1; });
-    Object().issueError("inner %s", text.c_str());
+    Object().issueError("%s %s", own.c_str(), message.text);
   }));
   Object().issueWarning("outer\n");
   EXPECT_TRUE(Port_MsgManData::setHandler({}));
-  EXPECT_EQ(testing::internal::GetCapturedStderr(), "error: inner outer\n");
+  EXPECT_EQ(testing::internal::GetCapturedStderr(), "error: " + own + " outer\n");
 }
 
 // Short texts need no memory, and a long one is cut when there is none for it.
@@ -74,20 +84,29 @@ TEST(Messages, ComeWithoutMemory) {
   EXPECT_GT(received.size(), 1000U);
 }
 
+// Handlers and sinks are one at a time among threads, whichever calls the other.
 TEST(Messages, AreSafeAmongThreads) {
+  DebugMessenger* const logger = DebugMessengerFactory::GetLogger("threads");
+  std::atomic<int> inside = 0;
   std::atomic<int> handled = 0;
-  int unguarded = 0;  // handler calls never overlap, so no race on this one
-  const auto count = [&](const Port_Message&) { handled += ++unguarded > 0 ? 1 : 0; };
-  Port_MsgManData::setHandler(count);
+  const auto handler = [&](const Port_Message&) {
+    EXPECT_EQ(++inside, 1);
+    if (++handled % 2 == 0) logger->Verbose("");
+    --inside;
+  };
+  logger->SetSink([&](const auto&) { std::this_thread::yield(); });
+  Port_MsgManData::setHandler(handler);
   const auto issue = [] {
     for (int i = 0; i < 2000; ++i) Object(i).issueError("%d\n", i);
   };
-  std::thread first(issue);
-  std::thread second(issue);
-  for (int i = 0; i < 200; ++i) Port_MsgManData::setHandler(count);
-  first.join();
-  second.join();
+  const auto trace = [&] {
+    for (int i = 0; i < 2000; ++i) logger->Verbose("");
+  };
+  std::thread threads[] = {std::thread(issue), std::thread(issue), std::thread(trace)};
+  for (int i = 0; i < 200; ++i) Port_MsgManData::setHandler(handler);
+  for (std::thread& thread : threads) thread.join();
   Port_MsgManData::setHandler({});
+  logger->SetSink({});
   EXPECT_EQ(handled, 4000);
 }
 

@@ -29,6 +29,7 @@ TEST(Regexp, FindsTheFirstMatch) {
                       {kSuffix, "abc", 9, "none"},
                       {kSuffix, "", 0, "none"},
                       {"a+", "baab", 0, "1-2"},
+                      {"ab", "baab", 0, "2-3"},
                       {"x*", "baab", 0, "none"}};
   for (const Row& row : rows) {
     EXPECT_EQ(Dump(Port_Regexp(row.pattern).GetRangeOfMatch(row.text, row.start)), row.range)
