@@ -21,10 +21,10 @@ namespace Tarvo {
 constexpr std::string_view kFailureTail = "\n%s\n";
 
 // What becomes of that tail when something arrives that has no text.
-enum class WithoutText {
-  SaysUnknown,  // ", unknown exception\n"
-  IsCutOff,     // "\n"
-  IsEmpty       // the tail with an empty text
+enum class ForUnknown {
+  SaySo,     // ", unknown exception\n"
+  CutOff,    // "\n"
+  EmptyText  // the tail with an empty text
 };
 
 // A literal for these arguments and the tail, and the line it stands at.
@@ -51,38 +51,38 @@ class Failure {
           const Arguments&... values)
       : module(issuer), format(literal.whole), arguments(values...) {}
 
-  Failure WithoutExceptionText(WithoutText form) const {
+  // The same failure with another form for what has no text.
+  Failure With(ForUnknown form) const {
     Failure copy = *this;
-    copy.withoutText = form;
+    copy.forUnknown = form;
     return copy;
   }
 
-  void Issue(const char* exceptionText) const noexcept {
-    std::apply(
-        [&](const auto&... values) {
-          module.template Error<Arguments..., const char*>(format, values..., exceptionText);
-        },
-        arguments);
-  }
+  void Issue(const char* exceptionText) const noexcept { IssueText(format.text, exceptionText); }
 
   void IssueUnknown() const noexcept {
-    if (withoutText == WithoutText::IsEmpty) return Issue("");
+    if (forUnknown == ForUnknown::EmptyText) return Issue("");
     constexpr std::string_view unknown = ", unknown exception\n";
-    const std::string_view tail = withoutText == WithoutText::IsCutOff ? "\n" : unknown;
-    const std::string_view head(format.text,
-                                std::string_view(format.text).size() - kFailureTail.size());
+    const std::string_view tail = forUnknown == ForUnknown::CutOff ? "\n" : unknown;
+    const std::string_view whole = format.text;
+    const std::string_view head = whole.substr(0, whole.size() - kFailureTail.size());
     std::array<char, FailureFormat<Arguments...>::kLongest + unknown.size()> companion{};
     tail.copy(companion.data() + head.copy(companion.data(), head.size()), tail.size());
-    std::apply(
-        [&](const auto&... values) { module.IssueError(format.line, companion.data(), values...); },
-        arguments);
+    IssueText(companion.data());
   }
 
  private:
+  template <class... Last>
+  void IssueText(const char* text, const Last&... last) const noexcept {
+    std::apply(
+        [&](const auto&... values) { module.ErrorAt(format.line, text, values..., last...); },
+        arguments);
+  }
+
   const Report::Module& module;
   Report::Format<Arguments..., const char*> format;
   std::tuple<const Arguments&...> arguments;
-  WithoutText withoutText = WithoutText::SaysUnknown;
+  ForUnknown forUnknown = ForUnknown::SaySo;
 };
 
 // Outputs of guarded operations, and how they are cleared.
@@ -91,11 +91,12 @@ inline void Clear(NoOutput /*none*/) noexcept {}
 inline void Clear(StringBase& text) noexcept { text.Empty(); }
 inline void Clear(StringList& list) noexcept { list.clear(); }
 
-// Clears the output and does the work. If the work throws, clears the output again and issues the
-// failure. True when the work came to its end, or what it returned if it returns a bool.
+// Does the work, which sets the output as its last step. If it throws, issues the failure and
+// clears the output. True when the work came to its end, or what it returned if it returns a bool.
+// The output is cleared behind the message, not before the work: an argument may lie within it, as
+// in `library.ListIPProperties(list[0], list)`.
 template <class Output, class FailureType, class Work>
 bool Guard(Output&& output, const FailureType& failure, const Work& work) noexcept {
-  Clear(output);
   try {
     if constexpr (std::is_same_v<decltype(work()), bool>) {
       return work();
@@ -104,12 +105,11 @@ bool Guard(Output&& output, const FailureType& failure, const Work& work) noexce
       return true;
     }
   } catch (const std::exception& exception) {
-    Clear(output);
     failure.Issue(exception.what());
   } catch (...) {
-    Clear(output);
     failure.IssueUnknown();
   }
+  Clear(output);
   return false;
 }
 

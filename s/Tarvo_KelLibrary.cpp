@@ -47,8 +47,8 @@ const char* const kIPProperties[] = {"NAME",
                                      "TCL_FILE",
                                      "USAGE_LEVEL"};
 
-// A directory, or something that may not be looked at: adding that to the index reports it. A link
-// to nowhere is neither.
+// True for a directory, and for what may not be looked at, which the index then reports. False for
+// all else, as a file or a link to nowhere.
 bool MayBeVersion(const fs::directory_entry& entry) {
   boost::system::error_code error;
   return fs::is_directory(entry.status(error)) || error == boost::system::errc::permission_denied;
@@ -83,32 +83,31 @@ class KelLibraryImpl {
 KelLibraryImpl::KelLibraryImpl() { TARVO_TRACE("Constructing empty KEL Library\n"); }
 
 bool KelLibraryImpl::SetRepositoryPath(const StringBase& path) {
-  return Guard(NoOutput(),
-               Failure(kModule, "Unable to set repository path to %s\n%s\n", path)
-                   .WithoutExceptionText(WithoutText::IsCutOff),
-               [&] {
-                 TARVO_TRACE("KEL Library: Reading repository path %s\n", path);
-                 repositories = KelLibrary_Utils::GetPathVector(path);
-                 const bool complete = RefreshLibrary();
-                 TARVO_TRACE("KEL Library: repository path set to %s\n", path);
-                 return complete;
-               });
+  return Guard(
+      NoOutput(),
+      Failure(kModule, "Unable to set repository path to %s\n%s\n", path).With(ForUnknown::CutOff),
+      [&] {
+        TARVO_TRACE("KEL Library: Reading repository path %s\n", path);
+        repositories = KelLibrary_Utils::GetPathVector(path);
+        const bool complete = RefreshLibrary();
+        TARVO_TRACE("KEL Library: repository path set to %s\n", path);
+        return complete;
+      });
 }
 
 // A repository without versions does not keep the later ones out; one that can't be read ends the
 // walk.
 bool KelLibraryImpl::RefreshLibrary() {
-  const bool complete = Guard(NoOutput(),
-                              Failure(kModule, "Unable to analyse repository\n%s\n")
-                                  .WithoutExceptionText(WithoutText::IsCutOff),
-                              [&] {
-                                index.ClearIP();
-                                bool all = true;
-                                for (const StringBase& repository : repositories) {
-                                  all = AddRepository(repository) && all;
-                                }
-                                return all;
-                              });
+  const bool complete =
+      Guard(NoOutput(),
+            Failure(kModule, "Unable to analyse repository\n%s\n").With(ForUnknown::CutOff), [&] {
+              index.ClearIP();
+              bool all = true;
+              for (const StringBase& repository : repositories) {
+                all = AddRepository(repository) && all;
+              }
+              return all;
+            });
   TARVO_TRACE("  Detected %d valid cores (%d all versions)\n", index.GetBaseIPCount(),
               index.GetFullIPCount());
   return complete;
@@ -170,15 +169,15 @@ bool KelLibraryImpl::GetIPProperty(const StringBase& key, const StringBase& prop
   return Guard(
       NoOutput(),
       Failure(kModule, "Unable to access IP %s property %s\n%s\n", key, property)
-          .WithoutExceptionText(WithoutText::IsEmpty),
+          .With(ForUnknown::EmptyText),
       [&] { value = OptionScanner::GetOptionValue(index.GetIPOptions(Kel_Key(key)), property); });
 }
 
 bool KelLibraryImpl::ListIPProperties(const StringBase& key, StringList& list) const {
-  return Guard(list,
-               Failure(kModule, "Unable to access IP %s properties\n%s\n", key)
-                   .WithoutExceptionText(WithoutText::IsEmpty),
-               [&] { list = NamesOf(index.GetIPOptions(Kel_Key(key))); });
+  return Guard(
+      list,
+      Failure(kModule, "Unable to access IP %s properties\n%s\n", key).With(ForUnknown::EmptyText),
+      [&] { list = NamesOf(index.GetIPOptions(Kel_Key(key))); });
 }
 
 bool KelLibraryImpl::ListAllIPKeys(StringList& list) const {
@@ -211,6 +210,8 @@ bool KelLibrary::ListIPProperties(const StringBase& key, StringList& list) const
 
 bool KelLibrary::ListAllIPKeys(StringList& list) const { return impl->ListAllIPKeys(list); }
 
+// A question to the library like the others, though its answer needs none of it.
+// NOLINTNEXTLINE(readability-convert-member-functions-to-static)
 bool KelLibrary::ListAllIPProperties(StringList& list) const {
   list.assign(std::begin(kIPProperties), std::end(kIPProperties));
   return true;

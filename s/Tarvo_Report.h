@@ -76,13 +76,13 @@ struct Module {
 
   template <class... Arguments>
   void Error(FormatFor<Arguments...> format, const Arguments&... arguments) const noexcept {
-    IssueError(format.line, format.text, arguments...);
+    ErrorAt(format.line, format.text, arguments...);
   }
 
-  // For a format that was made from a checked one.
+  // For a text that was made from a checked format.
   template <class... Arguments>
-  void IssueError(int line, const char* format, const Arguments&... arguments) const noexcept {
-    Begin(line).issueError(format, Raw(arguments)...);
+  void ErrorAt(int line, const char* text, const Arguments&... arguments) const noexcept {
+    Begin(line).issueError(text, Raw(arguments)...);
   }
 
   Port_MsgManData& Begin(int line) const noexcept {
@@ -111,11 +111,13 @@ inline DebugMessenger& Logger() {
   return *DebugMessengerFactory::GetLogger(name);
 }
 
-// A trace that can't be written changes nothing else: what goes wrong with it ends here.
+// Nothing else depends on whether the logger is on, so what goes wrong with a trace ends here.
 template <class BuildText>
 void TraceIfOn(const BuildText& buildText) noexcept {
   try {
-    if (!Logger().IsOff()) Logger().Verbose(buildText());
+    if (Logger().IsOff()) return;
+    const StringBase text = buildText();
+    Logger().Verbose(text);
   } catch (...) {
     return;
   }

@@ -4,6 +4,7 @@
 #include <stdexcept>
 
 #include "MessageRecorder.h"
+#include "Tarvo_DebugMessenger.h"
 #include "Tarvo_Guard.h"
 
 namespace {
@@ -11,42 +12,53 @@ namespace {
 using namespace Tarvo;
 using testing::ElementsAre;
 
-constexpr Report::Module kModule{"s/Test", "1.0"};
+constexpr Report::Module kModule{"s/Test", "2.0"};
 
+constexpr int kFive = 5;
+constexpr int kLine = __LINE__ + 3;
 template <class Thrown>
-bool Fail(StringBase& output, WithoutText form, const Thrown& thrown) {
-  const StringBase name = "100%s";
-  return Guard(output,
-               Failure(kModule, "Unable to do %s %d\n%s\n", name, 5).WithoutExceptionText(form),
-               [&] {
-                 EXPECT_EQ(output, "");
-                 output = "half done";
-                 throw thrown;
-               });
+bool Fail(StringBase& output, const StringBase& name, ForUnknown form, const Thrown& thrown) {
+  const auto failure = Failure(kModule, "No %s %d\n%s\n", name, kFive).With(form);
+  return Guard(output, failure, [&] { throw thrown; });
 }
 
 TEST(Guard, TurnsWhateverIsThrownIntoAMessage) {
   MessageRecorder recorder;
-  StringBase output = "old";
-  EXPECT_FALSE(Fail(output, WithoutText::SaysUnknown, std::runtime_error("why %d\n")));
+  StringBase output = "100%s";  // the argument lies in the output
+  EXPECT_FALSE(Fail(output, output, ForUnknown::SaySo, std::runtime_error("why %d\n")));
   EXPECT_EQ(output, "");
-  EXPECT_FALSE(Fail(output, WithoutText::SaysUnknown, 1));
-  EXPECT_FALSE(Fail(output, WithoutText::IsCutOff, 2));
-  EXPECT_EQ(output, "");
+  EXPECT_FALSE(Fail(output, "a", ForUnknown::SaySo, 1));
+  EXPECT_FALSE(Fail(output, "b", ForUnknown::CutOff, 2));
+  EXPECT_FALSE(Fail(output, "c", ForUnknown::EmptyText, 3));
   EXPECT_THAT(recorder.Take(),
-              ElementsAre("error s/Test: Unable to do 100%s 5\nwhy %d\n\n",
-                          "error s/Test: Unable to do 100%s 5, unknown exception\n",
-                          "error s/Test: Unable to do 100%s 5\n"));
-  EXPECT_THAT(recorder.Lines(), testing::Each(recorder.Lines().front()));
+              ElementsAre("error s/Test 2.0: No 100%s 5\nwhy %d\n\n",
+                          "error s/Test 2.0: No a 5, unknown exception\n",
+                          "error s/Test 2.0: No b 5\n", "error s/Test 2.0: No c 5\n\n"));
+  EXPECT_THAT(recorder.Lines(), ElementsAre(kLine, kLine, kLine, kLine));
 }
 
 TEST(Guard, GivesWhatTheWorkGives) {
   StringList list = {"old"};
   const auto failure = Failure(kModule, "never\n%s\n");
   EXPECT_FALSE(Guard(list, failure, [] { return false; }));
-  EXPECT_TRUE(Guard(list, failure, [&] { list.emplace_back("new"); }));
+  EXPECT_TRUE(Guard(list, failure, [&] { list = {"new"}; }));
   EXPECT_THAT(list, ElementsAre("new"));
   EXPECT_EQ(GuardText(failure, [] { return "text"; }), "text");
+}
+
+// A trace asks first, and whatever happens to it stays with it.
+TEST(Trace, ChangesNothingElse) {
+  DebugMessenger& logger = *DebugMessengerFactory::GetLogger("BaseIP");
+  int asked = 0;
+  TARVO_TRACE("%d\n", ++asked);
+  EXPECT_EQ(asked, 0);
+  logger.SetSink([](const StringBase& text) {
+    EXPECT_EQ(text, "1\n");
+    throw 1;
+  });
+  TARVO_TRACE("%d\n", ++asked);
+  logger.SetSink({});
+  EXPECT_EQ(asked, 1);
 }
 
 // What the compiler refuses: conversions that don't fit, and a text without its line end.
