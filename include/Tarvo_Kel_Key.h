@@ -20,8 +20,10 @@ namespace Tarvo {
 // invalid key. That is no error: an invalid key is a bare name, and an index takes it as the newest
 // version of that core.
 //
-// Operations that take a text may throw std::bad_alloc. References stay good while the key lives
-// and is not changed. Threads: like an int; several may read one key, who changes it must be alone.
+// Operations that take a text or copy a key may throw std::bad_alloc, and what the platform's
+// regular expressions throw on huge texts; the key then stays as it was. A key that was moved from
+// may only be assigned to or destroyed. References stay good while the key lives and is not
+// changed. Threads: like an int; several may read one key, who changes it must be alone.
 class TARVO_EXPORT Kel_Key {
  public:
   // The empty, invalid key.

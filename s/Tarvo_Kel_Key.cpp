@@ -28,37 +28,39 @@ Kel_Key::Kel_Key(const Kel_Key&) = default;
 
 Kel_Key::Kel_Key(Kel_Key&&) noexcept = default;
 
-Kel_Key& Kel_Key::operator=(const Kel_Key&) = default;
+// Memory may run out while the copy is made, but not afterwards.
+Kel_Key& Kel_Key::operator=(const Kel_Key& other) {
+  Kel_Key copy(other);
+  return *this = std::move(copy);
+}
 
 Kel_Key& Kel_Key::operator=(Kel_Key&&) noexcept = default;
 
 Kel_Key::~Kel_Key() = default;
 
-// The text may be a part of this key, so it is read to the end before anything changes.
+// The new key is built apart, since the text may be a part of this one and memory may run out.
 bool Kel_Key::ExtractVersion(const StringBase& text) {
   const Port_Range suffix = FindSuffix(text);
   const bool onlySuffix = !suffix.IsEmpty() && suffix.first == 0;
-  if (!onlySuffix) valid = !suffix.IsEmpty() && ReadSuffix(text, suffix);
-  if (!valid) BecomeBareName(text);
+  if (onlySuffix && valid) return true;
+  Kel_Key read;
+  read.valid = !suffix.IsEmpty() && !onlySuffix && read.ReadSuffix(text, suffix);
+  if (!read.valid) read.BecomeBareName(text);
+  *this = std::move(read);
   return valid;
 }
 
 // From the suffix's first character: "_", "v", the major digits, "_", two minor digits, "_",
-// letter. False, with nothing changed, for a number that does not fit.
+// letter. False for a number that does not fit.
 bool Kel_Key::ReadSuffix(const StringBase& text, const Port_Range& suffix) {
-  unsigned int majorNumber = 0;
-  unsigned int minorNumber = 0;
-  if (!text.GetUINT32({suffix.first + 2, suffix.last - 5}, &majorNumber) ||
-      !text.GetUINT32({suffix.last - 3, suffix.last - 2}, &minorNumber)) {
+  if (!text.GetUINT32({suffix.first + 2, suffix.last - 5}, &major) ||
+      !text.GetUINT32({suffix.last - 3, suffix.last - 2}, &minor)) {
     return false;
   }
-  StringBase base = text.Extract({0, suffix.first - 1});
+  name = text.Extract({0, suffix.first - 1});
   StringBase lowered = text.Extract({suffix.first + 1, suffix.last});
   lowered.MakeLower();
-  key = StringBase::doFormat("%s_%s", base.GetText(), lowered.GetText());
-  name = std::move(base);
-  major = majorNumber;
-  minor = minorNumber;
+  key = StringBase::doFormat("%s_%s", name.GetText(), lowered.GetText());
   revision = lowered.Extract({lowered.GetLength() - 1, lowered.GetLength() - 1});
   version = StringBase::doFormat("%u.%02u.%s", major, minor, revision.GetText());
   return true;
