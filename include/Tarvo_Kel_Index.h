@@ -42,7 +42,8 @@ class TARVO_EXPORT Kel_Index {
   static const StringBase KEL_VHDL_SUBDIRECTORY;
   static const StringBase KEL_VERILOG_SUBDIRECTORY;
 
-  // The name of a version's data file with that extension. Whether it exists is not asked.
+  // The name of a version's data file with that extension, given without its dot. The location must
+  // hold a directory alone, as FileName::SetHead makes it. Whether the file exists is not asked.
   static Port::FileName GetDataFile(const Port::FileName& location, const Kel_Key& key,
                                     const StringBase& extension);
 
@@ -52,7 +53,8 @@ class TARVO_EXPORT Kel_Index {
   Kel_Index(const Kel_Index&) = delete;
   Kel_Index& operator=(const Kel_Index&) = delete;
 
-  // Adds a version. False, with an error issued and nothing changed, for an invalid key or a
+  // Adds a version at a location, which must hold a directory alone, as FileName::SetHead makes it.
+  // False, with an error issued and nothing changed, for an invalid key or a
   // location that does not exist. The first location added for a key wins: adding it again gives
   // true and changes nothing. Throws AppException if the version's core description can't be read
   // or parsed; then the version is there, without options. Of keys that differ in text but not in

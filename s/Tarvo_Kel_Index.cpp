@@ -71,22 +71,30 @@ auto Find(const Table& table, const Kel_Key& key) {
   return entry;
 }
 
-// Adds the entry, in front of the entries of equal versions, unless its key is there already. Gives
-// the entry of that key and whether it is new. A new list enters the table with its first entry in
-// it, so that none is empty when memory runs out between.
+// The entry of a key, and whether it was added just now.
+template <class Versions>
+struct Insertion {
+  typename Versions::iterator entry;
+  bool isNew;
+};
+
+// Adds the entry, in front of the entries of equal versions, unless its key is there already. A new
+// list enters the table with its first entry in it, so that none is empty when memory runs out.
 template <class Table, class Value>
 auto Insert(Table& table, const Kel_Key& key, const Value& value) {
+  using Versions = typename Table::mapped_type;
+  using Result = Insertion<Versions>;
   const auto core = table.find(key.GetName());
   if (core == table.end()) {
-    typename Table::mapped_type versions;
+    Versions versions;
     const auto entry = versions.emplace(key, value);
     table.emplace(key.GetName(), std::move(versions));
-    return std::make_pair(entry, true);
+    return Result{entry, true};
   }
-  auto& versions = core->second;
+  Versions& versions = core->second;
   const auto known = FindKey(versions, key);
-  if (known != versions.end()) return std::make_pair(known, false);
-  return std::make_pair(versions.emplace_hint(versions.lower_bound(key), key, value), true);
+  if (known != versions.end()) return Result{known, false};
+  return Result{versions.emplace_hint(versions.lower_bound(key), key, value), true};
 }
 
 }  // namespace
@@ -123,12 +131,11 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
     return false;
   }
   const auto inserted = Insert(locations, key, location);
-  const bool added = inserted.second;
-  if (!added) {
+  if (!inserted.isNew) {
     TARVO_TRACE("Duplicate IP index entry %s at %s\nPrecedence given to %s\n", key.GetKey(),
-                location.GetName(), inserted.first->second.GetName());
+                location.GetName(), inserted.entry->second.GetName());
   }
-  const bool withOptions = added && AddIPOptions(key, location);
+  const bool withOptions = inserted.isNew && AddIPOptions(key, location);
   if (!withOptions) {
     TARVO_TRACE("Library IP %s found at %s\n", key.GetKey(), location.GetName());
   }

@@ -109,6 +109,8 @@ TEST_F(Index, RefusesWhatItCannotUse) {
                   "error s/Tarvo_Kel_Index: Invalid IP index entry abc_v1_00_a at "
                   "/nowhere/at/all\n"));
   EXPECT_THROW(index.GetIPKey(Key("abc")), AppException);
+  repo.File("plain", "");
+  EXPECT_TRUE(index.AddIP(Key("abc_v1_00_a"), Directory(repo / "plain")));
 }
 
 TEST(Layout, NamesTheDataFiles) {
