@@ -7,10 +7,11 @@
 #include <utility>
 #include <vector>
 
+#include "Port_Export.h"
 #include "Port_StringBase.h"
 
-#define TARVO_EXPORT __attribute__((visibility("default")))
-#define TARVO_LOCAL __attribute__((visibility("hidden")))
+#define TARVO_EXPORT PORT_EXPORT
+#define TARVO_LOCAL PORT_LOCAL
 
 namespace Tarvo {
 

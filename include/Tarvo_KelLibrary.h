@@ -22,8 +22,9 @@ class KelLibraryImpl;
 // Wherever a key is asked for, it is the text of a version, such as "abc_v1_00_a", or a bare core
 // name, which stands for the newest version of that core.
 //
-// Failures: the operations throw nothing. What goes wrong is issued as a message (see
-// Port_MsgManData), and the result says so. Only the constructor and what says so may throw.
+// Failures: what goes wrong in an operation is issued as a message (see Port_MsgManData), and the
+// result says so. Only the constructor and the operations that say so throw; and a text that is
+// given as `const char*` becomes a string at the call, which may throw std::bad_alloc there.
 //
 // Lifetime: the caller owns the library. Threads: for one at a time; separate libraries may work in
 // separate threads.
@@ -53,8 +54,8 @@ class TARVO_EXPORT KelLibrary {
   // library; so are the other queries.
   StringBase GetLocation(const StringBase& key) const;
 
-  // The full key of the newest version of the core that the key belongs to, whether the version
-  // that it names exists or not.
+  // The full key of the newest version of the core that the key names, whether the version that it
+  // names exists or not. A base name that is itself a key is looked up as that version.
   StringBase GetLatestIPKey(const StringBase& key) const;
 
   // The base name of a version's core, and its version as dotted text such as "1.00.a".

@@ -22,7 +22,9 @@ StringList Split(const StringBase& list, const char* delimiter) {
   return result;
 }
 
+// A path with a NUL byte in it would be tested, and used, without what stands behind.
 bool IsDirectory(const StringBase& path) {
+  if (path.View().find('\0') != std::string_view::npos) return false;
   boost::system::error_code error;
   return boost::filesystem::is_directory(path.GetText(), error);
 }

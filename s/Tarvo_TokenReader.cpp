@@ -2,10 +2,10 @@
 
 namespace Tarvo {
 
-TokenReader::TokenReader(std::string_view text, const char* delimiters, Groups withGroups)
-    : line(text),
+TokenReader::TokenReader(std::string_view wholeLine, const char* delimiters, Groups withGroups)
+    : line(wholeLine),
       groups(withGroups),
-      tokenizer(text.data(), text.data() + text.size(),
+      tokenizer(wholeLine.data(), wholeLine.data() + wholeLine.size(),
                 boost::char_separator<char>("", delimiters, boost::drop_empty_tokens)),
       token(tokenizer.begin()) {}
 

@@ -31,7 +31,7 @@ class TokenReader {
     bool whole;
   };
 
-  TokenReader(std::string_view line, const char* delimiters, Groups groups);
+  TokenReader(std::string_view wholeLine, const char* delimiters, Groups withGroups);
 
   // Passes over blanks. True if a token remains, which is then the current one.
   bool MoreTokens();

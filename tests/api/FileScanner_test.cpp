@@ -50,15 +50,15 @@ TEST(FileScanner, TellsOfFilesAndTabs) {
   const std::string name = directory / "f";
   MessageRecorder recorder(MessageRecorder::MessagesAndTraces);
   directory.File("f", "a\tb\n\tc\n");
-  FileScanner(Port::FileName(name.c_str()));
+  FileScanner scanner(Port::FileName(name.c_str()));
   EXPECT_THAT(recorder.Take(), ElementsAre("trace: Opening File " + name + "\n",
                                            "trace:   Tabs found in file " + name + "\n",
                                            "trace: Closed File " + name + "\n"));
   directory.File("f", "a # b\tc\n#\t\n");
-  FileScanner(Port::FileName(name.c_str()));
+  scanner = FileScanner(Port::FileName(name.c_str()));
   EXPECT_EQ(recorder.Take().size(), 2U);
   try {
-    FileScanner(Port::FileName((name + "%s").c_str()));
+    scanner = FileScanner(Port::FileName((name + "%s").c_str()));
     FAIL();
   } catch (const AppException& exception) {
     EXPECT_EQ(exception.level, AppException::Failure);

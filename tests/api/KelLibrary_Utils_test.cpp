@@ -43,6 +43,8 @@ TEST(KelLibrary_Utils, SplitsAndTestsPaths) {
   EXPECT_EQ(split(";;;"), "");
   EXPECT_EQ(split(good + ";;" + good + "/;"), "<" + good + "><" + good + "/>");
   EXPECT_EQ(split(good + "; " + good), "1 Invalid path directory  " + good + "\n");
+  EXPECT_THROW(KelLibrary_Utils::GetPathVector(StringBase((good + '\0').append("x"))),
+               AppException);
   EXPECT_EQ(split(good + "/plain"), "1 Invalid path directory " + good + "/plain\n");
   EXPECT_EQ(split(good + ";%s;/nowhere"), "1 Invalid path directory %s\n");
   EXPECT_EQ(split(good + ":" + good), "1 Invalid path directory " + good + ":" + good + "\n");

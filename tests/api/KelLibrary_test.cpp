@@ -105,18 +105,26 @@ TEST_F(Library, GoesOnBehindARepositoryWithoutCores) {
                                            other.Path() + " to library\n"));
 }
 
-TEST_F(Library, KeepsWhatItFoundWhenReadingFails) {
+// Whether `ipmods` may not be listed or the repository not be entered.
+TEST_F(Library, EndsItsWalkWhenReadingFails) {
+  RepositoryBuilder behind;
+  behind.Core("last_v1_00_a");
   repo.Core("abc_v1_00_a");
   other.Core("xyz_v1_00_a");
-  fs::permissions(other / "ipmods", fs::perms::none);
-  {
-    const OrdinaryUser user;
-    EXPECT_FALSE(SetPath(library, repo.Path() + ";" + other.Path() + ";" + repo.Path()));
+  for (const std::string& shut : {other / "ipmods", other.Path()}) {
+    fs::permissions(shut, fs::perms::none);
+    {
+      const OrdinaryUser user;
+      EXPECT_FALSE(SetPath(library, repo.Path() + ";" + other.Path() + ";" + behind.Path()));
+    }
+    fs::permissions(shut, fs::perms::all);
+    EXPECT_EQ(library.GetVersion("abc"), "1.00.a");
+    EXPECT_THAT(recorder.Take(),
+                ElementsAre(testing::MatchesRegex(
+                    kLibrary + "Unable to analyse repository\nboost.*" + shut + ".*\n")));
+    EXPECT_EQ(library.GetVersion("last"), "");
+    recorder.Take();
   }
-  fs::permissions(other / "ipmods", fs::perms::all);
-  EXPECT_EQ(library.GetVersion("abc"), "1.00.a");
-  EXPECT_THAT(recorder.Take(),
-              ElementsAre(testing::StartsWith(kLibrary + "Unable to analyse repository\nboost")));
 }
 
 // A directory that may be listed but not entered: each version is refused by itself.
@@ -137,44 +145,64 @@ TEST_F(Library, ReportsVersionsThatItCannotReach) {
 
 TEST(LibraryTraces, TellTheWalkInOrder) {
   RepositoryBuilder repo;
-  repo.Core("abc_v1_00_a");
+  const RepositoryBuilder empty;
+  repo.Core("abc_v1_00_a").Qvr("");
+  const std::string file = repo / "ipmods/abc_v1_00_a/data/abc_v2_1_0.qvr\n";
   MessageRecorder recorder(MessageRecorder::MessagesAndTraces);
   KelLibrary library;
-  EXPECT_TRUE(library.RefreshLibrary());
-  EXPECT_TRUE(SetPath(library, repo.Path()));
-  const std::string version = repo / "ipmods/abc_v1_00_a\n";
+  EXPECT_FALSE(SetPath(library, "/nowhere"));
+  EXPECT_THAT(recorder.Take(), ElementsAre("trace: Constructing empty KEL Library\n",
+                                           "trace: KEL Library: Reading repository path /nowhere\n",
+                                           kLibrary + "Unable to set repository path to /nowhere\n"
+                                                      "Invalid path directory /nowhere\n\n"));
+  const std::string path = repo.Path() + ";" + empty.Path();
+  EXPECT_FALSE(SetPath(library, path));
   EXPECT_THAT(recorder.Take(),
-              ElementsAre("trace: Constructing empty KEL Library\n",
-                          "trace:   Detected 0 valid cores (0 all versions)\n",
-                          "trace: KEL Library: Reading repository path " + repo.Path() + "\n",
+              ElementsAre("trace: KEL Library: Reading repository path " + path + "\n",
                           "trace: KEL Library: Analysing repository " + repo.Path() + "\n",
-                          "trace: Unable to define options for IP abc_v1_00_a at " + version,
-                          "trace: Library IP abc_v1_00_a found at " + version,
-                          "trace:   Detected 0 valid cores (0 all versions)\n",
-                          "trace: KEL Library: repository path set to " + repo.Path() + "\n"));
+                          "trace:   Parsing QVR File " + file, "trace: Opening File " + file,
+                          "trace: Closed File " + file,
+                          "trace: KEL Library: Analysing repository " + empty.Path() + "\n",
+                          "warning s/Tarvo_KelLibrary: Unable to add directory " + empty.Path() +
+                              " to library\n",
+                          "trace:   Detected 1 valid cores (1 all versions)\n",
+                          "trace: KEL Library: repository path set to " + path + "\n"));
 }
 
 // Each operation with its n-th allocation failing, for every n until it succeeds: nothing escapes,
 // the result says so, one message tells it, and the library goes on answering.
 struct Operation {
-  const char* heads;  // what the message may begin with, as a regular expression
+  const char* heads;  // what the message says behind "Unable to", as a regular expression
   const char* tail;   // what it ends in when that which failed has no text
   bool (*run)(KelLibrary& library, const StringBase& path, const StringBase& key);
 };
 
+const char kUnknown[] = ", unknown exception\n";
+
 const Operation kOperations[] = {
-    {"Unable to (set repository path to [^\n]*|analyse repository)", "\n",
+    {"set repository path to [^\n]*|analyse repository", "\n",
      [](auto& library, auto& path, auto&) { return library.SetRepositoryPath(path); }},
-    {"Unable to analyse repository", "\n",
+    {"analyse repository", "\n",
      [](auto& library, auto&, auto&) { return library.RefreshLibrary(); }},
-    {"Unable to get location for IP a_core_whose_name_is_long", ", unknown exception\n",
+    {"get location for IP a_core_with_a_long_name", kUnknown,
      [](auto& library, auto&, auto& key) { return library.GetLocation(key).GetLength() > 0; }},
-    {"Unable to get latest IP key for IP a_core_whose_name_is_long", ", unknown exception\n",
+    {"get latest IP key for IP a_core_with_a_long_name", kUnknown,
      [](auto& library, auto&, auto& key) { return library.GetLatestIPKey(key).GetLength() > 0; }},
-    {"Unable to get name for IP a_core_whose_name_is_long", ", unknown exception\n",
+    {"get name for IP a_core_with_a_long_name", kUnknown,
      [](auto& library, auto&, auto& key) { return library.GetName(key).GetLength() > 0; }},
-    {"Unable to get version for IP a_core_whose_name_is_long", ", unknown exception\n",
-     [](auto& library, auto&, auto& key) { return library.GetVersion(key).GetLength() > 0; }}};
+    {"get version for IP a_core_with_a_long_name", kUnknown,
+     [](auto& library, auto&, auto& key) { return library.GetVersion(key).GetLength() > 0; }},
+    {"access IP a_core_with_a_long_name property DESC", "\n\n",
+     [](auto& library, auto&, auto& key) {
+       StringBase value = "old";
+       const bool done = library.GetIPProperty(key, "DESC", value);
+       return done || value != "old";
+     }},
+    {"access IP a_core_with_a_long_name properties", "\n\n", [](auto& library, auto&, auto& key) {
+       StringList list;
+       const bool done = library.ListIPProperties(key, list);
+       return done || !list.empty();
+     }}};
 
 bool RunWithFault(const Operation& operation, KelLibrary& library, const StringBase& path,
                   const StringBase& key, int count, AllocationFault::Kind kind) {
@@ -183,9 +211,9 @@ bool RunWithFault(const Operation& operation, KelLibrary& library, const StringB
 }
 
 TEST_F(Library, LetsNothingEscape) {
-  repo.Core("a_core_whose_name_is_long_v1_00_a");
+  repo.Core("a_core_with_a_long_name_v1_00_a").Qvr("OPTION DESC = a description of some length");
   const StringBase path = repo.Path().c_str();
-  const StringBase key = "a_core_whose_name_is_long";
+  const StringBase key = "a_core_with_a_long_name";
   for (const Operation& operation : kOperations) {
     for (const auto kind : {AllocationFault::BadAlloc, AllocationFault::SomethingElse}) {
       const std::string tail = kind == AllocationFault::BadAlloc ? "\n[^\n]+\n" : operation.tail;
@@ -198,8 +226,8 @@ TEST_F(Library, LetsNothingEscape) {
           break;
         }
         EXPECT_FALSE(done);
-        EXPECT_THAT(recorder.Take(),
-                    ElementsAre(testing::MatchesRegex(kLibrary + operation.heads + tail)))
+        EXPECT_THAT(recorder.Take(), ElementsAre(testing::MatchesRegex(
+                                         kLibrary + "Unable to (" + operation.heads + ")" + tail)))
             << count;
       }
       EXPECT_GT(count, 0) << operation.heads;
