@@ -11,5 +11,6 @@ show() {
   printf '\n$ kel %s\n' "$*"
   build/demo/bin/kel "$@"
 }
-show -L examples/repository which word_fifo event_station pulse_counter_v1_00_a pulse_counter
-show -L examples/overlay -L examples/repository which pulse_counter
+show -L examples/repository list
+show -L examples/overlay -L examples/repository which word_fifo pulse_counter_v1_00_a pulse_counter
+show -L examples/repository show word_fifo
