@@ -74,6 +74,33 @@ TEST(KelWhich, TellsBadInputByItsStatus) {
   }
 }
 
+TEST(KelList, ListsTheNewestOrAllVersions) {
+  RepositoryBuilder repo;
+  repo.Core("b_v2_00_a").Qvr("OPTION DESC = two");
+  repo.Core("b_v10_00_a").Qvr("OPTION HDL = VHDL");
+  repo.Core("b_v20_00_a");
+  repo.Core("a_v1_00_a").Qvr("OPTION STYLE");
+  repo.Core("c_v1_00_a").Qvr("OPTION STYLE = MIX");
+  const std::string at = repo / "ipmods/";
+  const std::string newest = "b_v10_00_a\tHDL\tVHDL\t" + at + "b_v10_00_a\t\n";
+  const std::string last = "c_v1_00_a\tMIX\t\t" + at + "c_v1_00_a\t\n";
+  const CommandResult result = Kel("list -L " + repo.Path());
+  EXPECT_EQ(result.status, 1);
+  EXPECT_EQ(result.output, newest + last);
+  EXPECT_NE(result.errors.find("kel: error: Invalid IP index entry a_v1_00_a"), std::string::npos);
+  EXPECT_EQ(Kel("list --all -L " + repo.Path()).output,
+            newest + "b_v2_00_a\tHDL\t\t" + at + "b_v2_00_a\ttwo\n" + last);
+}
+
+TEST(KelShow, ShowsEachOptionOnce) {
+  RepositoryBuilder repo;
+  repo.Core("b_v2_00_a").Qvr("OPTION A = 1\nOPTION A = 2\nOPTION NAME = other");
+  EXPECT_EQ(Kel("show b -L " + repo.Path()).output,
+            "NAME\tb\nVERSION\t2.00.a\nA\t1\nIMP_NETLIST\tFALSE\nRUN_TRAMFOLD\tFALSE\n"
+            "STYLE\tHDL\nUSAGE_LEVEL\tADVANCED_USER\n");
+  EXPECT_EQ(Kel("show nope -L " + repo.Path()).status, 1);
+}
+
 TEST(Kel, ShowsHelpAndVersion) {
   EXPECT_EQ(Kel("--help").status, 0);
   EXPECT_NE(Kel("which --help").output.find("KEY"), std::string::npos);
