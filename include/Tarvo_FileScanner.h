@@ -21,11 +21,12 @@ namespace Tarvo {
 class TARVO_EXPORT FileScanner {
  public:
   // Throws AppException with level Failure, the file's name in its text, if the file can't be read,
-  // opened or closed. May throw std::bad_alloc.
+  // opened or closed. May throw std::bad_alloc, and std::length_error for a line beyond 4 GiB.
   explicit FileScanner(const Port::FileName& file);
   ~FileScanner();
 
-  // Gives the next line. False, with an empty line, when none is left.
+  // Gives the next line. False, with an empty line, when none is left. May throw std::bad_alloc;
+  // the line is then still the next one.
   bool GetNextLine(StringBase& line);
   // The same with the line's number, counted from 1. At the end it is the number that a further
   // line would have.

@@ -29,7 +29,7 @@ class TARVO_EXPORT OptionScanner {
   // Reads the options from the file. Throws AppException with level Failure if the key is not valid
   // (then the file is not touched), if the file can't be read, or, after the whole file, if a
   // statement was bad: each bad one was then issued as an error with its line. May throw
-  // std::bad_alloc.
+  // std::bad_alloc, and std::length_error for a line beyond 4 GiB.
   OptionScanner(const Kel_Key& key, const Port::FileName& file);
   ~OptionScanner();
 

@@ -62,8 +62,9 @@ bool FileScanner::GetNextLine(StringBase& line) {
     line.Empty();
     return false;
   }
-  const Line& next = lines[current++];
+  const Line& next = lines[current];
   line.Assign(text.data() + next.start, static_cast<unsigned>(next.length));
+  ++current;
   return true;
 }
 
