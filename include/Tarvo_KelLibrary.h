@@ -41,9 +41,10 @@ class TARVO_EXPORT KelLibrary {
   //
   // True if every repository was read. False, with an error, if a piece of the path is no
   // directory: then the library goes on answering from the repositories it had. False, too, if a
-  // repository has no `ipmods` (a warning), if a version can't be entered or if reading a directory
-  // fails (errors): then what was found stays usable. Directories whose names are no keys are
-  // passed over in silence.
+  // repository has no `ipmods` (a warning), if a version can't be looked at or if reading a
+  // directory fails (errors): then what was found stays usable. A core description that can't be
+  // read or parsed is an error too, but costs only that version its options and leaves the result
+  // true. Directories whose names are no keys are passed over in silence.
   bool SetRepositoryPath(const StringBase& path);
 
   // Reads the same repositories again. The result is that of SetRepositoryPath; the path itself is
@@ -63,15 +64,16 @@ class TARVO_EXPORT KelLibrary {
   StringBase GetVersion(const StringBase& key) const;
 
   // The value of an option of a version. True with an empty value for an option that is not there.
-  // False, with an error and the value untouched, for a key without a core description.
+  // False, with an error and the value untouched, for a key without options: one
+  // that is not in the library, or whose core description is missing or could not be read.
   bool GetIPProperty(const StringBase& key, const StringBase& property, StringBase& value) const;
 
   // Replaces the list by the names of a version's options: NAME, VERSION, those of the description
   // in its order, and the defaults that it leaves out. False, with an error and an empty list, for
-  // a key without a core description.
+  // a key without options.
   bool ListIPProperties(const StringBase& key, StringList& list) const;
 
-  // Replaces the list by the keys of all versions with a core description, in the order of their
+  // Replaces the list by the keys of all versions that have options, in the order of their
   // bytes. Always true; may throw std::bad_alloc.
   bool ListAllIPKeys(StringList& list) const;
 

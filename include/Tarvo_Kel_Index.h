@@ -12,7 +12,7 @@
 namespace Tarvo {
 
 // The catalogue of what repositories hold: for each core its versions, newest first, each with the
-// directory that it lies in (its location) and, if its core description exists, its options.
+// directory that it lies in (its location) and, if its core description could be read, its options.
 //
 // A key that is not valid stands for a bare core name: lookups answer for that core's newest
 // version. A valid key is found only as that very version.
@@ -54,26 +54,29 @@ class TARVO_EXPORT Kel_Index {
   Kel_Index& operator=(const Kel_Index&) = delete;
 
   // Adds a version at a location, which must hold a directory alone, as FileName::SetHead makes it.
-  // False, with an error issued and nothing changed, for an invalid key or a
-  // location that does not exist. The first location added for a key wins: adding it again gives
-  // true and changes nothing. Throws AppException if the version's core description can't be read
-  // or parsed; then the version is there, without options. Of keys that differ in text but not in
-  // version, such as `abc_v1_00_a` and `abc_v01_00_a`, the one added later stands in front.
+  // False, with an error issued and nothing changed, for an invalid key or a location that does not
+  // exist. The first location added for a key wins: adding it again gives true and changes nothing.
+  // Of keys that differ in text but not in version, such as `abc_v1_00_a` and `abc_v01_00_a`, the
+  // one added later stands in front.
+  //
+  // Throws AppException if the version's core description exists but can't be read or parsed. Then,
+  // and when memory runs out while it is read, the version is there, without options.
   bool AddIP(const Kel_Key& key, const Port::FileName& location);
 
   // Empties the index.
   void ClearIP();
 
-  // Among the versions with a core description: the number of cores, and of versions.
+  // Among the versions whose core description could be read: the number of cores, and of versions.
   unsigned int GetBaseIPCount() const;
   unsigned int GetFullIPCount() const;
 
-  // The options of a version, in the order of OptionScanner::GetOptions. Only versions with a core
-  // description have any, so a bare name may stand for an older version here than in the lookups
-  // below. The reference stays good until ClearIP or the end of the index. Throws AppException.
+  // The options of a version, in the order of OptionScanner::GetOptions. Only versions whose
+  // core description could be read have any, so a bare name may stand for an older version here
+  // than in the lookups below. The reference stays good until ClearIP or the end of the index.
+  // Throws AppException.
   const PropertyList& GetIPOptions(const Kel_Key& key) const;
 
-  // The keys of all versions with a core description, and of the newest such version of each core,
+  // The keys of all versions that have options, and of the newest such version of each core,
   // in the order of their bytes, each once.
   StringList GetAllIPKeys() const;
   StringList GetLatestIPKeys() const;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <boost/filesystem.hpp>
 #include <cstdint>
+#include <utility>
 
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_Report.h"
@@ -33,11 +34,13 @@ bool Exists(const FileName& location) {
   return boost::filesystem::exists(location.GetName().GetText(), error);
 }
 
-// What can't be asked for may well be there: reading it then tells what is wrong.
+// What can't be asked for may well be there: reading it then tells what is wrong. A name that is
+// too long for a file is known to be missing.
 bool MayExist(const FileName& file) {
   boost::system::error_code error;
   const auto status = boost::filesystem::status(file.GetName().GetText(), error);
-  return status.type() != boost::filesystem::file_not_found;
+  return status.type() != boost::filesystem::file_not_found &&
+         error != boost::system::errc::filename_too_long;
 }
 
 // The keys of the entries that `gather` adds from each list, sorted, each once.
@@ -81,20 +84,20 @@ struct Insertion {
 // Adds the entry, in front of the entries of equal versions, unless its key is there already. A new
 // list enters the table with its first entry in it, so that none is empty when memory runs out.
 template <class Table, class Value>
-auto Insert(Table& table, const Kel_Key& key, const Value& value) {
+auto Insert(Table& table, const Kel_Key& key, Value value) {
   using Versions = typename Table::mapped_type;
   using Result = Insertion<Versions>;
   const auto core = table.find(key.GetName());
   if (core == table.end()) {
     Versions versions;
-    const auto entry = versions.emplace(key, value);
+    const auto entry = versions.emplace(key, std::move(value));
     table.emplace(key.GetName(), std::move(versions));
     return Result{entry, true};
   }
   Versions& versions = core->second;
   const auto known = FindKey(versions, key);
   if (known != versions.end()) return Result{known, false};
-  return Result{versions.emplace_hint(versions.lower_bound(key), key, value), true};
+  return Result{versions.emplace_hint(versions.lower_bound(key), key, std::move(value)), true};
 }
 
 }  // namespace
