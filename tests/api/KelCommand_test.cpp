@@ -57,11 +57,11 @@ TEST(KelWhich, TellsBadInputByItsStatus) {
       {"-L '" + empty.Path() + "' -L repository which word_fifo", 0,
        "kel: warning: Unable to add directory " + empty.Path() + " to library\n", true},
       {"-L repository which", 2, "kel: error: KEY is required\n", false},
-      {"wich word_fifo", 2, "kel: error: 'wich' is no", false},
+      {"wich word_fifo", 2, "kel: error: 'wich' is not", false},
       {"-L '' which word_fifo", 2, "kel: error: --library needs", false},
       {"which word_fifo", 2, "kel: error: --library is required\n", false},
       {"-L repository", 2, "kel: error: A subcommand is required: ", false},
-      {"-L repository which --nonsense word_fifo", 2, "kel: error: '--nonsense' is no", false},
+      {"-L repository which --nonsense word_fifo", 2, "kel: error: '--nonsense' is not", false},
       {"-L repository which word_fifo >/dev/full", 1,
        "kel: error: Unable to write to standard output\n", false}};
   for (const Row& row : rows) {
@@ -94,9 +94,9 @@ TEST(KelList, ListsTheNewestOrAllVersions) {
 
 TEST(KelShow, ShowsEachOptionOnce) {
   RepositoryBuilder repo;
-  repo.Core("b_v2_00_a").Qvr("OPTION A = 1\nOPTION A = 2\nOPTION NAME = other");
+  repo.Core("b_v2_00_a").Qvr("OPTION A = \x1B[1m\nOPTION A = 2\nOPTION NAME = other");
   EXPECT_EQ(Kel("show b -L " + repo.Path()).output,
-            "NAME\tb\nVERSION\t2.00.a\nA\t1\nIMP_NETLIST\tFALSE\nRUN_TRAMFOLD\tFALSE\n"
+            "NAME\tb\nVERSION\t2.00.a\nA\t\\x1b[1m\nIMP_NETLIST\tFALSE\nRUN_TRAMFOLD\tFALSE\n"
             "STYLE\tHDL\nUSAGE_LEVEL\tADVANCED_USER\n");
   EXPECT_EQ(Kel("show nope -L " + repo.Path()).status, 1);
 }

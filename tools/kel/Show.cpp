@@ -13,7 +13,7 @@ Status Show(const Tarvo::KelLibrary& library, const std::string& key) {
     if (!shown.insert(name).second) continue;
     Tarvo::StringBase value;
     library.GetIPProperty(key.c_str(), name, value);
-    table.Add({name.GetText(), value.GetText()});
+    table.Add({name, value});
   }
   table.Write();
   return StatusClean;

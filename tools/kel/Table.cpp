@@ -5,19 +5,32 @@
 #include <algorithm>
 #include <cstddef>
 #include <iostream>
+#include <string_view>
+#include <utility>
 
 namespace {
 
-// The last field of a row needs no padding; a width of 0 asks for a tab instead.
-void WriteRow(const Table::Row& row, const std::vector<std::size_t>& widths) {
-  for (std::size_t i = 0; i + 1 < row.size(); ++i) {
-    const std::string gap = widths[i] ? std::string(widths[i] + 2 - row[i].size(), ' ') : "\t";
-    std::cout << row[i] << gap;
+std::string Printable(std::string_view field) {
+  constexpr std::string_view digits = "0123456789abcdef";
+  std::string text;
+  for (const char c : field) {
+    const auto byte = static_cast<unsigned char>(c);
+    if (byte >= ' ' && byte != 0x7F) {
+      text += c;
+    } else {
+      text += {'\\', 'x', digits[byte / 16], digits[byte % 16]};
+    }
   }
-  std::cout << row.back() << '\n';
+  return text;
 }
 
 }  // namespace
+
+void Table::Add(const std::vector<Tarvo::StringBase>& fields) {
+  Row row;
+  for (const Tarvo::StringBase& field : fields) row.push_back(Printable(field.View()));
+  rows.push_back(std::move(row));
+}
 
 std::vector<std::size_t> Table::Widths() const {
   std::vector<std::size_t> widths;
@@ -25,11 +38,18 @@ std::vector<std::size_t> Table::Widths() const {
     widths.resize(std::max(widths.size(), row.size()));
     for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
   }
-  if (!::isatty(STDOUT_FILENO)) std::fill(widths.begin(), widths.end(), 0);
   return widths;
 }
 
+// The last field of a row needs nothing behind it.
 void Table::Write() const {
+  const bool aligned = ::isatty(STDOUT_FILENO);
   const std::vector<std::size_t> widths = Widths();
-  for (const Row& row : rows) WriteRow(row, widths);
+  for (const Row& row : rows) {
+    for (std::size_t i = 0; i + 1 < row.size(); ++i) {
+      const std::string gap = aligned ? std::string(widths[i] + 2 - row[i].size(), ' ') : "\t";
+      std::cout << row[i] << gap;
+    }
+    std::cout << row.back() << '\n';
+  }
 }

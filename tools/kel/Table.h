@@ -3,16 +3,18 @@
 
 #include <cstddef>
 #include <string>
-#include <utility>
 #include <vector>
 
+#include "Tarvo_Export.h"
+
 // Rows of fields for standard output: aligned in columns on a terminal, with a tab between the
-// fields into a pipe or file, where scripts read them.
+// fields into a pipe or file, where scripts read them. Control characters are written as \xNN, so
+// that a row stays one line and no field breaks into two.
 class Table {
  public:
   using Row = std::vector<std::string>;
 
-  void Add(Row row) { rows.push_back(std::move(row)); }
+  void Add(const std::vector<Tarvo::StringBase>& fields);
   bool IsEmpty() const { return rows.empty(); }
   void Write() const;
 

@@ -13,8 +13,8 @@
 // A line for each key or bare name: the key it resolves to, name, version and location.
 Status Which(const Tarvo::KelLibrary& library, const std::vector<std::string>& keys);
 
-// A line for each core with a description, or for each version of it: key, style, language,
-// location and description.
+// A line for the newest version of each core, or for each version, whose description could be read:
+// key, style, language, location and description.
 Status List(const Tarvo::KelLibrary& library, bool allVersions);
 
 // A line for each option of a core: name and value.

@@ -15,8 +15,7 @@ StringBase Resolve(const Tarvo::KelLibrary& library, const StringBase& text) {
 bool Add(Table& table, const Tarvo::KelLibrary& library, const StringBase& text) {
   const StringBase location = library.GetLocation(text);
   if (location.GetLength() == 0) return false;
-  table.Add({Resolve(library, text).GetText(), library.GetName(text).GetText(),
-             library.GetVersion(text).GetText(), location.GetText()});
+  table.Add({Resolve(library, text), library.GetName(text), library.GetVersion(text), location});
   return true;
 }
 

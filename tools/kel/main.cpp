@@ -72,7 +72,7 @@ void DescribeCall(CLI::App& app, Call& call) {
 // What is wrong with a call that parsed, or an empty text.
 std::string Fault(const CLI::App& app, const Call& call) {
   const std::vector<std::string> extras = app.remaining(true);
-  if (!extras.empty()) return "'" + extras.front() + "' is no subcommand or option";
+  if (!extras.empty()) return "'" + extras.front() + "' is not expected here";
   if (!call.verb) return "A subcommand is required: list, show or which";
   if (call.libraries.empty()) return "--library is required";
   const bool empty = std::any_of(
