@@ -43,7 +43,7 @@ std::vector<std::size_t> Table::Widths() const {
 
 // The last field of a row needs nothing behind it.
 void Table::Write() const {
-  const bool aligned = ::isatty(STDOUT_FILENO);
+  const bool aligned = ::isatty(STDOUT_FILENO) != 0;
   const std::vector<std::size_t> widths = Widths();
   for (const Row& row : rows) {
     for (std::size_t i = 0; i + 1 < row.size(); ++i) {
