@@ -1,5 +1,8 @@
 #include "Tarvo_QVRStatement.h"
 
+#include <string_view>
+#include <utility>
+
 #include "Tarvo_TokenReader.h"
 
 namespace Tarvo::QVRStatement {
@@ -51,9 +54,9 @@ Result ReadOption(const StringBase& line, const char* delimiters, Property& opti
   Property read;
   if (!ReadPair(tokens, read)) return Unparsable;
   tokens.Step();
-  StringBase& value = read.second;
-  value = StringBase(std::string(value.View()).append(tokens.GetRest()));
-  value.Trim(" \t", StringBase::TrimBoth);
+  const std::string_view tail = tokens.GetRest();
+  read.second.Append(tail.data(), static_cast<unsigned>(tail.size()));
+  read.second.Trim(" \t", StringBase::TrimBoth);
   option = std::move(read);
   return Read;
 }

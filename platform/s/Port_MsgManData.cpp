@@ -16,7 +16,7 @@ namespace {
 
 using MessageChannel = Port::Channel<Port_Message>;
 
-// Never destroyed, as its lock, and made without the heap: messages may come when memory has run
+// Never destroyed, like its lock, and made without the heap: messages may come when memory has run
 // out.
 MessageChannel& Messages() {
   alignas(MessageChannel) static std::array<std::byte, sizeof(MessageChannel)> place;
