@@ -67,7 +67,8 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
     kModule.Error("QVR unparsable OPTION: %s line %d, %s\n", name, lineNumber, line);
     ok = false;
   }
-  AppendMissing(options, kOptionDefaults);
+  ForEachMissing(options, kOptionDefaults,
+                 [&](const DefaultRow& row) { options.emplace_back(*row.name, *row.value); });
   if (!ok) throw Report::Exception(AppException::Failure, "Unable to parse QVR %s\n", name);
 }
 

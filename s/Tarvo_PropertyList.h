@@ -2,6 +2,7 @@
 #define TARVO_PROPERTYLIST_H
 
 #include <algorithm>
+#include <span>
 
 #include "Tarvo_Export.h"
 
@@ -9,12 +10,14 @@ namespace Tarvo {
 
 // What all users of a PropertyList share: the first match, the names, and rows of defaults.
 
-// A row of a table of defaults. It points at exported constants, so that no table depends on the
-// order in which modules load.
+// A row of a table of defaults, and what the properties must show for it to apply, if anything. It
+// points at exported constants, so that no table depends on the order in which modules load.
 struct DefaultRow {
   const StringBase* name;
   const StringBase* value;
+  bool (*applies)(const PropertyList& properties) = nullptr;
 };
+using DefaultRows = std::span<const DefaultRow>;
 
 // The value of the first entry with exactly that name, or null.
 inline const StringBase* FindValue(const PropertyList& properties, const StringBase& name) {
@@ -31,11 +34,24 @@ inline StringList NamesOf(const PropertyList& properties) {
   return names;
 }
 
-// Appends the rows whose names are missing, in their order.
-template <class Rows>
-void AppendMissing(PropertyList& properties, const Rows& defaults) {
+inline bool Applies(const DefaultRow& row, const PropertyList& properties) {
+  return !row.applies || row.applies(properties);
+}
+
+// The default of that name, in either letter case, or null.
+inline const StringBase* FindDefault(const PropertyList& properties, DefaultRows defaults,
+                                     const StringBase& name) {
+  const auto found = std::find_if(defaults.begin(), defaults.end(), [&](const DefaultRow& row) {
+    return name.Compare(*row.name, StringBase::CompareIgnoreCase) == 0 && Applies(row, properties);
+  });
+  return found == defaults.end() ? nullptr : found->value;
+}
+
+// Gives `add` each row that applies and whose name is missing, in their order.
+template <class Add>
+void ForEachMissing(const PropertyList& properties, DefaultRows defaults, const Add& add) {
   for (const DefaultRow& row : defaults) {
-    if (!FindValue(properties, *row.name)) properties.emplace_back(*row.name, *row.value);
+    if (!FindValue(properties, *row.name) && Applies(row, properties)) add(row);
   }
 }
 

@@ -2,6 +2,11 @@
 
 namespace Tarvo {
 
+std::string_view FirstWord(std::string_view line) {
+  const std::size_t blank = line.find(' ');
+  return blank == std::string_view::npos ? std::string_view() : line.substr(0, blank);
+}
+
 TokenReader::TokenReader(std::string_view wholeLine, const char* delimiters, Groups withGroups)
     : line(wholeLine),
       groups(withGroups),

@@ -8,6 +8,10 @@
 
 namespace Tarvo {
 
+// The text before the first blank of a cleaned line; empty for a line without one. All formats tell
+// their statements apart by it.
+std::string_view FirstWord(std::string_view line);
+
 // Reads the tokens and values of a line, for all three formats. Each delimiter is a token of its
 // own, each longest run of other characters is one, and nothing is dropped: the tokens of a line,
 // joined, give the line back.

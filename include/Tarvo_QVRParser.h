@@ -1,0 +1,161 @@
+#ifndef TARVO_QVRPARSER_H
+#define TARVO_QVRPARSER_H
+
+#include <vector>
+
+#include "Port_FileName.h"
+#include "Tarvo_Export.h"
+
+namespace Tarvo {
+
+class Kel_Index;
+class Kel_Key;
+
+// One statement of a core description: its name, and its properties in the order of the line, with
+// the fixed ones that its kind adds.
+struct QVRRecord {
+  StringBase name;
+  PropertyList properties;
+};
+
+// A core description, read as a whole: options, parameters, generics, ports, bus interfaces and I/O
+// interfaces.
+//
+//     const Tarvo::QVRParser parser(Port::FileName("pulse_counter_v2_1_0.qvr"));
+//     for (const auto& port : parser.ListPorts())
+//       std::cout << port << ' ' << parser.GetPortProperty(port, "DIR") << '\n';
+//
+// Records: all statements of a kind, in the order of the file, namesakes included; a lookup finds
+// the first of them. Names are compared exactly, letter case included. A parameter is a generic too
+// unless the file gives it the TYPE NON_HDL; the generic is a copy that lives by itself from then
+// on.
+//
+// Properties: those that the file states and, behind them, the defaults of their kind that it
+// leaves out. A property that stands twice counts by its first entry. A default is found by its
+// name in either letter case. Whatever a List operation names can be asked for with the matching
+// Get.
+//
+//     parameter, generic   NAME, VALUE, DEFAULT_VALUE, then as stated
+//                          default: ASSIGNMENT, ISVALID, PERMIT, TYPE
+//     port                 NAME, DEFAULT, then as stated
+//                          default: ASSIGNMENT, ENABLE, ENDIAN (if VEC is not empty), INITIALVAL,
+//                          INTERRUPT_PRIORITY (if SIGIS is INTERRUPT), ISVALID, PERMIT
+//     bus interface        as stated, NAME in front of BUS; default: ISVALID, SHARES_ADDR
+//     I/O interface        as stated, NAME in front of IO_IF; default: ISVALID
+//     option               a single value; default: IMP_NETLIST, RUN_TRAMFOLD, STYLE, USAGE_LEVEL
+//
+// Failures: a name that is not there throws AppException with level NotFound. Every operation but
+// the destructor may throw std::bad_alloc. Lookups walk the records from the front, so that their
+// cost is in proportion to the description.
+//
+// Threads: like an int; several may ask one parser, who sets a property must be alone.
+class TARVO_EXPORT QVRParser {
+ public:
+  static const StringBase QVR_TRUE;
+  static const StringBase QVR_FALSE;
+  static const StringBase QVR_PROPERTY_NAME;
+  static const StringBase QVR_PROPERTY_VALUE;
+  static const StringBase QVR_PROPERTY_DEFAULT;
+  static const StringBase QVR_PROPERTY_VERSION;
+  static const StringBase QVR_BUS_IF_NAME;
+  static const StringBase QVR_BUS_IF_ROLE_NAME;
+  static const StringBase QVR_IO_IF_NAME;
+  static const StringBase QVR_IO_IF_ROLE_NAME;
+  static const StringBase QVR_ASSIGNMENT;
+  static const StringBase QVR_ASSIGNMENT_OPTIONAL;
+  static const StringBase QVR_ISVALID;
+  static const StringBase QVR_PERMIT;
+  static const StringBase QVR_PERMIT_ADVANCED_USER;
+  static const StringBase QVR_OPTION_IMP_NETLIST;
+  static const StringBase QVR_OPTION_RUN_TRAMFOLD;
+  static const StringBase QVR_OPTION_STYLE;
+  static const StringBase QVR_OPTION_STYLE_HDL;
+  static const StringBase QVR_OPTION_USAGE_LEVEL;
+  static const StringBase QVR_PARAMETER_TYPE;
+  static const StringBase QVR_PARAMETER_TYPE_HDL;
+  static const StringBase QVR_PARAMETER_TYPE_NON_HDL;
+  static const StringBase QVR_BUS_INTERFACE_SHARES_ADDR;
+  static const StringBase QVR_BUS_INTERFACE_SHARES_ADDR_ALL;
+  static const StringBase QVR_PORT_ENABLE;
+  static const StringBase QVR_PORT_ENABLE_SINGLE;
+  static const StringBase QVR_PORT_ENDIAN;
+  static const StringBase QVR_PORT_ENDIAN_BIG;
+  static const StringBase QVR_PORT_INITIALVAL;
+  static const StringBase QVR_PORT_INITIALVAL_GND;
+  static const StringBase QVR_PORT_INTERRUPT_PRIORITY;
+  static const StringBase QVR_PORT_INTERRUPT_PRIORITY_MEDIUM;
+  static const StringBase QVR_PORT_SIGIS;
+  static const StringBase QVR_PORT_SIGIS_INTERRUPT;
+  static const StringBase QVR_PORT_VEC;
+
+  // Reads a file of any name. Throws AppException with level Failure if the file can't be read, or
+  // if a statement is bad: the first bad one is issued as an error with its line, and nothing
+  // behind it is read.
+  explicit QVRParser(const Port::FileName& file);
+  // Reads the description of a version. Throws, besides the above, what Kel_Index::GetIPLocation
+  // throws. The index is not kept.
+  QVRParser(const Kel_Index& index, const Kel_Key& key);
+  ~QVRParser();
+
+  // Names in the order of the file; behind the options the missing defaults. Namesakes are listed
+  // each.
+  StringList ListOptions() const;
+  StringList ListParameters() const;
+  StringList ListGenerics() const;
+  StringList ListBusInterfaces() const;
+  StringList ListIoInterfaces() const;
+  StringList ListPorts() const;
+
+  // The value of an option or of a record's property; it may be empty. Throw AppException.
+  StringBase GetOptionValue(const StringBase& option) const;
+  StringBase GetParameterProperty(const StringBase& parameter, const StringBase& property) const;
+  StringBase GetGenericProperty(const StringBase& generic, const StringBase& property) const;
+  StringBase GetBusInterfaceProperty(const StringBase& interface, const StringBase& property) const;
+  StringBase GetIoInterfaceProperty(const StringBase& interface, const StringBase& property) const;
+  StringBase GetPortProperty(const StringBase& port, const StringBase& property) const;
+
+  // The names of a record's properties: the fixed and stated ones in the order of the file,
+  // duplicates included, then the missing defaults. Throw AppException.
+  StringList ListParameterProperties(const StringBase& parameter) const;
+  StringList ListGenericProperties(const StringBase& generic) const;
+  StringList ListBusInterfaceProperties(const StringBase& interface) const;
+  StringList ListIoInterfaceProperties(const StringBase& interface) const;
+  StringList ListPortProperties(const StringBase& port) const;
+
+  // The parameters or ports that belong to a declared interface, in the order of the file: those
+  // with a property BUS, or IO_IF, that names it, alone or among others with colons between. Throw
+  // AppException for an interface that the file doesn't declare.
+  StringList ListBusInterfaceParameters(const StringBase& interface) const;
+  StringList ListBusInterfacePorts(const StringBase& interface) const;
+  StringList ListIoInterfaceParameters(const StringBase& interface) const;
+  StringList ListIoInterfacePorts(const StringBase& interface) const;
+
+  // Set the first property of exactly that name, or append it to the stated ones. Neither touches
+  // the record of the other kind, nor moves one in or out of the generics; setting VALUE leaves
+  // DEFAULT_VALUE as the file gave it. Throw AppException; then nothing has changed.
+  void SetParameterProperty(const StringBase& parameter, const StringBase& property,
+                            const StringBase& value);
+  void SetGenericProperty(const StringBase& generic, const StringBase& property,
+                          const StringBase& value);
+
+ private:
+  using Records = std::vector<QVRRecord>;
+
+  TARVO_LOCAL bool ReadStatement(const StringBase& keyword, const StringBase& line);
+  TARVO_LOCAL bool ReadOption(const StringBase& line);
+  TARVO_LOCAL bool ReadParameter(const StringBase& line);
+  TARVO_LOCAL bool ReadPort(const StringBase& line);
+  TARVO_LOCAL static bool ReadInterface(const StringBase& line, const StringBase& key,
+                                        Records& interfaces);
+
+  PropertyList options;
+  Records generics;
+  Records parameters;
+  Records ports;
+  Records busInterfaces;
+  Records ioInterfaces;
+};
+
+}  // namespace Tarvo
+
+#endif

@@ -1,0 +1,380 @@
+#include "Tarvo_QVRParser.h"
+
+#include <algorithm>
+#include <initializer_list>
+#include <iterator>
+#include <string_view>
+#include <utility>
+
+#include "Tarvo_FileScanner.h"
+#include "Tarvo_KelLibrary_Utils.h"
+#include "Tarvo_Kel_Index.h"
+#include "Tarvo_Kel_Key.h"
+#include "Tarvo_OptionDefaults.h"
+#include "Tarvo_PropertyList.h"
+#include "Tarvo_QVRStatement.h"
+#include "Tarvo_Report.h"
+#include "Tarvo_TokenReader.h"
+
+namespace Tarvo {
+
+const StringBase QVRParser::QVR_TRUE = "TRUE";
+const StringBase QVRParser::QVR_FALSE = "FALSE";
+const StringBase QVRParser::QVR_PROPERTY_NAME = "NAME";
+const StringBase QVRParser::QVR_PROPERTY_VALUE = "VALUE";
+const StringBase QVRParser::QVR_PROPERTY_DEFAULT = "DEFAULT_VALUE";
+const StringBase QVRParser::QVR_PROPERTY_VERSION = "VERSION";
+const StringBase QVRParser::QVR_BUS_IF_NAME = "BUS";
+const StringBase QVRParser::QVR_BUS_IF_ROLE_NAME = "DEFAULT";
+const StringBase QVRParser::QVR_IO_IF_NAME = "IO_IF";
+const StringBase QVRParser::QVR_IO_IF_ROLE_NAME = "IO_IS";
+const StringBase QVRParser::QVR_ASSIGNMENT = "ASSIGNMENT";
+const StringBase QVRParser::QVR_ASSIGNMENT_OPTIONAL = "OPTIONAL";
+const StringBase QVRParser::QVR_ISVALID = "ISVALID";
+const StringBase QVRParser::QVR_PERMIT = "PERMIT";
+const StringBase QVRParser::QVR_PERMIT_ADVANCED_USER = "ADVANCED_USER";
+const StringBase QVRParser::QVR_OPTION_IMP_NETLIST = "IMP_NETLIST";
+const StringBase QVRParser::QVR_OPTION_RUN_TRAMFOLD = "RUN_TRAMFOLD";
+const StringBase QVRParser::QVR_OPTION_STYLE = "STYLE";
+const StringBase QVRParser::QVR_OPTION_STYLE_HDL = "HDL";
+const StringBase QVRParser::QVR_OPTION_USAGE_LEVEL = "USAGE_LEVEL";
+const StringBase QVRParser::QVR_PARAMETER_TYPE = "TYPE";
+const StringBase QVRParser::QVR_PARAMETER_TYPE_HDL = "HDL";
+const StringBase QVRParser::QVR_PARAMETER_TYPE_NON_HDL = "NON_HDL";
+const StringBase QVRParser::QVR_BUS_INTERFACE_SHARES_ADDR = "SHARES_ADDR";
+const StringBase QVRParser::QVR_BUS_INTERFACE_SHARES_ADDR_ALL = "ALL";
+const StringBase QVRParser::QVR_PORT_ENABLE = "ENABLE";
+const StringBase QVRParser::QVR_PORT_ENABLE_SINGLE = "SINGLE";
+const StringBase QVRParser::QVR_PORT_ENDIAN = "ENDIAN";
+const StringBase QVRParser::QVR_PORT_ENDIAN_BIG = "BIG";
+const StringBase QVRParser::QVR_PORT_INITIALVAL = "INITIALVAL";
+const StringBase QVRParser::QVR_PORT_INITIALVAL_GND = "GND";
+const StringBase QVRParser::QVR_PORT_INTERRUPT_PRIORITY = "INTERRUPT_PRIORITY";
+const StringBase QVRParser::QVR_PORT_INTERRUPT_PRIORITY_MEDIUM = "MEDIUM";
+const StringBase QVRParser::QVR_PORT_SIGIS = "SIGIS";
+const StringBase QVRParser::QVR_PORT_SIGIS_INTERRUPT = "INTERRUPT";
+const StringBase QVRParser::QVR_PORT_VEC = "VEC";
+
+namespace {
+
+using Q = QVRParser;
+using Records = std::vector<QVRRecord>;
+
+constexpr Report::Module kModule{"s/Tarvo_QVRParser", "1.0"};
+
+bool Matches(const StringBase& text, const StringBase& word) {
+  return text.Compare(word, StringBase::CompareIgnoreCase) == 0;
+}
+
+bool IsVector(const PropertyList& port) {
+  const StringBase* const range = FindValue(port, Q::QVR_PORT_VEC);
+  return range && range->GetLength() > 0;
+}
+
+bool IsInterrupt(const PropertyList& port) {
+  const StringBase* const signal = FindValue(port, Q::QVR_PORT_SIGIS);
+  return signal && Matches(*signal, Q::QVR_PORT_SIGIS_INTERRUPT);
+}
+
+const DefaultRow kParameterDefaults[] = {{&Q::QVR_ASSIGNMENT, &Q::QVR_ASSIGNMENT_OPTIONAL},
+                                         {&Q::QVR_ISVALID, &Q::QVR_TRUE},
+                                         {&Q::QVR_PERMIT, &Q::QVR_PERMIT_ADVANCED_USER},
+                                         {&Q::QVR_PARAMETER_TYPE, &Q::QVR_PARAMETER_TYPE_HDL}};
+
+const DefaultRow kBusInterfaceDefaults[] = {
+    {&Q::QVR_ISVALID, &Q::QVR_TRUE},
+    {&Q::QVR_BUS_INTERFACE_SHARES_ADDR, &Q::QVR_BUS_INTERFACE_SHARES_ADDR_ALL}};
+
+const DefaultRow kIoInterfaceDefaults[] = {{&Q::QVR_ISVALID, &Q::QVR_TRUE}};
+
+const DefaultRow kPortDefaults[] = {
+    {&Q::QVR_ASSIGNMENT, &Q::QVR_ASSIGNMENT_OPTIONAL},
+    {&Q::QVR_PORT_ENABLE, &Q::QVR_PORT_ENABLE_SINGLE},
+    {&Q::QVR_PORT_ENDIAN, &Q::QVR_PORT_ENDIAN_BIG, IsVector},
+    {&Q::QVR_PORT_INITIALVAL, &Q::QVR_PORT_INITIALVAL_GND},
+    {&Q::QVR_PORT_INTERRUPT_PRIORITY, &Q::QVR_PORT_INTERRUPT_PRIORITY_MEDIUM, IsInterrupt},
+    {&Q::QVR_ISVALID, &Q::QVR_TRUE},
+    {&Q::QVR_PERMIT, &Q::QVR_PERMIT_ADVANCED_USER}};
+
+// What the kinds of records differ in: how messages call one, its defaults, and for an interface
+// the key that names it and that ties its members to it.
+struct Kind {
+  const char* noun;
+  DefaultRows defaults;
+  const StringBase* key = nullptr;
+};
+const Kind kParameter{"Parameter", kParameterDefaults};
+const Kind kGeneric{"Generic", kParameterDefaults};
+const Kind kBusInterface{"Bus Interface", kBusInterfaceDefaults, &Q::QVR_BUS_IF_NAME};
+const Kind kIoInterface{"I/O Interface", kIoInterfaceDefaults, &Q::QVR_IO_IF_NAME};
+const Kind kPort{"Port", kPortDefaults};
+
+// Reads a record that its first pair names. That pair's value stands under each of the value keys,
+// behind the name and in front of the other pairs.
+bool ReadNamedByFirst(const StringBase& line, std::initializer_list<const StringBase*> valueKeys,
+                      QVRRecord& record) {
+  PropertyList pairs;
+  if (!QVRStatement::ReadPairs(line, pairs)) return false;
+  const auto& [name, value] = pairs.front();
+  record.name = name;
+  record.properties.reserve(valueKeys.size() + pairs.size());
+  record.properties.emplace_back(Q::QVR_PROPERTY_NAME, name);
+  for (const StringBase* const key : valueKeys) record.properties.emplace_back(*key, value);
+  std::move(pairs.begin() + 1, pairs.end(), std::back_inserter(record.properties));
+  return true;
+}
+
+// Reads a record that the pair with that key names; the name stands in front of the pair. False
+// without such a pair, and for a second one behind a name that is not empty.
+bool ReadNamedByKey(const StringBase& line, const StringBase& key, QVRRecord& record) {
+  PropertyList pairs;
+  if (!QVRStatement::ReadPairs(line, pairs)) return false;
+  bool found = false;
+  record.properties.reserve(pairs.size() + 1);
+  for (Property& pair : pairs) {
+    if (Matches(pair.first, key)) {
+      if (record.name.GetLength() > 0) return false;
+      found = true;
+      record.name = pair.second;
+      record.properties.emplace_back(Q::QVR_PROPERTY_NAME, pair.second);
+    }
+    record.properties.push_back(std::move(pair));
+  }
+  return found;
+}
+
+bool IsGeneric(const QVRRecord& parameter) {
+  return std::none_of(parameter.properties.begin(), parameter.properties.end(),
+                      [](const Property& property) {
+                        return Matches(property.first, Q::QVR_PARAMETER_TYPE) &&
+                               Matches(property.second, Q::QVR_PARAMETER_TYPE_NON_HDL);
+                      });
+}
+
+StringList RecordNames(const Records& records) {
+  StringList names;
+  names.reserve(records.size());
+  for (const QVRRecord& record : records) names.push_back(record.name);
+  return names;
+}
+
+// The first record of that name, const or not as the records are.
+template <class AnyRecords>
+auto& Find(AnyRecords& records, const Kind& kind, const StringBase& name) {
+  const auto found = std::find_if(records.begin(), records.end(),
+                                  [&](const QVRRecord& record) { return record.name == name; });
+  if (found != records.end()) return *found;
+  throw Report::Exception(AppException::NotFound, "Cannot find %s %s\n", kind.noun, name);
+}
+
+// What the Get of a property and the List of them share, for options too: the same rows.
+const StringBase* FindStatedOrDefault(const PropertyList& properties, DefaultRows defaults,
+                                      const StringBase& name) {
+  const StringBase* const stated = FindValue(properties, name);
+  return stated ? stated : FindDefault(properties, defaults, name);
+}
+
+StringList ListStatedAndDefault(const PropertyList& properties, DefaultRows defaults) {
+  StringList names = NamesOf(properties);
+  ForEachMissing(properties, defaults, [&](const DefaultRow& row) { names.push_back(*row.name); });
+  return names;
+}
+
+StringBase GetProperty(const Records& records, const Kind& kind, const StringBase& name,
+                       const StringBase& property) {
+  const QVRRecord& record = Find(records, kind, name);
+  const StringBase* const value = FindStatedOrDefault(record.properties, kind.defaults, property);
+  if (value) return *value;
+  throw Report::Exception(AppException::NotFound, "Cannot find %s %s Property %s\n", kind.noun,
+                          name, property);
+}
+
+StringList ListProperties(const Records& records, const Kind& kind, const StringBase& name) {
+  return ListStatedAndDefault(Find(records, kind, name).properties, kind.defaults);
+}
+
+void SetProperty(Records& records, const Kind& kind, const StringBase& name,
+                 const StringBase& property, const StringBase& value) {
+  PropertyList& properties = Find(records, kind, name).properties;
+  const auto stated =
+      std::find_if(properties.begin(), properties.end(),
+                   [&](const Property& candidate) { return candidate.first == property; });
+  if (stated == properties.end()) {
+    properties.emplace_back(property, value);
+  } else {
+    stated->second = value;
+  }
+}
+
+// Whether the property ties its record to that interface.
+bool Ties(const Property& property, const StringBase& key, const StringBase& interface) {
+  if (property.first != key) return false;
+  const StringList names = KelLibrary_Utils::GetInterfaceVector(property.second);
+  return std::find(names.begin(), names.end(), interface) != names.end();
+}
+
+// The names of the records that belong to a declared interface.
+StringList ListMembers(const Records& interfaces, const Kind& kind, const StringBase& interface,
+                       const Records& records) {
+  Find(interfaces, kind, interface);
+  StringList names;
+  for (const auto& [name, properties] : records) {
+    const auto ties = [&](const Property& property) {
+      return Ties(property, *kind.key, interface);
+    };
+    if (std::any_of(properties.begin(), properties.end(), ties)) names.push_back(name);
+  }
+  return names;
+}
+
+}  // namespace
+
+QVRParser::QVRParser(const Kel_Index& index, const Kel_Key& key)
+    : QVRParser(
+          Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_QVR_EXTENSION)) {}
+
+QVRParser::QVRParser(const Port::FileName& file) {
+  const StringBase name = file.GetName();
+  TARVO_TRACE("  Parsing QVR File %s\n", name);
+  FileScanner lines(file);
+  StringBase line;
+  for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
+    const StringBase keyword(FirstWord(line.View()));
+    if (ReadStatement(keyword, line)) continue;
+    kModule.Error("QVR unparsable %s: %s line %d, %s\n", keyword, name, lineNumber, line);
+    throw Report::Exception(AppException::Failure, "Invalid QVR %s\n", name);
+  }
+  TARVO_TRACE("  Parse successful\n");
+}
+
+QVRParser::~QVRParser() = default;
+
+// Any other line is no statement, and ignored.
+bool QVRParser::ReadStatement(const StringBase& keyword, const StringBase& line) {
+  if (keyword == "OPTION") return ReadOption(line);
+  if (keyword == "PARAMETER") return ReadParameter(line);
+  if (keyword == "BUS_INTERFACE") return ReadInterface(line, QVR_BUS_IF_NAME, busInterfaces);
+  if (keyword == "IO_INTERFACE") return ReadInterface(line, QVR_IO_IF_NAME, ioInterfaces);
+  if (keyword == "PORT") return ReadPort(line);
+  return true;
+}
+
+bool QVRParser::ReadOption(const StringBase& line) {
+  Property option;
+  const bool read =
+      QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option) == QVRStatement::Read;
+  if (read) options.push_back(std::move(option));
+  return read;
+}
+
+bool QVRParser::ReadParameter(const StringBase& line) {
+  QVRRecord record;
+  if (!ReadNamedByFirst(line, {&QVR_PROPERTY_VALUE, &QVR_PROPERTY_DEFAULT}, record)) return false;
+  if (IsGeneric(record)) generics.push_back(record);
+  parameters.push_back(std::move(record));
+  return true;
+}
+
+bool QVRParser::ReadPort(const StringBase& line) {
+  QVRRecord record;
+  if (!ReadNamedByFirst(line, {&QVR_BUS_IF_ROLE_NAME}, record)) return false;
+  ports.push_back(std::move(record));
+  return true;
+}
+
+bool QVRParser::ReadInterface(const StringBase& line, const StringBase& key, Records& interfaces) {
+  QVRRecord record;
+  if (!ReadNamedByKey(line, key, record)) return false;
+  interfaces.push_back(std::move(record));
+  return true;
+}
+
+StringList QVRParser::ListOptions() const { return ListStatedAndDefault(options, kOptionDefaults); }
+
+StringList QVRParser::ListParameters() const { return RecordNames(parameters); }
+
+StringList QVRParser::ListGenerics() const { return RecordNames(generics); }
+
+StringList QVRParser::ListBusInterfaces() const { return RecordNames(busInterfaces); }
+
+StringList QVRParser::ListIoInterfaces() const { return RecordNames(ioInterfaces); }
+
+StringList QVRParser::ListPorts() const { return RecordNames(ports); }
+
+StringBase QVRParser::GetOptionValue(const StringBase& option) const {
+  const StringBase* const value = FindStatedOrDefault(options, kOptionDefaults, option);
+  if (value) return *value;
+  throw Report::Exception(AppException::NotFound, "Cannot find option %s\n", option);
+}
+
+StringBase QVRParser::GetParameterProperty(const StringBase& parameter,
+                                           const StringBase& property) const {
+  return GetProperty(parameters, kParameter, parameter, property);
+}
+
+StringBase QVRParser::GetGenericProperty(const StringBase& generic,
+                                         const StringBase& property) const {
+  return GetProperty(generics, kGeneric, generic, property);
+}
+
+StringBase QVRParser::GetBusInterfaceProperty(const StringBase& interface,
+                                              const StringBase& property) const {
+  return GetProperty(busInterfaces, kBusInterface, interface, property);
+}
+
+StringBase QVRParser::GetIoInterfaceProperty(const StringBase& interface,
+                                             const StringBase& property) const {
+  return GetProperty(ioInterfaces, kIoInterface, interface, property);
+}
+
+StringBase QVRParser::GetPortProperty(const StringBase& port, const StringBase& property) const {
+  return GetProperty(ports, kPort, port, property);
+}
+
+StringList QVRParser::ListParameterProperties(const StringBase& parameter) const {
+  return ListProperties(parameters, kParameter, parameter);
+}
+
+StringList QVRParser::ListGenericProperties(const StringBase& generic) const {
+  return ListProperties(generics, kGeneric, generic);
+}
+
+StringList QVRParser::ListBusInterfaceProperties(const StringBase& interface) const {
+  return ListProperties(busInterfaces, kBusInterface, interface);
+}
+
+StringList QVRParser::ListIoInterfaceProperties(const StringBase& interface) const {
+  return ListProperties(ioInterfaces, kIoInterface, interface);
+}
+
+StringList QVRParser::ListPortProperties(const StringBase& port) const {
+  return ListProperties(ports, kPort, port);
+}
+
+StringList QVRParser::ListBusInterfaceParameters(const StringBase& interface) const {
+  return ListMembers(busInterfaces, kBusInterface, interface, parameters);
+}
+
+StringList QVRParser::ListBusInterfacePorts(const StringBase& interface) const {
+  return ListMembers(busInterfaces, kBusInterface, interface, ports);
+}
+
+StringList QVRParser::ListIoInterfaceParameters(const StringBase& interface) const {
+  return ListMembers(ioInterfaces, kIoInterface, interface, parameters);
+}
+
+StringList QVRParser::ListIoInterfacePorts(const StringBase& interface) const {
+  return ListMembers(ioInterfaces, kIoInterface, interface, ports);
+}
+
+void QVRParser::SetParameterProperty(const StringBase& parameter, const StringBase& property,
+                                     const StringBase& value) {
+  SetProperty(parameters, kParameter, parameter, property, value);
+}
+
+void QVRParser::SetGenericProperty(const StringBase& generic, const StringBase& property,
+                                   const StringBase& value) {
+  SetProperty(generics, kGeneric, generic, property, value);
+}
+
+}  // namespace Tarvo
