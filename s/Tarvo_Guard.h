@@ -27,6 +27,20 @@ enum class ForUnknown {
   EmptyText  // the tail with an empty text
 };
 
+// How severe the message is for what has a text. For what has none it is always an error.
+enum class Severity {
+  Error,
+  Warning,
+  ErrorOrFatal  // fatal for an AppException of that level
+};
+
+inline Port_Message::Severity SeverityFor(const std::exception& exception, Severity severity) {
+  if (severity == Severity::Warning) return Port_Message::Warning;
+  const auto* const own = dynamic_cast<const AppException*>(&exception);
+  const bool fatal = severity == Severity::ErrorOrFatal && own && own->level == AppException::Fatal;
+  return fatal ? Port_Message::Fatal : Port_Message::Error;
+}
+
 // A literal for these arguments and the tail, and the line it stands at.
 template <class... Arguments>
 struct FailureFormat {
@@ -51,31 +65,41 @@ class Failure {
           const Arguments&... values)
       : module(issuer), format(literal.whole), arguments(values...) {}
 
-  // The same failure with another form for what has no text.
+  // The same failure with another form for what has no text, or with another severity.
   Failure With(ForUnknown form) const {
     Failure copy = *this;
     copy.forUnknown = form;
     return copy;
   }
+  Failure With(Severity other) const {
+    Failure copy = *this;
+    copy.severity = other;
+    return copy;
+  }
 
-  void Issue(const char* exceptionText) const noexcept { IssueText(format.text, exceptionText); }
+  void Issue(const std::exception& exception) const noexcept {
+    IssueText(SeverityFor(exception, severity), format.text, exception.what());
+  }
 
   void IssueUnknown() const noexcept {
-    if (forUnknown == ForUnknown::EmptyText) return Issue("");
+    if (forUnknown == ForUnknown::EmptyText) return IssueText(Port_Message::Error, format.text, "");
     constexpr std::string_view unknown = ", unknown exception\n";
     const std::string_view tail = forUnknown == ForUnknown::CutOff ? "\n" : unknown;
     const std::string_view whole = format.text;
     const std::string_view head = whole.substr(0, whole.size() - kFailureTail.size());
     std::array<char, FailureFormat<Arguments...>::kLongest + unknown.size()> companion{};
     tail.copy(companion.data() + head.copy(companion.data(), head.size()), tail.size());
-    IssueText(companion.data());
+    IssueText(Port_Message::Error, companion.data());
   }
 
  private:
   template <class... Last>
-  void IssueText(const char* text, const Last&... last) const noexcept {
+  void IssueText(Port_Message::Severity issued, const char* text,
+                 const Last&... last) const noexcept {
     std::apply(
-        [&](const auto&... values) { module.ErrorAt(format.line, text, values..., last...); },
+        [&](const auto&... values) {
+          module.IssueAt(issued, format.line, text, values..., last...);
+        },
         arguments);
   }
 
@@ -83,6 +107,7 @@ class Failure {
   Report::Format<Arguments..., const char*> format;
   std::tuple<const Arguments&...> arguments;
   ForUnknown forUnknown = ForUnknown::SaySo;
+  Severity severity = Severity::Error;
 };
 
 // Outputs of guarded operations, and how they are cleared.
@@ -105,7 +130,7 @@ bool Guard(Output&& output, const FailureType& failure, const Work& work) noexce
       return true;
     }
   } catch (const std::exception& exception) {
-    failure.Issue(exception.what());
+    failure.Issue(exception);
   } catch (...) {
     failure.IssueUnknown();
   }

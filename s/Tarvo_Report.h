@@ -71,22 +71,27 @@ inline unsigned Raw(unsigned number) { return number; }
 struct Module {
   template <class... Arguments>
   void Warning(FormatFor<Arguments...> format, const Arguments&... arguments) const noexcept {
-    Begin(format.line).issueWarning(format.text, Raw(arguments)...);
+    IssueAt(Port_Message::Warning, format.line, format.text, arguments...);
   }
 
   template <class... Arguments>
   void Error(FormatFor<Arguments...> format, const Arguments&... arguments) const noexcept {
-    ErrorAt(format.line, format.text, arguments...);
+    IssueAt(Port_Message::Error, format.line, format.text, arguments...);
   }
 
   // For a text that was made from a checked format.
   template <class... Arguments>
-  void ErrorAt(int line, const char* text, const Arguments&... arguments) const noexcept {
-    Begin(line).issueError(text, Raw(arguments)...);
-  }
-
-  Port_MsgManData& Begin(int line) const noexcept {
-    return Port_MsgManData::createObject("tarvomsg", file, line, revision);
+  void IssueAt(Port_Message::Severity severity, int line, const char* text,
+               const Arguments&... arguments) const noexcept {
+    Port_MsgManData& message = Port_MsgManData::createObject("tarvomsg", file, line, revision);
+    switch (severity) {
+      case Port_Message::Warning:
+        return message.issueWarning(text, Raw(arguments)...);
+      case Port_Message::Error:
+        return message.issueError(text, Raw(arguments)...);
+      case Port_Message::Fatal:
+        return message.issueFatal(1, text, Raw(arguments)...);
+    }
   }
 
   const char* file;
