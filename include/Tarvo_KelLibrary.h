@@ -7,6 +7,7 @@
 
 namespace Tarvo {
 
+class KelIP;
 class KelLibraryImpl;
 
 // The front door: finds the IP cores in a list of repositories and answers questions about them.
@@ -80,6 +81,11 @@ class TARVO_EXPORT KelLibrary {
   // Replaces the list by the names of all options that have a meaning, whatever the repositories
   // hold. Always true; may throw std::bad_alloc.
   bool ListAllIPProperties(StringList& list) const;
+
+  // Opens a version (see KelIP). The caller owns the instance and deletes it before the library.
+  // Null, with an error, for a key that is not in the library, and if the core description is
+  // missing or bad. The message is fatal for an AppException of that level.
+  KelIP* CreateIP(const StringBase& key) const;
 
  private:
   std::unique_ptr<KelLibraryImpl> impl;

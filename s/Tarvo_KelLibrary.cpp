@@ -5,6 +5,7 @@
 
 #include "Port_FileName.h"
 #include "Tarvo_Guard.h"
+#include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
@@ -56,44 +57,22 @@ bool MayBeVersion(const fs::directory_entry& entry) {
 
 }  // namespace
 
+// What a library holds, and the walk that fills it.
 class KelLibraryImpl {
  public:
   KelLibraryImpl();
 
-  bool SetRepositoryPath(const StringBase& path);
   bool RefreshLibrary();
 
-  StringBase GetLocation(const StringBase& key) const;
-  StringBase GetLatestIPKey(const StringBase& key) const;
-  StringBase GetName(const StringBase& key) const;
-  StringBase GetVersion(const StringBase& key) const;
-
-  bool GetIPProperty(const StringBase& key, const StringBase& property, StringBase& value) const;
-  bool ListIPProperties(const StringBase& key, StringList& list) const;
-  bool ListAllIPKeys(StringList& list) const;
+  Kel_Index index;
+  StringList repositories;
 
  private:
   bool AddRepository(const StringBase& repository);
   bool AddVersion(const fs::path& directory);
-
-  Kel_Index index;
-  StringList repositories;
 };
 
 KelLibraryImpl::KelLibraryImpl() { TARVO_TRACE("Constructing empty KEL Library\n"); }
-
-bool KelLibraryImpl::SetRepositoryPath(const StringBase& path) {
-  return Guard(
-      NoOutput(),
-      Failure(kModule, "Unable to set repository path to %s\n%s\n", path).With(ForUnknown::CutOff),
-      [&] {
-        TARVO_TRACE("KEL Library: Reading repository path %s\n", path);
-        repositories = KelLibrary_Utils::GetPathVector(path);
-        const bool complete = RefreshLibrary();
-        TARVO_TRACE("KEL Library: repository path set to %s\n", path);
-        return complete;
-      });
-}
 
 // A repository without versions does not keep the later ones out; one that can't be read ends the
 // walk.
@@ -142,73 +121,69 @@ bool KelLibraryImpl::AddVersion(const fs::path& directory) {
   }
 }
 
-StringBase KelLibraryImpl::GetLocation(const StringBase& key) const {
-  return GuardText(Failure(kModule, "Unable to get location for IP %s\n%s\n", key),
-                   [&] { return index.GetIPLocation(Kel_Key(key)).GetAbsolutePath(); });
-}
-
-StringBase KelLibraryImpl::GetLatestIPKey(const StringBase& key) const {
-  return GuardText(Failure(kModule, "Unable to get latest IP key for IP %s\n%s\n", key), [&] {
-    const Kel_Key core(Kel_Key(key).GetName());
-    return index.GetIPKey(core).GetKey();
-  });
-}
-
-StringBase KelLibraryImpl::GetName(const StringBase& key) const {
-  return GuardText(Failure(kModule, "Unable to get name for IP %s\n%s\n", key),
-                   [&] { return index.GetIPKey(Kel_Key(key)).GetName(); });
-}
-
-StringBase KelLibraryImpl::GetVersion(const StringBase& key) const {
-  return GuardText(Failure(kModule, "Unable to get version for IP %s\n%s\n", key),
-                   [&] { return index.GetIPKey(Kel_Key(key)).GetVersion(); });
-}
-
-bool KelLibraryImpl::GetIPProperty(const StringBase& key, const StringBase& property,
-                                   StringBase& value) const {
-  return Guard(
-      NoOutput(),
-      Failure(kModule, "Unable to access IP %s property %s\n%s\n", key, property)
-          .With(ForUnknown::EmptyText),
-      [&] { value = OptionScanner::GetOptionValue(index.GetIPOptions(Kel_Key(key)), property); });
-}
-
-bool KelLibraryImpl::ListIPProperties(const StringBase& key, StringList& list) const {
-  return Guard(
-      list,
-      Failure(kModule, "Unable to access IP %s properties\n%s\n", key).With(ForUnknown::EmptyText),
-      [&] { list = NamesOf(index.GetIPOptions(Kel_Key(key))); });
-}
-
-bool KelLibraryImpl::ListAllIPKeys(StringList& list) const {
-  list = index.GetAllIPKeys();
-  return true;
-}
-
 KelLibrary::KelLibrary() : impl(std::make_unique<KelLibraryImpl>()) {}
 
 KelLibrary::~KelLibrary() = default;
 
-bool KelLibrary::SetRepositoryPath(const StringBase& path) { return impl->SetRepositoryPath(path); }
+bool KelLibrary::SetRepositoryPath(const StringBase& path) {
+  return Guard(
+      NoOutput(),
+      Failure(kModule, "Unable to set repository path to %s\n%s\n", path).With(ForUnknown::CutOff),
+      [&] {
+        TARVO_TRACE("KEL Library: Reading repository path %s\n", path);
+        impl->repositories = KelLibrary_Utils::GetPathVector(path);
+        const bool complete = impl->RefreshLibrary();
+        TARVO_TRACE("KEL Library: repository path set to %s\n", path);
+        return complete;
+      });
+}
 
 bool KelLibrary::RefreshLibrary() { return impl->RefreshLibrary(); }
 
-StringBase KelLibrary::GetLocation(const StringBase& key) const { return impl->GetLocation(key); }
+StringBase KelLibrary::GetLocation(const StringBase& key) const {
+  return GuardText(Failure(kModule, "Unable to get location for IP %s\n%s\n", key),
+                   [&] { return impl->index.GetIPLocation(Kel_Key(key)).GetAbsolutePath(); });
+}
 
 StringBase KelLibrary::GetLatestIPKey(const StringBase& key) const {
-  return impl->GetLatestIPKey(key);
+  return GuardText(Failure(kModule, "Unable to get latest IP key for IP %s\n%s\n", key), [&] {
+    const Kel_Key core(Kel_Key(key).GetName());
+    return impl->index.GetIPKey(core).GetKey();
+  });
+}
+
+StringBase KelLibrary::GetName(const StringBase& key) const {
+  return GuardText(Failure(kModule, "Unable to get name for IP %s\n%s\n", key),
+                   [&] { return impl->index.GetIPKey(Kel_Key(key)).GetName(); });
+}
+
+StringBase KelLibrary::GetVersion(const StringBase& key) const {
+  return GuardText(Failure(kModule, "Unable to get version for IP %s\n%s\n", key),
+                   [&] { return impl->index.GetIPKey(Kel_Key(key)).GetVersion(); });
 }
 
 bool KelLibrary::GetIPProperty(const StringBase& key, const StringBase& property,
                                StringBase& value) const {
-  return impl->GetIPProperty(key, property, value);
+  return Guard(NoOutput(),
+               Failure(kModule, "Unable to access IP %s property %s\n%s\n", key, property)
+                   .With(ForUnknown::EmptyText),
+               [&] {
+                 value = OptionScanner::GetOptionValue(impl->index.GetIPOptions(Kel_Key(key)),
+                                                       property);
+               });
 }
 
 bool KelLibrary::ListIPProperties(const StringBase& key, StringList& list) const {
-  return impl->ListIPProperties(key, list);
+  return Guard(
+      list,
+      Failure(kModule, "Unable to access IP %s properties\n%s\n", key).With(ForUnknown::EmptyText),
+      [&] { list = NamesOf(impl->index.GetIPOptions(Kel_Key(key))); });
 }
 
-bool KelLibrary::ListAllIPKeys(StringList& list) const { return impl->ListAllIPKeys(list); }
+bool KelLibrary::ListAllIPKeys(StringList& list) const {
+  list = impl->index.GetAllIPKeys();
+  return true;
+}
 
 // A question to the library like the others, though its answer needs none of it.
 // NOLINTNEXTLINE(readability-convert-member-functions-to-static)
@@ -217,8 +192,12 @@ bool KelLibrary::ListAllIPProperties(StringList& list) const {
   return true;
 }
 
-StringBase KelLibrary::GetName(const StringBase& key) const { return impl->GetName(key); }
-
-StringBase KelLibrary::GetVersion(const StringBase& key) const { return impl->GetVersion(key); }
+KelIP* KelLibrary::CreateIP(const StringBase& key) const {
+  std::unique_ptr<KelIP> instance;
+  Guard(NoOutput(),
+        Failure(kModule, "Unable to create IP %s\n%s\n", key).With(Severity::ErrorOrFatal),
+        [&] { instance = std::make_unique<KelIP>(impl->index, key); });
+  return instance.release();
+}
 
 }  // namespace Tarvo

@@ -4,6 +4,8 @@
 #include <cstdlib>
 #include <new>
 
+#include "Tarvo_AppException.h"
+
 namespace {
 
 constexpr int kNone = -1;
@@ -22,6 +24,9 @@ void* Allocate(std::size_t size) noexcept {
 void* AllocateOrThrow(std::size_t size) {
   if (void* const memory = Allocate(size)) return memory;
   if (kindOfFault == AllocationFault::SomethingElse) throw 1;  // no std::exception on purpose
+  if (kindOfFault == AllocationFault::FatalException) {
+    throw Tarvo::AppException(Tarvo::AppException::Fatal, "out of order\n");
+  }
   throw std::bad_alloc();
 }
 

@@ -2,10 +2,11 @@
 #define ALLOCATIONFAULT_H
 
 // While one of these lives, the allocation that comes after `count` others in this thread fails,
-// with std::bad_alloc or with something that no std::exception is; those behind it succeed again.
+// with std::bad_alloc, with something that is no std::exception, or with an AppException of level
+// Fatal; those behind it succeed again.
 class AllocationFault {
  public:
-  enum Kind { BadAlloc, SomethingElse };
+  enum Kind { BadAlloc, SomethingElse, FatalException };
 
   AllocationFault(int count, Kind kind);
   ~AllocationFault();

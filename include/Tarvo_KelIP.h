@@ -1,0 +1,114 @@
+#ifndef TARVO_KELIP_H
+#define TARVO_KELIP_H
+
+#include <memory>
+
+#include "Tarvo_Export.h"
+
+namespace Tarvo {
+
+class Kel_Index;
+class KelIPImpl;
+
+// One version of one IP core, opened: answers for its options, parameters, generics, ports, bus and
+// I/O interfaces.
+//
+//     const std::unique_ptr<Tarvo::KelIP> ip(library.CreateIP("pulse_counter"));
+//     Tarvo::StringList ports;
+//     if (ip && ip->ListPorts(ports)) ...
+//
+// What the questions mean (records, properties, defaults, first matches) is told in QVRParser,
+// which the answers come from. They are those of the core description as it was when the instance
+// was made, with the parameters as they were set since; nothing is written to any file.
+//
+// Results: true with the output replaced by the answer, which may be empty; false with an empty
+// output, and a message that says why. Get operations on a record's property and
+// SetParameterProperty issue a warning, all others an error. An argument may be the output itself
+// or lie in it.
+//
+// Failures: the constructor and the four operations below it throw; all others throw nothing. A
+// text that is given as `const char*` becomes a string at the call, which may throw std::bad_alloc
+// there.
+//
+// Lifetime: the caller owns the instance, and destroys it before the library that made it. A
+// refresh of the library does not change an instance. Threads: for one at a time, also for const
+// operations; separate instances of one library may not work at the same time as a refresh of it.
+class TARVO_EXPORT KelIP {
+ public:
+  static const StringBase KEL_IP_NAME;
+  static const StringBase KEL_IP_VERSION;
+  static const StringBase KEL_STYLE_OPTION_NAME;
+  static const StringBase KEL_STYLE_OPTION_VALUE_HDL;
+  static const StringBase KEL_STYLE_OPTION_VALUE_BLACKBOX;
+  static const StringBase KEL_STYLE_OPTION_VALUE_MIX;
+  static const StringBase KEL_LANGUAGE_OPTION_NAME;
+  static const StringBase KEL_HDL_LIBRARY_PROPERTY;
+  static const StringBase KEL_HDL_LANGUAGE_PROPERTY;
+  static const StringBase KEL_HDL_FILENAME_HEAD_PROPERTY;
+  static const StringBase KEL_HDL_FILENAME_TAIL_PROPERTY;
+  static const StringBase KEL_NETLIST_LIBRARY_PROPERTY;
+
+  // Opens the version that a key stands for, a bare core name being that core's newest. Throws
+  // AppException if the index doesn't know the key, or if the core description is missing or bad;
+  // KelLibrary::CreateIP turns that into a message. The index must outlive the instance.
+  KelIP(const Kel_Index& index, const StringBase& key);
+  ~KelIP();
+  KelIP(const KelIP&) = delete;
+  KelIP& operator=(const KelIP&) = delete;
+
+  // The absolute directory of the version, its full key, the base name of its core, and its
+  // version as dotted text such as "1.00.a". They stay what they were when the instance was made.
+  // May throw std::bad_alloc; GetLocation throws std::filesystem::filesystem_error as well, if the
+  // repository was given relative to a current directory that is gone.
+  StringBase GetLocation() const;
+  StringBase GetKey() const;
+  StringBase GetName() const;
+  StringBase GetVersion() const;
+
+  // NAME and VERSION are those of the key; all other properties of the core are its options, those
+  // of the description first, then the missing defaults. GetIPProperty gives false without a
+  // message for an option whose value is empty.
+  bool GetIPProperty(const StringBase& name, StringBase& value) const;
+  bool ListIPProperties(StringList& list) const;
+
+  bool GetParameterProperty(const StringBase& parameter, const StringBase& property,
+                            StringBase& value) const;
+  // Changes what GetParameterProperty answers, and nothing else: the generic of that name, for one,
+  // stays as it is.
+  bool SetParameterProperty(const StringBase& parameter, const StringBase& property,
+                            const StringBase& value);
+  bool ListParameters(StringList& list) const;
+  bool ListParameterProperties(const StringBase& parameter, StringList& list) const;
+
+  // Generics are the parameters that the HDL sources see.
+  bool GetGenericProperty(const StringBase& generic, const StringBase& property,
+                          StringBase& value) const;
+  bool ListGenerics(StringList& list) const;
+  bool ListGenericProperties(const StringBase& generic, StringList& list) const;
+
+  bool GetPortProperty(const StringBase& port, const StringBase& property, StringBase& value) const;
+  bool ListPorts(StringList& list) const;
+  bool ListPortProperties(const StringBase& port, StringList& list) const;
+
+  // The members of an interface are the parameters and ports that name it.
+  bool GetBusInterfaceProperty(const StringBase& interface, const StringBase& property,
+                               StringBase& value) const;
+  bool ListBusInterfaces(StringList& list) const;
+  bool ListBusInterfaceProperties(const StringBase& interface, StringList& list) const;
+  bool ListBusInterfaceParameters(const StringBase& interface, StringList& list) const;
+  bool ListBusInterfacePorts(const StringBase& interface, StringList& list) const;
+
+  bool GetIOInterfaceProperty(const StringBase& interface, const StringBase& property,
+                              StringBase& value) const;
+  bool ListIOInterfaces(StringList& list) const;
+  bool ListIOInterfaceProperties(const StringBase& interface, StringList& list) const;
+  bool ListIOInterfaceParameters(const StringBase& interface, StringList& list) const;
+  bool ListIOInterfacePorts(const StringBase& interface, StringList& list) const;
+
+ private:
+  std::unique_ptr<KelIPImpl> impl;
+};
+
+}  // namespace Tarvo
+
+#endif

@@ -1,0 +1,236 @@
+#include "Tarvo_KelIP.h"
+
+#include "Port_FileName.h"
+#include "Tarvo_Guard.h"
+#include "Tarvo_Kel_Index.h"
+#include "Tarvo_Kel_Key.h"
+#include "Tarvo_QVRParser.h"
+#include "Tarvo_Report.h"
+
+namespace Tarvo {
+
+const StringBase KelIP::KEL_IP_NAME = "NAME";
+const StringBase KelIP::KEL_IP_VERSION = "VERSION";
+const StringBase KelIP::KEL_STYLE_OPTION_NAME = "STYLE";
+const StringBase KelIP::KEL_STYLE_OPTION_VALUE_HDL = "HDL";
+const StringBase KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX = "BLACKBOX";
+const StringBase KelIP::KEL_STYLE_OPTION_VALUE_MIX = "MIX";
+const StringBase KelIP::KEL_LANGUAGE_OPTION_NAME = "HDL";
+const StringBase KelIP::KEL_HDL_LIBRARY_PROPERTY = "LIBRARY";
+const StringBase KelIP::KEL_HDL_LANGUAGE_PROPERTY = "LANGUAGE";
+const StringBase KelIP::KEL_HDL_FILENAME_HEAD_PROPERTY = "FILENAME_HEAD";
+const StringBase KelIP::KEL_HDL_FILENAME_TAIL_PROPERTY = "FILENAME_TAIL";
+const StringBase KelIP::KEL_NETLIST_LIBRARY_PROPERTY = "LIBRARY";
+
+namespace {
+
+constexpr Report::Module kModule{"s/Tarvo_KelIP", "1.0"};
+
+}  // namespace
+
+// What an instance holds. Name and version come from the index, not from the text that a caller
+// gave.
+class KelIPImpl {
+ public:
+  KelIPImpl(const Kel_Index& wholeIndex, const StringBase& text)
+      : location(wholeIndex.GetIPLocation(Kel_Key(text))), key(wholeIndex.GetIPKey(Kel_Key(text))) {
+    TARVO_TRACE("Constructing IP instance %s v%s from path %s\n", key.GetName(), key.GetVersion(),
+                location.GetAbsolutePath());
+    qvrParser = std::make_unique<QVRParser>(wholeIndex, key);
+    TARVO_TRACE("Finished constructing IP instance %s v%s\n", key.GetName(), key.GetVersion());
+  }
+
+  StringBase GetProperty(const StringBase& name) const {
+    if (name == KelIP::KEL_IP_NAME) return key.GetName();
+    if (name == KelIP::KEL_IP_VERSION) return key.GetVersion();
+    return qvrParser->GetOptionValue(name);
+  }
+
+  StringList ListProperties() const {
+    StringList names = qvrParser->ListOptions();
+    names.insert(names.begin(), {KelIP::KEL_IP_NAME, KelIP::KEL_IP_VERSION});
+    return names;
+  }
+
+  const Port::FileName location;
+  const Kel_Key key;
+  std::unique_ptr<QVRParser> qvrParser;
+};
+
+KelIP::KelIP(const Kel_Index& index, const StringBase& key)
+    : impl(std::make_unique<KelIPImpl>(index, key)) {}
+
+KelIP::~KelIP() = default;
+
+StringBase KelIP::GetLocation() const { return impl->location.GetAbsolutePath(); }
+
+StringBase KelIP::GetKey() const { return impl->key.GetKey(); }
+
+StringBase KelIP::GetName() const { return impl->key.GetName(); }
+
+StringBase KelIP::GetVersion() const { return impl->key.GetVersion(); }
+
+bool KelIP::GetIPProperty(const StringBase& name, StringBase& value) const {
+  return Guard(
+      value,
+      Failure(kModule, "Unable to access property %s for IP %s\n%s\n", name, impl->key.GetKey())
+          .With(ForUnknown::EmptyText),
+      [&] {
+        value = impl->GetProperty(name);
+        return value.GetLength() > 0;
+      });
+}
+
+bool KelIP::ListIPProperties(StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list properties for IP %s\n%s\n", impl->key.GetKey()),
+               [&] { list = impl->ListProperties(); });
+}
+
+bool KelIP::GetParameterProperty(const StringBase& parameter, const StringBase& property,
+                                 StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to get parameter %s property %s for IP %s\n%s\n", parameter,
+                       property, impl->key.GetKey())
+                   .With(Severity::Warning),
+               [&] { value = impl->qvrParser->GetParameterProperty(parameter, property); });
+}
+
+bool KelIP::SetParameterProperty(const StringBase& parameter, const StringBase& property,
+                                 const StringBase& value) {
+  return Guard(NoOutput(),
+               Failure(kModule, "Unable to set IP %s parameter %s property %s to %s\n%s\n",
+                       impl->key.GetKey(), parameter, property, value)
+                   .With(Severity::Warning),
+               [&] { impl->qvrParser->SetParameterProperty(parameter, property, value); });
+}
+
+bool KelIP::ListParameters(StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list parameters for IP %s\n%s\n", impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListParameters(); });
+}
+
+bool KelIP::ListParameterProperties(const StringBase& parameter, StringList& list) const {
+  return Guard(
+      list,
+      Failure(kModule, "Unable to list parameter properties for IP %s\n%s\n", impl->key.GetKey()),
+      [&] { list = impl->qvrParser->ListParameterProperties(parameter); });
+}
+
+bool KelIP::GetGenericProperty(const StringBase& generic, const StringBase& property,
+                               StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to get generic %s property %s for IP %s\n%s\n", generic,
+                       property, impl->key.GetKey())
+                   .With(Severity::Warning),
+               [&] { value = impl->qvrParser->GetGenericProperty(generic, property); });
+}
+
+bool KelIP::ListGenerics(StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list generics for IP %s\n%s\n", impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListGenerics(); });
+}
+
+bool KelIP::ListGenericProperties(const StringBase& generic, StringList& list) const {
+  return Guard(
+      list,
+      Failure(kModule, "Unable to list generic properties for IP %s\n%s\n", impl->key.GetKey()),
+      [&] { list = impl->qvrParser->ListGenericProperties(generic); });
+}
+
+bool KelIP::GetPortProperty(const StringBase& port, const StringBase& property,
+                            StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to get port %s property %s for IP %s\n%s\n", port, property,
+                       impl->key.GetKey())
+                   .With(Severity::Warning),
+               [&] { value = impl->qvrParser->GetPortProperty(port, property); });
+}
+
+bool KelIP::ListPorts(StringList& list) const {
+  return Guard(list, Failure(kModule, "Unable to list ports for IP %s\n%s\n", impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListPorts(); });
+}
+
+bool KelIP::ListPortProperties(const StringBase& port, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list port %s properties for IP %s\n%s\n", port,
+                       impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListPortProperties(port); });
+}
+
+bool KelIP::GetBusInterfaceProperty(const StringBase& interface, const StringBase& property,
+                                    StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to get bus interface %s property %s for IP %s\n%s\n",
+                       interface, property, impl->key.GetKey())
+                   .With(Severity::Warning),
+               [&] { value = impl->qvrParser->GetBusInterfaceProperty(interface, property); });
+}
+
+bool KelIP::ListBusInterfaces(StringList& list) const {
+  return Guard(
+      list, Failure(kModule, "Unable to list bus interfaces for IP %s\n%s\n", impl->key.GetKey()),
+      [&] { list = impl->qvrParser->ListBusInterfaces(); });
+}
+
+bool KelIP::ListBusInterfaceProperties(const StringBase& interface, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list bus interface %s properties for IP %s\n%s\n",
+                       interface, impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListBusInterfaceProperties(interface); });
+}
+
+bool KelIP::ListBusInterfaceParameters(const StringBase& interface, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list bus interface %s parameters for IP %s\n%s\n",
+                       interface, impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListBusInterfaceParameters(interface); });
+}
+
+bool KelIP::ListBusInterfacePorts(const StringBase& interface, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list bus interface %s ports for IP %s\n%s\n", interface,
+                       impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListBusInterfacePorts(interface); });
+}
+
+bool KelIP::GetIOInterfaceProperty(const StringBase& interface, const StringBase& property,
+                                   StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to get I/O interface %s property %s for IP %s\n%s\n",
+                       interface, property, impl->key.GetKey())
+                   .With(Severity::Warning),
+               [&] { value = impl->qvrParser->GetIoInterfaceProperty(interface, property); });
+}
+
+bool KelIP::ListIOInterfaces(StringList& list) const {
+  return Guard(
+      list, Failure(kModule, "Unable to list I/O interfaces for IP %s\n%s\n", impl->key.GetKey()),
+      [&] { list = impl->qvrParser->ListIoInterfaces(); });
+}
+
+bool KelIP::ListIOInterfaceProperties(const StringBase& interface, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list I/O interface %s properties for IP %s\n%s\n",
+                       interface, impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListIoInterfaceProperties(interface); });
+}
+
+bool KelIP::ListIOInterfaceParameters(const StringBase& interface, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list I/O interface %s parameters for IP %s\n%s\n",
+                       interface, impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListIoInterfaceParameters(interface); });
+}
+
+bool KelIP::ListIOInterfacePorts(const StringBase& interface, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list I/O interface %s ports for IP %s\n%s\n", interface,
+                       impl->key.GetKey()),
+               [&] { list = impl->qvrParser->ListIoInterfacePorts(interface); });
+}
+
+}  // namespace Tarvo

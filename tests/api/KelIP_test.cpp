@@ -1,0 +1,302 @@
+#include <gmock/gmock.h>
+#include <gtest/gtest.h>
+
+#include <memory>
+#include <string>
+
+#include "AllocationFault.h"
+#include "MessageRecorder.h"
+#include "RepositoryBuilder.h"
+#include "Tarvo_KelIP.h"
+#include "Tarvo_KelLibrary.h"
+
+namespace {
+
+using namespace Tarvo;
+using testing::ElementsAre;
+using testing::IsEmpty;
+
+struct Output {
+  StringBase value = "old";
+  StringList list = {"old"};
+
+  // What an operation left behind, the one output that it has no use for taken out.
+  std::string Text() const {
+    std::string text = value == "old" ? "" : value.GetText();
+    for (const StringBase& name : list) {
+      if (name != "old") text += "<" + std::string(name) + ">";
+    }
+    return text;
+  }
+  bool IsOld() const { return value == "old" && list == StringList{"old"}; }
+};
+
+// Names that don't fit into a string object, so that every operation allocates.
+const char kDescription[] =
+    "OPTION AN_OPTION_WITH_A_LONG_NAME = a value of some length\n"
+    "BUS_INTERFACE BUS = A_BUS_WITH_A_LONG_NAME\nIO_INTERFACE IO_IF = AN_IO_WITH_A_LONG_NAME\n"
+    "PARAMETER A_PARAMETER_WITH_A_LONG_NAME = the_value_of_a_parameter, "
+    "BUS = A_BUS_WITH_A_LONG_NAME, IO_IF = AN_IO_WITH_A_LONG_NAME\n"
+    "PORT A_PORT_WITH_A_LONG_NAME = the_default_of_a_port, BUS = A_BUS_WITH_A_LONG_NAME, "
+    "IO_IF = AN_IO_WITH_A_LONG_NAME\n";
+const StringBase kOption = "AN_OPTION_WITH_A_LONG_NAME";
+const StringBase kParameter = "A_PARAMETER_WITH_A_LONG_NAME";
+const StringBase kBus = "A_BUS_WITH_A_LONG_NAME";
+const StringBase kIo = "AN_IO_WITH_A_LONG_NAME";
+const StringBase kPort = "A_PORT_WITH_A_LONG_NAME";
+const StringBase kLong = "a text that is too long for a string object";
+
+// One guarded operation: what it answers, how it reports a failure ("@" is the key), how severe
+// that is for an exception with a text, and what it says of a name that is not there.
+struct Row {
+  const char* operation;
+  std::string answer;
+  std::string failure;
+  const char* severity;
+  const char* unknown;
+  bool (*run)(KelIP& ip, Output& output);
+};
+
+#define GET(operation, name, property) \
+  [](KelIP& ip, Output& output) { return ip.operation(name, property, output.value); }
+#define LIST(operation, ...) \
+  [](KelIP& ip, Output& output) { return ip.operation(__VA_ARGS__ output.list); }
+
+const std::string kP = kParameter.GetText(), kB = kBus.GetText(), kI = kIo.GetText(),
+                  kO = kPort.GetText();
+const std::string kDefaults = "<ASSIGNMENT><ISVALID><PERMIT><TYPE>";
+const std::string kValues = "<NAME><VALUE><DEFAULT_VALUE><BUS><IO_IF>" + kDefaults;
+
+const Row kRows[] = {
+    {"GetIPProperty", "a value of some length",
+     "access property " + std::string(kOption) + " for IP @", "error",
+     "option AN_OPTION_WITH_A_LONG_NAME",
+     [](KelIP& ip, Output& output) { return ip.GetIPProperty(kOption, output.value); }},
+    {"ListIPProperties",
+     "<NAME><VERSION><AN_OPTION_WITH_A_LONG_NAME><IMP_NETLIST><RUN_TRAMFOLD><STYLE><USAGE_LEVEL>",
+     "list properties for IP @", "error", nullptr, LIST(ListIPProperties)},
+    {"GetParameterProperty", "the_value_of_a_parameter",
+     "get parameter " + kP + " property VALUE for IP @", "warning",
+     "Parameter A_PARAMETER_WITH_A_LONG_NAME", GET(GetParameterProperty, kParameter, "VALUE")},
+    {"SetParameterProperty", "",
+     "set IP @ parameter " + kP + " property VALUE to " + std::string(kLong), "warning",
+     "Parameter A_PARAMETER_WITH_A_LONG_NAME",
+     [](KelIP& ip, Output&) { return ip.SetParameterProperty(kParameter, "VALUE", kLong); }},
+    {"ListParameters", "<" + kP + ">", "list parameters for IP @", "error", nullptr,
+     LIST(ListParameters)},
+    {"ListParameterProperties", kValues, "list parameter properties for IP @", "error",
+     "Parameter A_PARAMETER_WITH_A_LONG_NAME", LIST(ListParameterProperties, kParameter, )},
+    {"GetGenericProperty", "the_value_of_a_parameter",
+     "get generic " + kP + " property VALUE for IP @", "warning",
+     "Generic A_PARAMETER_WITH_A_LONG_NAME", GET(GetGenericProperty, kParameter, "VALUE")},
+    {"ListGenerics", "<" + kP + ">", "list generics for IP @", "error", nullptr,
+     LIST(ListGenerics)},
+    {"ListGenericProperties", kValues, "list generic properties for IP @", "error",
+     "Generic A_PARAMETER_WITH_A_LONG_NAME", LIST(ListGenericProperties, kParameter, )},
+    {"GetPortProperty", "the_default_of_a_port", "get port " + kO + " property DEFAULT for IP @",
+     "warning", "Port A_PORT_WITH_A_LONG_NAME", GET(GetPortProperty, kPort, "DEFAULT")},
+    {"ListPorts", "<" + kO + ">", "list ports for IP @", "error", nullptr, LIST(ListPorts)},
+    {"ListPortProperties",
+     "<NAME><DEFAULT><BUS><IO_IF><ASSIGNMENT><ENABLE><INITIALVAL><ISVALID><PERMIT>",
+     "list port " + kO + " properties for IP @", "error", "Port A_PORT_WITH_A_LONG_NAME",
+     LIST(ListPortProperties, kPort, )},
+    {"GetBusInterfaceProperty", kB, "get bus interface " + kB + " property NAME for IP @",
+     "warning", "Bus Interface A_BUS_WITH_A_LONG_NAME", GET(GetBusInterfaceProperty, kBus, "NAME")},
+    {"ListBusInterfaces", "<" + kB + ">", "list bus interfaces for IP @", "error", nullptr,
+     LIST(ListBusInterfaces)},
+    {"ListBusInterfaceProperties", "<NAME><BUS><ISVALID><SHARES_ADDR>",
+     "list bus interface " + kB + " properties for IP @", "error",
+     "Bus Interface A_BUS_WITH_A_LONG_NAME", LIST(ListBusInterfaceProperties, kBus, )},
+    {"ListBusInterfaceParameters", "<" + kP + ">",
+     "list bus interface " + kB + " parameters for IP @", "error",
+     "Bus Interface A_BUS_WITH_A_LONG_NAME", LIST(ListBusInterfaceParameters, kBus, )},
+    {"ListBusInterfacePorts", "<" + kO + ">", "list bus interface " + kB + " ports for IP @",
+     "error", "Bus Interface A_BUS_WITH_A_LONG_NAME", LIST(ListBusInterfacePorts, kBus, )},
+    {"GetIOInterfaceProperty", kI, "get I/O interface " + kI + " property NAME for IP @", "warning",
+     "I/O Interface AN_IO_WITH_A_LONG_NAME", GET(GetIOInterfaceProperty, kIo, "NAME")},
+    {"ListIOInterfaces", "<" + kI + ">", "list I/O interfaces for IP @", "error", nullptr,
+     LIST(ListIOInterfaces)},
+    {"ListIOInterfaceProperties", "<NAME><IO_IF><ISVALID>",
+     "list I/O interface " + kI + " properties for IP @", "error",
+     "I/O Interface AN_IO_WITH_A_LONG_NAME", LIST(ListIOInterfaceProperties, kIo, )},
+    {"ListIOInterfaceParameters", "<" + kP + ">",
+     "list I/O interface " + kI + " parameters for IP @", "error",
+     "I/O Interface AN_IO_WITH_A_LONG_NAME", LIST(ListIOInterfaceParameters, kIo, )},
+    {"ListIOInterfacePorts", "<" + kO + ">", "list I/O interface " + kI + " ports for IP @",
+     "error", "I/O Interface AN_IO_WITH_A_LONG_NAME", LIST(ListIOInterfacePorts, kIo, )}};
+
+#undef GET
+#undef LIST
+
+class Instance : public testing::Test {
+ protected:
+  std::unique_ptr<KelIP> Open(const std::string& key) {
+    return std::unique_ptr<KelIP>(library.CreateIP(key.c_str()));
+  }
+  void Walk() { ASSERT_TRUE(library.SetRepositoryPath(repo.Path().c_str())); }
+  // The message of a row's failure up to its tail.
+  static std::string Failure(const std::string& severity, const Row& row, const KelIP& ip) {
+    std::string text = row.failure;
+    text.replace(text.find('@'), 1, ip.GetKey());
+    return severity + " s/Tarvo_KelIP: Unable to " + text;
+  }
+
+  RepositoryBuilder repo;
+  MessageRecorder recorder;
+  KelLibrary library;
+};
+
+TEST_F(Instance, AnswersAndReportsByItsRows) {
+  repo.Core("full_v1_00_a").Qvr(kDescription);
+  repo.Core("none_v1_00_a").Qvr("");
+  Walk();
+  const auto full = Open("full"), none = Open("none");
+  for (const Row& row : kRows) {
+    SCOPED_TRACE(row.operation);
+    Output answer;
+    EXPECT_TRUE(row.run(*full, answer));
+    EXPECT_EQ(answer.Text(), row.answer);
+    EXPECT_THAT(recorder.Take(), IsEmpty());
+    if (!row.unknown) continue;
+    Output output;
+    EXPECT_FALSE(row.run(*none, output));
+    EXPECT_EQ(output.Text(), "");
+    EXPECT_EQ(output.IsOld(), row.answer.empty());
+    const std::string text = std::string("\nCannot find ") + row.unknown + "\n\n";
+    EXPECT_THAT(recorder.Take(), ElementsAre(Failure(row.severity, row, *none) + text));
+  }
+}
+
+// Each operation with its n-th allocation failing, for every n until it succeeds.
+TEST_F(Instance, LetsNothingEscape) {
+  repo.Core("a_core_with_a_long_name_v1_00_a").Qvr(kDescription);
+  Walk();
+  for (const Row& row : kRows) {
+    SCOPED_TRACE(row.operation);
+    for (const auto kind : {AllocationFault::BadAlloc, AllocationFault::SomethingElse}) {
+      const auto ip = Open("a_core_with_a_long_name");
+      const bool hasText = kind == AllocationFault::BadAlloc;
+      const std::string message =
+          Failure(hasText ? row.severity : "error", row, *ip) +
+          (hasText                                         ? "\nstd::bad_alloc\n"
+           : row.operation == std::string("GetIPProperty") ? "\n\n"
+                                                           : ", unknown exception\n");
+      for (int count = 0;; ++count) {
+        Output output;
+        bool done = false;
+        {
+          const AllocationFault fault(count, kind);
+          done = row.run(*ip, output);
+        }
+        EXPECT_EQ(done, !AllocationFault::Fired());
+        if (!AllocationFault::Fired()) {
+          EXPECT_EQ(output.Text(), row.answer);
+          EXPECT_GT(count, 0);
+          break;
+        }
+        EXPECT_EQ(output.Text(), "");
+        EXPECT_THAT(recorder.Take(), ElementsAre(message));
+      }
+    }
+  }
+}
+
+TEST_F(Instance, IsMadeForTheVersionThatAKeyStandsFor) {
+  repo.Core("abc_v1_00_a").Qvr("PORT a = 1");
+  repo.Core("abc_V02_00_B").Qvr("OPTION EMPTY = ''\nOPTION NAME = other");
+  Walk();
+  auto old = Open("abc_v1_00_a"), ip = Open("abc");
+  EXPECT_EQ(std::string(ip->GetKey()) + " " + ip->GetName().GetText() + " " +
+                ip->GetVersion().GetText() + " " + ip->GetLocation().GetText(),
+            "abc_v02_00_b abc 2.00.b " + (repo / "ipmods/abc_V02_00_B"));
+  StringBase value;
+  EXPECT_TRUE(ip->GetIPProperty("NAME", value));
+  EXPECT_EQ(value, "abc");
+  EXPECT_TRUE(ip->GetIPProperty("VERSION", value));
+  EXPECT_EQ(value, "2.00.b");
+  EXPECT_FALSE(ip->GetIPProperty("EMPTY", value));
+  EXPECT_EQ(value, "");
+  EXPECT_THAT(recorder.Take(), IsEmpty());
+  EXPECT_FALSE(ip->GetIPProperty("name", value));
+  EXPECT_THAT(recorder.Take(), ElementsAre("error s/Tarvo_KelIP: Unable to access property name "
+                                           "for IP abc_v02_00_b\nCannot find option name\n\n"));
+
+  // A refresh that finds another newest version changes no instance.
+  repo.Core("abc_v3_00_a").Qvr("");
+  std::filesystem::remove_all(repo / "ipmods/abc_v1_00_a");
+  EXPECT_TRUE(library.RefreshLibrary());
+  EXPECT_EQ(ip->GetKey(), "abc_v02_00_b");
+  EXPECT_EQ(old->GetLocation(), (repo / "ipmods/abc_v1_00_a").c_str());
+  StringList list;
+  EXPECT_TRUE(old->ListPorts(list));
+  EXPECT_THAT(list, ElementsAre("a"));
+  EXPECT_EQ(Open("abc")->GetKey(), "abc_v3_00_a");
+}
+
+TEST_F(Instance, KeepsArgumentsThatLieInTheOutput) {
+  repo.Core("abc_v1_00_a").Qvr("PORT p = 1, DIR = I");
+  Walk();
+  const auto ip = Open("abc");
+  StringBase value = "p";
+  EXPECT_TRUE(ip->GetPortProperty(value, "DIR", value));
+  EXPECT_EQ(value, "I");
+  StringList list = {"p", "q"};
+  EXPECT_TRUE(ip->ListPortProperties(list[0], list));
+  list = {"p", "q"};
+  EXPECT_FALSE(ip->ListPortProperties(list[1], list));
+  EXPECT_THAT(recorder.Take(), ElementsAre(testing::HasSubstr("list port q properties")));
+}
+
+TEST_F(Instance, IsNotMadeWithoutADescription) {
+  repo.Core("none_v1_00_a");
+  repo.Core("bad_v1_00_a").Qvr("PORT a");
+  repo.Core("abc_v1_00_a").Qvr(kDescription);
+  Walk();
+  const std::string error = "error s/Tarvo_KelLibrary: Unable to create IP ";
+  EXPECT_EQ(library.CreateIP("No_V1_00_A"), nullptr);
+  EXPECT_EQ(library.CreateIP("none"), nullptr);
+  EXPECT_EQ(library.CreateIP("bad"), nullptr);
+  const std::string bad = repo / "ipmods/bad_v1_00_a/data/bad_v2_1_0.qvr";
+  EXPECT_THAT(
+      recorder.Take(),
+      ElementsAre(error + "No_V1_00_A\nCannot find IP index entry for No_v1_00_a\n\n",
+                  error + "none\nCannot read file " +
+                      repo / "ipmods/none_v1_00_a/data/none_v2_1_0.qvr" + "\n\n",
+                  "error s/Tarvo_QVRParser: QVR unparsable PORT: " + bad + " line 1, PORT a\n",
+                  error + "bad\nInvalid QVR " + bad + "\n\n"));
+  const struct {
+    AllocationFault::Kind kind;
+    std::string message;
+  } faults[] = {{AllocationFault::BadAlloc, error + "abc\nstd::bad_alloc\n"},
+                {AllocationFault::SomethingElse, error + "abc, unknown exception\n"},
+                {AllocationFault::FatalException,
+                 "fatal s/Tarvo_KelLibrary: Unable to create IP abc\nout of order\n\n"}};
+  const StringBase key = "abc";
+  for (const auto& [kind, message] : faults) {
+    for (int count = 0;; ++count) {
+      std::unique_ptr<KelIP> ip;
+      {
+        const AllocationFault fault(count, kind);
+        ip.reset(library.CreateIP(key));
+      }
+      EXPECT_EQ(ip == nullptr, AllocationFault::Fired());
+      if (!AllocationFault::Fired()) break;
+      const auto messages = recorder.Take();
+      ASSERT_FALSE(messages.empty());
+      EXPECT_THAT(messages.back(), testing::StartsWith(message)) << count;
+    }
+  }
+}
+
+TEST_F(Instance, TracesItsMaking) {
+  repo.Core("abc_v1_00_a").Qvr("");
+  Walk();
+  MessageRecorder traces(MessageRecorder::MessagesAndTraces);
+  Open("abc");
+  const auto entries = traces.Take();
+  EXPECT_EQ(entries.front(), "trace: Constructing IP instance abc v1.00.a from path " +
+                                 repo / "ipmods/abc_v1_00_a" + "\n");
+  EXPECT_EQ(entries.back(), "trace: Finished constructing IP instance abc v1.00.a\n");
+}
+
+}  // namespace
