@@ -4,7 +4,8 @@
 set -euo pipefail
 
 declare -A groups=(
-  [build]="g++ cmake ninja-build pkg-config libboost-filesystem-dev libpcre2-dev libcli11-dev"
+  [build]="g++ cmake ninja-build pkg-config libboost-filesystem-dev libpcre2-dev libcli11-dev
+          nlohmann-json3-dev"
   [test]="libgtest-dev libgmock-dev libbenchmark-dev"
   [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3"
 )

@@ -92,13 +92,45 @@ TEST(KelList, ListsTheNewestOrAllVersions) {
             newest + "b_v2_00_a\tHDL\t\t" + at + "b_v2_00_a\ttwo\n" + last);
 }
 
-TEST(KelShow, ShowsEachOptionOnce) {
+TEST(KelShow, ShowsEachSectionAndNameOnce) {
   RepositoryBuilder repo;
-  repo.Core("b_v2_00_a").Qvr("OPTION A = \x1B[1m\nOPTION A = 2\nOPTION NAME = other");
-  EXPECT_EQ(Kel("show b -L " + repo.Path()).output,
-            "NAME\tb\nVERSION\t2.00.a\nA\t\\x1b[1m\nIMP_NETLIST\tFALSE\nRUN_TRAMFOLD\tFALSE\n"
-            "STYLE\tHDL\nUSAGE_LEVEL\tADVANCED_USER\n");
+  repo.Core("b_v2_00_a")
+      .Qvr(
+          "OPTION A = \x1B[1m\nOPTION A = 2\nOPTION NAME = other\nOPTION EMPTY = ''\n"
+          "BUS_INTERFACE BUS = REGS\nIO_INTERFACE IO_IF = PADS, DESC = Pins\n"
+          "PARAMETER W = 8, DESC = \"In bits\"\nPARAMETER W = 9\nPARAMETER N = '', TYPE = NON_HDL\n"
+          "PORT p = X, DIR = I, VEC = [W-1:0], BUS = REGS:GONE, IO_IF = PADS");
+  const std::string options =
+      "NAME\tb\nVERSION\t2.00.a\nA\t\\x1b[1m\nEMPTY\t\nIMP_NETLIST\tFALSE\nRUN_TRAMFOLD\tFALSE\n"
+      "STYLE\tHDL\nUSAGE_LEVEL\tADVANCED_USER\n";
+  const std::string ports = "p\tI\t[W-1:0]\tREGS,GONE,PADS\t\n";
+  const CommandResult all = Kel("show b -L " + repo.Path());
+  EXPECT_EQ(all.output, "# options: name, value\n" + options +
+                            "# parameters: name, value, default_value, generic, description\n"
+                            "W\t8\t8\tgeneric\tIn bits\nN\t\t\t\t\n"
+                            "# ports: name, direction, vector, interfaces, description\n" +
+                            ports +
+                            "# interfaces: name, kind, parameters, ports, description\n"
+                            "REGS\tbus\t\tp\t\nPADS\tio\t\tp\tPins\n");
+  EXPECT_EQ(all.errors, "");
+  EXPECT_EQ(Kel("show b --section ports -L " + repo.Path()).output, ports);
+  EXPECT_EQ(Kel("show b --section nope -L " + repo.Path()).status, 2);
   EXPECT_EQ(Kel("show nope -L " + repo.Path()).status, 1);
+}
+
+TEST(KelShow, WritesJsonOfAnyBytes) {
+  RepositoryBuilder repo;
+  repo.Core("b_v2_00_a").Qvr("PORT p\xFF = \"q\\\", DIR = O");
+  EXPECT_EQ(
+      Kel("show b --json --section ports -L " + repo.Path() + " | tr -d ' \n'").output,
+      "{\"format_version\":1,\"key\":\"b_v2_00_a\",\"name\":\"b\",\"version\":\"2.00.a\","
+      "\"location\":\"" +
+          (repo / "ipmods/b_v2_00_a") +
+          "\",\"ports\":[{\"name\":\"p\xEF\xBF\xBD\",\"direction\":\"O\",\"vector\":\"\","
+          "\"default\":\"q\\\\\",\"interfaces\":[],\"properties\":{\"NAME\":\"p\xEF\xBF\xBD\","
+          "\"DEFAULT\":\"q\\\\\",\"DIR\":\"O\",\"ASSIGNMENT\":\"OPTIONAL\",\"ENABLE\":"
+          "\"SINGLE\",\"INITIALVAL\":\"GND\",\"ISVALID\":\"TRUE\",\"PERMIT\":"
+          "\"ADVANCED_USER\"}}]}");
 }
 
 TEST(Kel, ShowsHelpAndVersion) {

@@ -2,6 +2,7 @@
 
 #include "Table.h"
 #include "Tarvo_Kel_Key.h"
+#include "Text.h"
 #include "Verbs.h"
 
 namespace {
@@ -11,10 +12,10 @@ using Tarvo::KelLibrary;
 using Tarvo::StringBase;
 using Tarvo::StringList;
 
-StringBase Option(const KelLibrary& library, const StringBase& key, const char* name) {
+std::string Option(const KelLibrary& library, const StringBase& key, const char* name) {
   StringBase value;
   library.GetIPProperty(key, name, value);
-  return value;
+  return Text(value);
 }
 
 // Cores by name, and the versions of a core from the newest down. Of versions that are equal but
@@ -45,8 +46,8 @@ Status List(const KelLibrary& library, bool allVersions) {
     core = key.GetName();
     if (!newest && !allVersions) continue;
     const StringBase& text = key.GetKey();
-    table.Add({text, Option(library, text, "STYLE"), Option(library, text, "HDL"),
-               library.GetLocation(text), Option(library, text, "DESC")});
+    table.Add({Text(text), Option(library, text, "STYLE"), Option(library, text, "HDL"),
+               Text(library.GetLocation(text)), Option(library, text, "DESC")});
   }
   table.Write();
   return StatusClean;

@@ -26,9 +26,9 @@ std::string Printable(std::string_view field) {
 
 }  // namespace
 
-void Table::Add(const std::vector<Tarvo::StringBase>& fields) {
+void Table::Add(const Row& fields) {
   Row row;
-  for (const Tarvo::StringBase& field : fields) row.push_back(Printable(field.View()));
+  for (const std::string& field : fields) row.push_back(Printable(field));
   rows.push_back(std::move(row));
 }
 

@@ -5,8 +5,6 @@
 #include <string>
 #include <vector>
 
-#include "Tarvo_Export.h"
-
 // Rows of fields for standard output: aligned in columns on a terminal, with a tab between the
 // fields into a pipe or file, where scripts read them. Control characters are written as \xNN, so
 // that a row stays one line and no field breaks into two.
@@ -14,7 +12,7 @@ class Table {
  public:
   using Row = std::vector<std::string>;
 
-  void Add(const std::vector<Tarvo::StringBase>& fields);
+  void Add(const Row& fields);
   bool IsEmpty() const { return rows.empty(); }
   void Write() const;
 

@@ -17,7 +17,9 @@ Status Which(const Tarvo::KelLibrary& library, const std::vector<std::string>& k
 // key, style, language, location and description.
 Status List(const Tarvo::KelLibrary& library, bool allVersions);
 
-// A line for each option of a core: name and value.
-Status Show(const Tarvo::KelLibrary& library, const std::string& key);
+// What a core is: its options, parameters, ports and interfaces, or some of these sections, as
+// tables or as a JSON document.
+Status Show(const Tarvo::KelLibrary& library, const std::string& key,
+            const std::vector<std::string>& sections, bool asJson);
 
 #endif

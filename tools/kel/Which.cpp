@@ -1,5 +1,6 @@
 #include "Table.h"
 #include "Tarvo_Kel_Key.h"
+#include "Text.h"
 #include "Verbs.h"
 
 namespace {
@@ -15,7 +16,8 @@ StringBase Resolve(const Tarvo::KelLibrary& library, const StringBase& text) {
 bool Add(Table& table, const Tarvo::KelLibrary& library, const StringBase& text) {
   const StringBase location = library.GetLocation(text);
   if (location.GetLength() == 0) return false;
-  table.Add({Resolve(library, text), library.GetName(text), library.GetVersion(text), location});
+  table.Add({Text(Resolve(library, text)), Text(library.GetName(text)),
+             Text(library.GetVersion(text)), Text(location)});
   return true;
 }
 

@@ -8,6 +8,7 @@
 #include <string>
 #include <vector>
 
+#include "Describe.h"
 #include "Messages.h"
 #include "Status.h"
 #include "Tarvo_AppException.h"
@@ -21,7 +22,9 @@ namespace {
 struct Call {
   std::vector<std::string> libraries;
   std::vector<std::string> keys;
+  std::vector<std::string> sections;
   bool allVersions = false;
+  bool asJson = false;
   std::function<Status(const Tarvo::KelLibrary&)> verb;
 };
 
@@ -36,10 +39,17 @@ void DescribeVerbs(CLI::App& app, Call& call) {
     call.verb = [&call](const auto& library) { return List(library, call.allVersions); };
   });
 
-  CLI::App* const show = app.add_subcommand("show", "Shows the options of a core");
+  CLI::App* const show =
+      app.add_subcommand("show", "Shows a core: options, parameters, ports and interfaces");
   show->add_option("KEY", call.keys, kKeyHelp)->required()->expected(1);
+  show->add_option("--section", call.sections, "One of these alone; may be repeated")
+      ->check(CLI::IsMember(kSections))
+      ->allow_extra_args(false);
+  show->add_flag("--json", call.asJson, "As a JSON document, with all properties");
   show->callback([&call] {
-    call.verb = [&call](const auto& library) { return Show(library, call.keys.front()); };
+    call.verb = [&call](const auto& library) {
+      return Show(library, call.keys.front(), call.sections, call.asJson);
+    };
   });
 
   CLI::App* const which =

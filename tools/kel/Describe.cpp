@@ -1,0 +1,168 @@
+#include "Describe.h"
+
+#include <algorithm>
+#include <cstddef>
+#include <set>
+#include <string_view>
+
+#include "Tarvo_KelLibrary_Utils.h"
+#include "Tarvo_QVRParser.h"
+#include "Text.h"
+
+namespace {
+
+using Tarvo::KelIP;
+using Tarvo::QVRParser;
+using Tarvo::StringBase;
+using Tarvo::StringList;
+
+Json Texts(const StringList& list) {
+  Json texts = Json::array();
+  for (const StringBase& text : list) texts.push_back(Text(text));
+  return texts;
+}
+
+// Gives `visit` each name once.
+template <class Visit>
+void ForEachName(const StringList& names, const Visit& visit) {
+  std::set<StringBase> seen;
+  for (const StringBase& name : names) {
+    if (seen.insert(name).second) visit(name);
+  }
+}
+
+// The questions for one kind of record.
+using List = bool (KelIP::*)(StringList&) const;
+using ListOf = bool (KelIP::*)(const StringBase&, StringList&) const;
+using Get = bool (KelIP::*)(const StringBase&, const StringBase&, StringBase&) const;
+
+StringList Ask(const KelIP& ip, List list) {
+  StringList names;
+  (ip.*list)(names);
+  return names;
+}
+
+StringList Ask(const KelIP& ip, ListOf list, const StringBase& record) {
+  StringList names;
+  (ip.*list)(record, names);
+  return names;
+}
+
+Json Properties(const KelIP& ip, ListOf list, Get get, const StringBase& record) {
+  Json properties = Json::object();
+  ForEachName(Ask(ip, list, record), [&](const StringBase& name) {
+    StringBase value;
+    (ip.*get)(record, name, value);
+    properties[Text(name)] = Text(value);
+  });
+  return properties;
+}
+
+// The value of a property that a record may have.
+std::string Value(const Json& properties, const StringBase& name) {
+  return properties.value(Text(name), std::string());
+}
+
+Json Options(const KelIP& ip) {
+  Json options = Json::object();
+  ForEachName(Ask(ip, &KelIP::ListIPProperties), [&](const StringBase& name) {
+    StringBase value;
+    ip.GetIPProperty(name, value);
+    options[Text(name)] = Text(value);
+  });
+  return options;
+}
+
+Json Parameters(const KelIP& ip) {
+  const StringList generics = Ask(ip, &KelIP::ListGenerics);
+  const std::set<StringBase> isGeneric(generics.begin(), generics.end());
+  Json parameters = Json::array();
+  ForEachName(Ask(ip, &KelIP::ListParameters), [&](const StringBase& name) {
+    const Json properties =
+        Properties(ip, &KelIP::ListParameterProperties, &KelIP::GetParameterProperty, name);
+    parameters.push_back({{"name", Text(name)},
+                          {"value", Value(properties, QVRParser::QVR_PROPERTY_VALUE)},
+                          {"default_value", Value(properties, QVRParser::QVR_PROPERTY_DEFAULT)},
+                          {"generic", isGeneric.count(name) > 0},
+                          {"properties", properties}});
+  });
+  return parameters;
+}
+
+// The interfaces that a port names, bus interfaces first.
+Json InterfacesOf(const Json& port) {
+  Json names = Json::array();
+  for (const StringBase* key : {&QVRParser::QVR_BUS_IF_NAME, &QVRParser::QVR_IO_IF_NAME}) {
+    const StringBase value(std::string_view(Value(port, *key)));
+    for (const StringBase& name : Tarvo::KelLibrary_Utils::GetInterfaceVector(value)) {
+      names.push_back(Text(name));
+    }
+  }
+  return names;
+}
+
+Json Ports(const KelIP& ip) {
+  Json ports = Json::array();
+  ForEachName(Ask(ip, &KelIP::ListPorts), [&](const StringBase& name) {
+    const Json properties =
+        Properties(ip, &KelIP::ListPortProperties, &KelIP::GetPortProperty, name);
+    ports.push_back({{"name", Text(name)},
+                     {"direction", Value(properties, "DIR")},
+                     {"vector", Value(properties, QVRParser::QVR_PORT_VEC)},
+                     {"default", Value(properties, QVRParser::QVR_BUS_IF_ROLE_NAME)},
+                     {"interfaces", InterfacesOf(properties)},
+                     {"properties", properties}});
+  });
+  return ports;
+}
+
+// Bus and I/O interfaces are asked for by the same questions.
+struct InterfaceKind {
+  const char* name;
+  List list;
+  ListOf listProperties;
+  Get get;
+  ListOf listParameters;
+  ListOf listPorts;
+};
+const InterfaceKind kInterfaceKinds[] = {
+    {"bus", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceProperties,
+     &KelIP::GetBusInterfaceProperty, &KelIP::ListBusInterfaceParameters,
+     &KelIP::ListBusInterfacePorts},
+    {"io", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceProperties,
+     &KelIP::GetIOInterfaceProperty, &KelIP::ListIOInterfaceParameters,
+     &KelIP::ListIOInterfacePorts}};
+
+Json Interfaces(const KelIP& ip) {
+  Json interfaces = Json::array();
+  for (const InterfaceKind& kind : kInterfaceKinds) {
+    ForEachName(Ask(ip, kind.list), [&](const StringBase& name) {
+      interfaces.push_back({{"name", Text(name)},
+                            {"kind", kind.name},
+                            {"parameters", Texts(Ask(ip, kind.listParameters, name))},
+                            {"ports", Texts(Ask(ip, kind.listPorts, name))},
+                            {"properties", Properties(ip, kind.listProperties, kind.get, name)}});
+    });
+  }
+  return interfaces;
+}
+
+using Section = Json (*)(const KelIP&);
+const Section kSectionMakers[] = {Options, Parameters, Ports, Interfaces};
+
+}  // namespace
+
+const std::vector<std::string> kSections = {"options", "parameters", "ports", "interfaces"};
+
+Json Describe(const KelIP& ip, const std::vector<std::string>& sections) {
+  Json core = {{"key", Text(ip.GetKey())},
+               {"name", Text(ip.GetName())},
+               {"version", Text(ip.GetVersion())},
+               {"location", Text(ip.GetLocation())}};
+  for (std::size_t i = 0; i < kSections.size(); ++i) {
+    if (std::count(sections.begin(), sections.end(), kSections[i])) {
+      core[kSections[i]] = kSectionMakers[i](ip);
+    }
+  }
+  return core;
+}

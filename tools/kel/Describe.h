@@ -1,0 +1,22 @@
+#ifndef KEL_DESCRIBE_H
+#define KEL_DESCRIBE_H
+
+#include <string>
+#include <vector>
+
+#include "Json.h"
+#include "Tarvo_KelIP.h"
+
+// The names of the sections that a description of a core has.
+extern const std::vector<std::string> kSections;
+
+// What a core is: its identity, and a member for each of these sections, in the order of the core
+// description. Of namesakes the first alone counts, for records, properties and options alike.
+//
+//     options      an object of names and values
+//     parameters   name, value, default_value, generic (or not), properties
+//     ports        name, direction, vector, default, interfaces, properties
+//     interfaces   name, kind ("bus" or "io"), parameters and ports that belong to it, properties
+Json Describe(const Tarvo::KelIP& ip, const std::vector<std::string>& sections);
+
+#endif
