@@ -1,0 +1,95 @@
+// What a large core description costs: opening it, and asking for every property of every record,
+// beside cutting the same lines once with the same tokenizer. Times differ from machine to machine;
+// compare the rows of one run. The argument is the number of ports; there are two parameters for
+// every five of them.
+
+#include <benchmark/benchmark.h>
+#include <unistd.h>
+
+#include <boost/tokenizer.hpp>
+#include <cstdint>
+#include <cstdlib>
+#include <filesystem>
+#include <fstream>
+#include <string>
+
+#include "Port_FileName.h"
+#include "Tarvo_FileScanner.h"
+#include "Tarvo_QVRParser.h"
+
+namespace {
+
+using Tarvo::QVRParser;
+using Tarvo::StringBase;
+using Tarvo::StringList;
+
+// A description on disk for the life of the object.
+class Description {
+ public:
+  explicit Description(std::int64_t ports) {
+    const int handle = ::mkstemp(name.data());
+    if (handle < 0) std::abort();
+    ::close(handle);
+    std::ofstream file(name);
+    file << "OPTION STYLE = HDL\nBUS_INTERFACE BUS = REGS, BUS_TYPE = SLAVE\n";
+    for (std::int64_t i = 0; i < ports * 2 / 5; ++i) {
+      file << "PARAMETER WIDTH_" << i << " = 8, DT = integer, RANGE = (2:32), DESC = \"Width\"\n";
+    }
+    for (std::int64_t i = 0; i < ports; ++i) {
+      file << "PORT data_" << i << " = DATA_" << i
+           << ", DIR = I, VEC = [31:0], BUS = REGS, DESC = \"Data of a lane\"\n";
+    }
+  }
+  ~Description() { std::filesystem::remove(name); }
+  Description(const Description&) = delete;
+  Description& operator=(const Description&) = delete;
+
+  Port::FileName File() const { return Port::FileName(name.c_str()); }
+
+ private:
+  std::string name = std::filesystem::temp_directory_path() / "kel-bench-XXXXXX";
+};
+
+void CutLines(benchmark::State& state) {
+  const Description description(state.range(0));
+  const boost::char_separator<char> separator("", " ,=()[]\"'", boost::drop_empty_tokens);
+  for (auto _ : state) {
+    Tarvo::FileScanner lines(description.File());
+    StringBase line;
+    std::size_t tokens = 0;
+    while (lines.GetNextLine(line)) {
+      const std::string text(line.View());
+      for (const std::string& token : boost::tokenizer(text, separator)) tokens += token.size();
+    }
+    benchmark::DoNotOptimize(tokens);
+  }
+}
+BENCHMARK(CutLines)->Arg(100)->Arg(1000)->Arg(5000)->Unit(benchmark::kMillisecond);
+
+void Open(benchmark::State& state) {
+  const Description description(state.range(0));
+  for (auto _ : state) benchmark::DoNotOptimize(QVRParser(description.File()));
+}
+BENCHMARK(Open)->Arg(100)->Arg(1000)->Arg(5000)->Unit(benchmark::kMillisecond);
+
+void AskEverything(benchmark::State& state) {
+  const Description description(state.range(0));
+  const QVRParser parser(description.File());
+  for (auto _ : state) {
+    for (const StringBase& port : parser.ListPorts()) {
+      for (const StringBase& property : parser.ListPortProperties(port)) {
+        benchmark::DoNotOptimize(parser.GetPortProperty(port, property));
+      }
+    }
+    for (const StringBase& parameter : parser.ListParameters()) {
+      for (const StringBase& property : parser.ListParameterProperties(parameter)) {
+        benchmark::DoNotOptimize(parser.GetParameterProperty(parameter, property));
+      }
+    }
+  }
+}
+BENCHMARK(AskEverything)->Arg(100)->Arg(1000)->Arg(5000)->Unit(benchmark::kMillisecond);
+
+}  // namespace
+
+BENCHMARK_MAIN();
