@@ -1,10 +1,10 @@
 #include "Tarvo_Kel_Index.h"
 
 #include <algorithm>
-#include <boost/filesystem.hpp>
 #include <cstdint>
 #include <utility>
 
+#include "Tarvo_Existence.h"
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_Report.h"
 
@@ -27,21 +27,6 @@ namespace {
 constexpr Report::Module kModule{"s/Tarvo_Kel_Index", "1.0"};
 
 constexpr std::size_t kBucketHint = 100;
-
-// What can't be asked for, as behind a directory without permission, counts as missing.
-bool Exists(const FileName& location) {
-  boost::system::error_code error;
-  return boost::filesystem::exists(location.GetName().GetText(), error);
-}
-
-// What can't be asked for may well be there: reading it then tells what is wrong. A name that is
-// too long for a file is known to be missing.
-bool MayExist(const FileName& file) {
-  boost::system::error_code error;
-  const auto status = boost::filesystem::status(file.GetName().GetText(), error);
-  return status.type() != boost::filesystem::file_not_found &&
-         error != boost::system::errc::filename_too_long;
-}
 
 // The keys of the entries that `gather` adds from each list, sorted, each once.
 template <class Table, class Gather>

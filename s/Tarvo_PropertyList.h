@@ -5,6 +5,7 @@
 #include <span>
 
 #include "Tarvo_Export.h"
+#include "Tarvo_Word.h"
 
 namespace Tarvo {
 
@@ -42,7 +43,7 @@ inline bool Applies(const DefaultRow& row, const PropertyList& properties) {
 inline const StringBase* FindDefault(const PropertyList& properties, DefaultRows defaults,
                                      const StringBase& name) {
   const auto found = std::find_if(defaults.begin(), defaults.end(), [&](const DefaultRow& row) {
-    return name.Compare(*row.name, StringBase::CompareIgnoreCase) == 0 && Applies(row, properties);
+    return Matches(name, *row.name) && Applies(row, properties);
   });
   return found == defaults.end() ? nullptr : found->value;
 }

@@ -15,6 +15,7 @@
 #include "Tarvo_QVRStatement.h"
 #include "Tarvo_Report.h"
 #include "Tarvo_TokenReader.h"
+#include "Tarvo_Word.h"
 
 namespace Tarvo {
 
@@ -61,10 +62,6 @@ using Q = QVRParser;
 using Records = std::vector<QVRRecord>;
 
 constexpr Report::Module kModule{"s/Tarvo_QVRParser", "1.0"};
-
-bool Matches(const StringBase& text, const StringBase& word) {
-  return text.Compare(word, StringBase::CompareIgnoreCase) == 0;
-}
 
 bool IsVector(const PropertyList& port) {
   const StringBase* const range = FindValue(port, Q::QVR_PORT_VEC);

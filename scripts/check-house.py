@@ -19,6 +19,7 @@ LONGEST_SOURCE = 600
 RANKS = [
     (0, r"platform/.*"),
     (0.5, r"include/Tarvo_Export\.h"),
+    (0.7, r"s/Tarvo_(Word|Existence)\.h"),
     (1, r"s/Tarvo_(Report|PropertyList|TokenReader)\..*"),
     (2, r"(include|s)/Tarvo_(Guard|Kel_Key|KelLibrary_Utils|FileScanner)\..*"),
     (3, r"(include|s)/Tarvo_QVRStatement\..*"),
@@ -26,7 +27,7 @@ RANKS = [
     (4, r"(include|s)/Tarvo_OptionScanner\..*"),
     (5, r"(include|s)/Tarvo_Kel_Index\..*"),
     (6, r"(include|s)/Tarvo_QVRParser\..*"),
-    (7, r"(include|s)/Tarvo_(LDXParser|LDXParser_Hdl|TEWParser)\..*"),
+    (7, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
     (8, r"(include|s)/Tarvo_KelIP\..*"),
     (9, r"(include|s)/Tarvo_KelLibrary\..*"),
     (10, r"(tools|tests|bench|examples|fuzz)/.*"),
@@ -47,7 +48,8 @@ def rank_of(path):
     """The rank and the module of a file, or None for one that the table does not know."""
     for rank, pattern in RANKS:
         if re.fullmatch(pattern, path):
-            module = path.split("/")[0] if rank in (0, 10) else pathlib.Path(path).stem
+            stem = pathlib.Path(path).stem.removesuffix("_Hdl")  # a second source of its parser
+            module = path.split("/")[0] if rank in (0, 10) else stem
             return rank, module
     return None
 

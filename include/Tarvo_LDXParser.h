@@ -1,0 +1,146 @@
+#ifndef TARVO_LDXPARSER_H
+#define TARVO_LDXPARSER_H
+
+#include <cstddef>
+#include <unordered_map>
+#include <utility>
+#include <vector>
+
+#include "Port_FileName.h"
+#include "Tarvo_Export.h"
+#include "Tarvo_Kel_Key.h"
+
+namespace Tarvo {
+
+class Kel_Index;
+
+// The analyse order of a core: which HDL sources make it up, its own and those of other cores, in
+// which order a compiler takes them, for synthesis and for simulation.
+//
+//     const Tarvo::LDXParser order(index, key, Tarvo::Kel_Key(), "VHDL");
+//     for (const auto& source : order.ListSynthesisAnalyseOrder()) std::cout << source << '\n';
+//
+// A library is a core version, and the sources of a library lie below its directory. Libraries
+// stand in the order in which each got its first source, and the sources of a library stand
+// together, in the order in which they were added. Each source stands once: its first place counts.
+// An entry that takes over the list of another core puts what that core adds at its own place.
+// Synthesis and simulation are independent of each other. No file is asked whether it exists.
+//
+// Everything is read by the constructor, the files of included cores too; a core that is reached
+// twice is read twice. The queries look at no file.
+//
+// Lifetime: the index must outlive the parser, and not change while it is made. Threads: like an
+// int, together with the index; several may ask one parser.
+class TARVO_EXPORT LDXParser {
+ public:
+  static const StringBase LDX_HDL_VERILOG;
+  static const StringBase LDX_HDL_VHDL;
+  static const StringBase LDX_HDL_BOTH;
+  static const StringBase LDX_HDL_MIXED;
+
+  // Reads the analyse order of a version. The root is the version for which a whole analysis is
+  // made; an invalid key stands for this one. The language is the value of the core's option HDL.
+  //
+  // Throws AppException with level NotFound for a key that is not in the index, and with level
+  // Failure if the file is missing, can't be read or has a bad line, or if the cores include each
+  // other in a circle or nest deeper than 1,000 levels. What is wrong with a line was then issued
+  // as a message, with the line itself last. May throw std::bad_alloc.
+  LDXParser(const Kel_Index& index, const Kel_Key& key, const Kel_Key& rootKey,
+            const StringBase& hdl);
+  // The same for a file of any name, taken for that of the version.
+  LDXParser(const Port::FileName& ldxFile, const Kel_Index& index, const Kel_Key& key,
+            const Kel_Key& rootKey, const StringBase& hdl);
+  ~LDXParser();
+  LDXParser(const LDXParser&) = delete;
+  LDXParser& operator=(const LDXParser&) = delete;
+
+  // The language that a file's extension tells, whatever its entry said: LDX_HDL_VERILOG,
+  // LDX_HDL_VHDL, or empty.
+  StringBase GetFileLanguage(const Port::FileName& file) const;
+
+  // The library of a listed source, found by the levels of its path from the version's directory
+  // on. An invalid, empty key for any other file.
+  Kel_Key GetFileLibrary(const Port::FileName& file) const;
+
+  // The absolute path of a library's Verilog include directory: the one that an entry gives it, or
+  // else the library's own directory. Throws AppException with level NotFound for a library that
+  // has none and is not in the index.
+  StringBase GetVerilogIncludeLocation(const StringBase& library) const;
+
+  // The absolute directories of the libraries, in order. Throw AppException with level NotFound for
+  // a library that has left the index since.
+  StringList ListSynthesisLibraries() const;
+  StringList ListSimulationLibraries() const;
+
+  // The absolute paths of the sources, library by library, in order.
+  StringList ListSynthesisAnalyseOrder() const;
+  StringList ListSimulationAnalyseOrder() const;
+
+  // The libraries that entries give an include directory, as the entries name them: a bare name
+  // stays bare.
+  StringList ListVerilogIncludeLibraryKeys() const;
+
+ private:
+  // A source, and the file key that its location gives: its library, a blank, and its name below
+  // the language's directory.
+  struct Source {
+    Port::FileName location;
+    StringBase fileKey;
+  };
+  struct Library {
+    Kel_Key key;
+    std::vector<Source> sources;
+  };
+
+  // The lists for one purpose. No library is without sources.
+  class TARVO_LOCAL Side {
+   public:
+    explicit Side(const char* sideName) : name(sideName) {}
+
+    // Adds the source under a file key. False, with nothing changed, if the key is there already.
+    bool Add(const Kel_Key& library, const StringBase& fileKey, const Source& source);
+    // The library of the source with that file key, or null.
+    const Kel_Key* FindLibrary(const StringBase& fileKey) const;
+    StringList ListSources() const;
+
+    const char* name;
+    std::vector<Library> libraries;
+
+   private:
+    std::unordered_map<StringBase, std::size_t> positions;  // by the library's key text
+    std::unordered_map<StringBase, std::size_t> owners;     // the same positions, by file key
+  };
+
+  TARVO_LOCAL LDXParser(const Port::FileName& ldxFile, const Kel_Index& index, const Kel_Key& key,
+                        const Kel_Key& rootKey, const StringBase& hdl, const LDXParser* enclosing);
+
+  TARVO_LOCAL void CheckNesting() const;
+  TARVO_LOCAL void Parse(const Port::FileName& ldxFile);
+  TARVO_LOCAL bool ParseLibraryEntry(const StringBase& line);
+  TARVO_LOCAL bool ParsePathEntry(const StringBase& line);
+  TARVO_LOCAL bool AddFile(const StringBase& keyword, const StringBase& library,
+                           const StringBase& file, const StringBase& language);
+  TARVO_LOCAL void AddSource(Side& side, const Kel_Key& library, const StringBase& fileKey,
+                             const Source& source) const;
+  TARVO_LOCAL bool AnalyseLibrary(const StringBase& library);
+  TARVO_LOCAL StringBase LanguageOf(const Kel_Key& library) const;
+  TARVO_LOCAL void MergeSide(Side& side, const Side& nestedSide, const LDXParser& nested) const;
+  TARVO_LOCAL void MergeIncludeDirectories(const LDXParser& nested);
+  TARVO_LOCAL const Port::FileName* FindIncludeDirectory(const Kel_Key& library) const;
+  TARVO_LOCAL StringList ListDirectories(const Side& side) const;
+
+  const Kel_Index& index;
+  Kel_Key key;   // as given
+  Kel_Key core;  // the version that it stands for
+  Kel_Key rootKey;
+  StringBase hdl;
+  const LDXParser* enclosing;  // the parser that includes this one; null at the top
+  unsigned level;              // 1 at the top
+  Side synthesis;
+  Side simulation;
+  std::vector<std::pair<Kel_Key, Port::FileName>> includeDirectories;
+};
+
+}  // namespace Tarvo
+
+#endif
