@@ -97,8 +97,9 @@ class TARVO_EXPORT LDXParser {
    public:
     explicit Side(const char* sideName) : name(sideName) {}
 
-    // Adds the source under a file key. False, with nothing changed, if the key is there already.
-    bool Add(const Kel_Key& library, const StringBase& fileKey, const Source& source);
+    // Moves the source in under a file key. False, with nothing changed, if the key is there
+    // already. The file key may be the source's own.
+    bool Add(const Kel_Key& library, const StringBase& fileKey, Source& source);
     // The library of the source with that file key, or null.
     const Kel_Key* FindLibrary(const StringBase& fileKey) const;
     StringList ListSources() const;
@@ -121,10 +122,10 @@ class TARVO_EXPORT LDXParser {
   TARVO_LOCAL bool AddFile(const StringBase& keyword, const StringBase& library,
                            const StringBase& file, const StringBase& language);
   TARVO_LOCAL void AddSource(Side& side, const Kel_Key& library, const StringBase& fileKey,
-                             const Source& source) const;
+                             Source source) const;
   TARVO_LOCAL bool AnalyseLibrary(const StringBase& library);
   TARVO_LOCAL StringBase LanguageOf(const Kel_Key& library) const;
-  TARVO_LOCAL void MergeSide(Side& side, const Side& nestedSide, const LDXParser& nested) const;
+  TARVO_LOCAL void MergeSide(Side& side, Side& nestedSide, const LDXParser& nested) const;
   TARVO_LOCAL void MergeIncludeDirectories(const LDXParser& nested);
   TARVO_LOCAL const Port::FileName* FindIncludeDirectory(const Kel_Key& library) const;
   TARVO_LOCAL StringList ListDirectories(const Side& side) const;

@@ -1,6 +1,7 @@
 #include "Tarvo_LDXParser.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "Tarvo_Existence.h"
 #include "Tarvo_FileScanner.h"
@@ -132,13 +133,13 @@ StringBase GetEntryKey(const Kel_Key& library, const StringBase& file,
 
 }  // namespace
 
-bool LDXParser::Side::Add(const Kel_Key& library, const StringBase& fileKey, const Source& source) {
+bool LDXParser::Side::Add(const Kel_Key& library, const StringBase& fileKey, Source& source) {
   const auto [owner, isNewSource] = owners.try_emplace(fileKey, libraries.size());
   if (!isNewSource) return false;
   const auto [position, isNewLibrary] = positions.try_emplace(library.GetKey(), libraries.size());
   if (isNewLibrary) libraries.push_back({library, {}});
   owner->second = position->second;
-  libraries[position->second].sources.push_back(source);
+  libraries[position->second].sources.push_back(std::move(source));
   return true;
 }
 
@@ -281,7 +282,7 @@ bool LDXParser::AddFile(const StringBase& keyword, const StringBase& library,
 }
 
 void LDXParser::AddSource(Side& side, const Kel_Key& library, const StringBase& fileKey,
-                          const Source& source) const {
+                          Source source) const {
   if (side.Add(library, fileKey, source)) return;
   kModule.Warning("%s - File %s:%s already exists in %s library\n", key.GetKey(), library.GetKey(),
                   source.location.GetTail(), side.name);
@@ -291,7 +292,7 @@ bool LDXParser::AnalyseLibrary(const StringBase& library) {
   return Guard(NoOutput(), Failure(kModule, "Unable to analyse library %s\n%s\n", library), [&] {
     const Kel_Key libKey(library);
     const StringBase language = LanguageOf(libKey);
-    const LDXParser nested(GetLdxFile(index, libKey), index, libKey, rootKey, language, this);
+    LDXParser nested(GetLdxFile(index, libKey), index, libKey, rootKey, language, this);
     MergeSide(synthesis, nested.synthesis, nested);
     MergeSide(simulation, nested.simulation, nested);
     MergeIncludeDirectories(nested);
@@ -309,9 +310,10 @@ StringBase LDXParser::LanguageOf(const Kel_Key& library) const {
   return language.GetLength() > 0 ? language : LDX_HDL_VHDL;
 }
 
-void LDXParser::MergeSide(Side& side, const Side& nestedSide, const LDXParser& nested) const {
-  for (const Library& library : nestedSide.libraries) {
-    for (const Source& source : library.sources) {
+// Takes over the sources of the nested side; it is not asked again.
+void LDXParser::MergeSide(Side& side, Side& nestedSide, const LDXParser& nested) const {
+  for (Library& library : nestedSide.libraries) {
+    for (Source& source : library.sources) {
       if (side.Add(library.key, source.fileKey, source)) continue;
       TARVO_TRACE("%s - File %s:%s included from %s already exists in %s library\n", key.GetKey(),
                   library.key.GetKey(), source.location.GetTail(), nested.key.GetKey(), side.name);
