@@ -20,8 +20,8 @@ namespace Tarvo {
 // Lookups that find nothing throw AppException with level NotFound; nothing is caught here. Any
 // operation that stores or builds text may throw std::bad_alloc.
 //
-// Lifetime: instances and parsers made from an index keep a reference to it, so it must outlive
-// them. Threads: for one at a time.
+// Lifetime: an index must outlive the instances and parsers that keep a reference to it, as their
+// headers say. Threads: for one at a time.
 class TARVO_EXPORT Kel_Index {
  public:
   // The layout of a repository, REPOSITORY/ipmods/KEY/..., where KEY names a version directory:

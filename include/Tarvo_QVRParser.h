@@ -23,26 +23,38 @@ struct QVRRecord {
 //
 //     const Tarvo::QVRParser parser(Port::FileName("pulse_counter_v2_1_0.qvr"));
 //     for (const auto& port : parser.ListPorts())
-//       std::cout << port << ' ' << parser.GetPortProperty(port, "DIR") << '\n';
+//       std::cout << port << ' ' << parser.GetPortProperty(port, "ISVALID") << '\n';
+//
+// The file has a statement on a line; `#` begins a comment. A line that begins with none of these
+// five keywords, in capitals, is ignored. A value of several words stands in quotes, parentheses or
+// square brackets, but for that of an option, which runs to the end of the line. In the others the
+// list is over at the first word that no comma announces.
+//
+//     OPTION name = value                   PARAMETER name = value, KEY = value, ...
+//     BUS_INTERFACE BUS = name, ...         PORT name = value, KEY = value, ...
+//     IO_INTERFACE IO_IF = name, ...
 //
 // Records: all statements of a kind, in the order of the file, namesakes included; a lookup finds
-// the first of them. Names are compared exactly, letter case included. A parameter is a generic too
-// unless the file gives it the TYPE NON_HDL; the generic is a copy that lives by itself from then
-// on.
+// the first of them. A parameter is a generic too unless the file gives it the TYPE NON_HDL, be it
+// in one of several TYPE entries; the generic is a copy that lives by itself from then on.
 //
 // Properties: those that the file states and, behind them, the defaults of their kind that it
-// leaves out. A property that stands twice counts by its first entry. A default is found by its
-// name in either letter case. Whatever a List operation names can be asked for with the matching
-// Get.
+// leaves out. A stated one is found by its exact name, letter case included, and by its first entry
+// if it stands twice. A default is found in any letter case, even where the file states the
+// property: with STYLE = MIX stated, "style" still gives HDL. Whatever a List operation names can
+// be asked for with the matching Get.
 //
 //     parameter, generic   NAME, VALUE, DEFAULT_VALUE, then as stated
-//                          default: ASSIGNMENT, ISVALID, PERMIT, TYPE
-//     port                 NAME, DEFAULT, then as stated
-//                          default: ASSIGNMENT, ENABLE, ENDIAN (if VEC is not empty), INITIALVAL,
-//                          INTERRUPT_PRIORITY (if SIGIS is INTERRUPT), ISVALID, PERMIT
-//     bus interface        as stated, NAME in front of BUS; default: ISVALID, SHARES_ADDR
-//     I/O interface        as stated, NAME in front of IO_IF; default: ISVALID
-//     option               a single value; default: IMP_NETLIST, RUN_TRAMFOLD, STYLE, USAGE_LEVEL
+//                          ASSIGNMENT = OPTIONAL, ISVALID = TRUE, PERMIT = ADVANCED_USER,
+//                          TYPE = HDL
+//     port                 NAME, DEFAULT (the value behind its name), then as stated
+//                          ASSIGNMENT = OPTIONAL, ENABLE = SINGLE, ENDIAN = BIG if VEC is stated
+//                          and not empty, INITIALVAL = GND, INTERRUPT_PRIORITY = MEDIUM if SIGIS is
+//                          INTERRUPT in any letter case, ISVALID = TRUE, PERMIT = ADVANCED_USER
+//     bus interface        as stated, NAME in front of BUS; ISVALID = TRUE, SHARES_ADDR = ALL
+//     I/O interface        as stated, NAME in front of IO_IF; ISVALID = TRUE
+//     option               a single value; IMP_NETLIST = FALSE, RUN_TRAMFOLD = FALSE, STYLE = HDL,
+//                          USAGE_LEVEL = ADVANCED_USER
 //
 // Failures: a name that is not there throws AppException with level NotFound. Every operation but
 // the destructor may throw std::bad_alloc. Lookups walk the records from the front, so that their
@@ -55,12 +67,12 @@ class TARVO_EXPORT QVRParser {
   static const StringBase QVR_FALSE;
   static const StringBase QVR_PROPERTY_NAME;
   static const StringBase QVR_PROPERTY_VALUE;
-  static const StringBase QVR_PROPERTY_DEFAULT;
+  static const StringBase QVR_PROPERTY_DEFAULT;  // DEFAULT_VALUE: what the file gave as VALUE
   static const StringBase QVR_PROPERTY_VERSION;
   static const StringBase QVR_BUS_IF_NAME;
-  static const StringBase QVR_BUS_IF_ROLE_NAME;
+  static const StringBase QVR_BUS_IF_ROLE_NAME;  // DEFAULT: a port's role in its bus interfaces
   static const StringBase QVR_IO_IF_NAME;
-  static const StringBase QVR_IO_IF_ROLE_NAME;
+  static const StringBase QVR_IO_IF_ROLE_NAME;  // IO_IS: a record's role in its I/O interface
   static const StringBase QVR_ASSIGNMENT;
   static const StringBase QVR_ASSIGNMENT_OPTIONAL;
   static const StringBase QVR_ISVALID;
@@ -122,9 +134,9 @@ class TARVO_EXPORT QVRParser {
   StringList ListIoInterfaceProperties(const StringBase& interface) const;
   StringList ListPortProperties(const StringBase& port) const;
 
-  // The parameters or ports that belong to a declared interface, in the order of the file: those
-  // with a property BUS, or IO_IF, that names it, alone or among others with colons between. Throw
-  // AppException for an interface that the file doesn't declare.
+  // The parameters or ports that belong to a declared interface, in the order of the file: those of
+  // whose properties BUS, or IO_IF, in capitals, any names it, alone or among others with colons
+  // between. Throw AppException for an interface that the file doesn't declare.
   StringList ListBusInterfaceParameters(const StringBase& interface) const;
   StringList ListBusInterfacePorts(const StringBase& interface) const;
   StringList ListIoInterfaceParameters(const StringBase& interface) const;

@@ -36,7 +36,7 @@ inline StringList NamesOf(const PropertyList& properties) {
 }
 
 inline bool Applies(const DefaultRow& row, const PropertyList& properties) {
-  return !row.applies || row.applies(properties);
+  return row.applies == nullptr || row.applies(properties);
 }
 
 // The default of that name, in either letter case, or null.

@@ -173,12 +173,14 @@ TEST_F(Instance, LetsNothingEscape) {
   Walk();
   for (const Row& row : kRows) {
     SCOPED_TRACE(row.operation);
-    for (const auto kind : {AllocationFault::BadAlloc, AllocationFault::SomethingElse}) {
+    for (const auto kind : {AllocationFault::BadAlloc, AllocationFault::SomethingElse,
+                            AllocationFault::FatalException}) {
       const auto ip = Open("a_core_with_a_long_name");
-      const bool hasText = kind == AllocationFault::BadAlloc;
+      const bool hasText = kind != AllocationFault::SomethingElse;
       const std::string message =
           Failure(hasText ? row.severity : "error", row, *ip) +
-          (hasText                                         ? "\nstd::bad_alloc\n"
+          (hasText
+               ? (kind == AllocationFault::BadAlloc ? "\nstd::bad_alloc\n" : "\nout of order\n\n")
            : row.operation == std::string("GetIPProperty") ? "\n\n"
                                                            : ", unknown exception\n");
       for (int count = 0;; ++count) {
@@ -214,6 +216,10 @@ TEST_F(Instance, IsMadeForTheVersionThatAKeyStandsFor) {
   EXPECT_EQ(value, "abc");
   EXPECT_TRUE(ip->GetIPProperty("VERSION", value));
   EXPECT_EQ(value, "2.00.b");
+  StringList names;
+  EXPECT_TRUE(ip->ListIPProperties(names));
+  EXPECT_THAT(names, ElementsAre("NAME", "VERSION", "EMPTY", "NAME", "IMP_NETLIST", "RUN_TRAMFOLD",
+                                 "STYLE", "USAGE_LEVEL"));
   EXPECT_FALSE(ip->GetIPProperty("EMPTY", value));
   EXPECT_EQ(value, "");
   EXPECT_THAT(recorder.Take(), IsEmpty());
@@ -290,12 +296,15 @@ TEST_F(Instance, IsNotMadeWithoutADescription) {
 
 TEST_F(Instance, TracesItsMaking) {
   repo.Core("abc_v1_00_a").Qvr("");
-  Walk();
+  const auto relative = std::filesystem::relative(repo.Path());
+  ASSERT_TRUE(library.SetRepositoryPath(relative.c_str()));
+  const std::string where = std::filesystem::current_path() / relative / "ipmods/abc_v1_00_a";
   MessageRecorder traces(MessageRecorder::MessagesAndTraces);
   Open("abc");
   const auto entries = traces.Take();
-  EXPECT_EQ(entries.front(), "trace: Constructing IP instance abc v1.00.a from path " +
-                                 repo / "ipmods/abc_v1_00_a" + "\n");
+  EXPECT_EQ(entries.front(),
+            "trace: Constructing IP instance abc v1.00.a from path " + where + "\n");
+  EXPECT_EQ(Open("abc")->GetLocation(), where.c_str());
   EXPECT_EQ(entries.back(), "trace: Finished constructing IP instance abc v1.00.a\n");
 }
 

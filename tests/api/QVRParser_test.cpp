@@ -115,6 +115,7 @@ TEST(QVRParser, ReadsRecords) {
        " NAME=a VALUE=1 DEFAULT_VALUE=1 TYPE=HDL" + kFree},
       {kGeneric, "PARAMETER a = 1, TYPE = NON_HDL", "", ""},
       {kGeneric, "PARAMETER a = 1, type = Non_Hdl, TYPE = HDL", "", ""},
+      {kGeneric, "PARAMETER a = 1, TYPE = HDL, TYPE = NON_HDL", "", ""},
       {kGeneric, "PARAMETER TYPE = NON_HDL", "TYPE",
        " NAME=TYPE VALUE=NON_HDL DEFAULT_VALUE=NON_HDL" + kTyped},
       {kPort, "PORT p = \"\", DIR = O", "p",
@@ -122,13 +123,13 @@ TEST(QVRParser, ReadsRecords) {
       {kPort, "PORT p = q, VEC = [7:0], SIGIS = Interrupt", "p",
        " NAME=p DEFAULT=q VEC=[7:0] SIGIS=Interrupt" + port +
            " ENDIAN=BIG INITIALVAL=GND INTERRUPT_PRIORITY=MEDIUM" + portEnd},
-      {kPort, "PORT p = q, VEC = \"\", VEC = [1:0], SIGIS = CLK", "p",
-       " NAME=p DEFAULT=q VEC= VEC= SIGIS=CLK" + port + " INITIALVAL=GND" + portEnd},
+      {kPort, "PORT p = q, VEC = \"\", VEC = [1:0], SIGIS = CLK, SIGIS = INTERRUPT", "p",
+       " NAME=p DEFAULT=q VEC= VEC= SIGIS=CLK SIGIS=CLK" + port + " INITIALVAL=GND" + portEnd},
       {kPort, "PORT p = q, vec = [1:0], sigis = INTERRUPT, ENDIAN = LITTLE", "p",
        " NAME=p DEFAULT=q vec=[1:0] sigis=INTERRUPT ENDIAN=LITTLE" + port + " INITIALVAL=GND" +
            portEnd},
-      {kBus, "BUS_INTERFACE TYPE = SLAVE, Bus = B0, X = ''", "B0",
-       " TYPE=SLAVE NAME=B0 Bus=B0 X= ISVALID=TRUE SHARES_ADDR=ALL"},
+      {kBus, "BUS_INTERFACE TYPE = SLAVE, Bus = B0, ISVALID = ''", "B0",
+       " TYPE=SLAVE NAME=B0 Bus=B0 ISVALID= SHARES_ADDR=ALL"},
       {kBus, "BUS_INTERFACE BUS = '', BUS = B", "B",
        " NAME= BUS= NAME= BUS= ISVALID=TRUE SHARES_ADDR=ALL"},
       {kIo, "IO_INTERFACE IO_IF = I0", "I0", " NAME=I0 IO_IF=I0 ISVALID=TRUE"},
@@ -155,16 +156,25 @@ TEST(QVRParser, ListsOptionsAndTheirDefaults) {
   EXPECT_EQ(Thrown([&] { parser.GetOptionValue("e%s"); }), "0 Cannot find option e%s\n");
 }
 
+// Those that nothing here reads would change unseen.
+TEST(QVRParser, ExportsItsWords) {
+  using Q = QVRParser;
+  EXPECT_EQ(Join({Q::QVR_FALSE, Q::QVR_PROPERTY_VERSION, Q::QVR_IO_IF_ROLE_NAME,
+                  Q::QVR_OPTION_IMP_NETLIST, Q::QVR_OPTION_RUN_TRAMFOLD, Q::QVR_OPTION_STYLE,
+                  Q::QVR_OPTION_STYLE_HDL, Q::QVR_OPTION_USAGE_LEVEL}),
+            "FALSE VERSION IO_IS IMP_NETLIST RUN_TRAMFOLD STYLE HDL USAGE_LEVEL");
+}
+
 // The first bad statement is reported and ends all reading, whatever its kind.
 TEST(QVRParser, RefusesBadStatements) {
   const char* const lines[] = {
       "OPTION A",        "PARAMETER a = \"abc",  "BUS_INTERFACE BUS_TYPE = SLAVE",
-      "PORT a = 1, b",   "IO_INTERFACE IO_IF =", "BUS_INTERFACE BUS = A, bus = B, BUS = C",
+      "PORT a = 1, b",   "IO_INTERFACE IO_IF =", "BUS_INTERFACE BUS = A, bus = A",
       "PARAMETER a = (", "IO_INTERFACE BUS = A"};
   for (const char* line : lines) {
     MessageRecorder recorder;
     const std::string thrown =
-        Thrown([&] { Parse("OPTION A = b\n\n\t" + std::string(line) + " # x\nPORT"); });
+        Thrown([&] { Parse("OPTION A = b\n\n\t" + std::string(line) + " # x\nPORT a"); });
     const std::string keyword = std::string(line).substr(0, std::string(line).find(' '));
     const auto messages = recorder.Take();
     ASSERT_EQ(messages.size(), 1U) << line;
@@ -246,8 +256,9 @@ TEST(QVRParser, FindsTheMembersOfInterfaces) {
   const QVRParser parser = Parse(
       "BUS_INTERFACE BUS = B0\nBUS_INTERFACE BUS = B1\nIO_INTERFACE IO_IF = B0\n"
       "PARAMETER a = 1, BUS = B0:B1:B0, TYPE = NON_HDL\nPARAMETER b = 1, bus = B0\n"
-      "PARAMETER c = 1, BUS = b0, BUS = :B1\nPARAMETER a = 2, BUS = B1\nPARAMETER d = 1, IO_IF = "
-      "B0\n"
+      "PARAMETER c = 1, BUS = b0, BUS = :B1, BUS = B1\nPARAMETER a = 2, BUS = B1\nPARAMETER d = 1, "
+      "IO_IF = "
+      "B0, TYPE = NON_HDL\n"
       "PORT p = 1, BUS = B2, IO_IF = B0\nPORT q = 1, BUS = \"B0 \"\nPORT r = 1, BUS = B0");
   EXPECT_EQ(Join(parser.ListBusInterfaceParameters("B0")), "a");
   EXPECT_EQ(Join(parser.ListBusInterfacePorts("B0")), "r");
@@ -273,7 +284,7 @@ TEST(QVRParser, SetsPropertiesOfOneKindAlone) {
   };
   const std::string value = " NAME=a VALUE=1 DEFAULT_VALUE=1";
   const std::string a = "Parameter a" + value, generic = "Generic a" + value;
-  const std::string n = "Parameter n NAME=n VALUE=2 DEFAULT_VALUE=2 TYPE=",
+  const std::string n = "Parameter n NAME=n VALUE= DEFAULT_VALUE= VALUE= TYPE=",
                     typed = "NON_HDL" + kFree;
   const auto parameters = &QVRParser::SetParameterProperty;
   const auto generics = &QVRParser::SetGenericProperty;
@@ -290,6 +301,13 @@ TEST(QVRParser, SetsPropertiesOfOneKindAlone) {
        "",
        {generic + kTyped},
        {"Generic a NAME=a VALUE= DEFAULT_VALUE=1" + kTyped}},
+      {parameters,
+       "n",
+       "VALUE",
+       "5",
+       {n + typed},
+       {"Parameter n NAME=n VALUE=5 DEFAULT_VALUE= VALUE=5 TYPE=" + typed}},
+      {parameters, "a", "value", "1", {a + kTyped}, {a + " value=1" + kTyped}},
       {parameters, "a", "NEW", "1", {a + kTyped}, {a + " NEW=1" + kTyped}},
       {parameters, "a", "TYPE", "NON_HDL", {a + kTyped}, {a + " TYPE=NON_HDL" + kFree}},
       {parameters, "n", "TYPE", "HDL", {n + typed}, {n + "HDL" + kFree}},
@@ -302,7 +320,8 @@ TEST(QVRParser, SetsPropertiesOfOneKindAlone) {
       {generics, "a", "BUS", "B0", {generic + kTyped}, {generic + " BUS=B0" + kTyped}}};
   for (const Row& row : rows) {
     QVRParser parser = Parse(
-        "OPTION a = 1\nBUS_INTERFACE BUS = B0\nPARAMETER a = 1\nPARAMETER n = 2, TYPE = NON_HDL\n"
+        "OPTION a = 1\nBUS_INTERFACE BUS = B0\nPARAMETER a = 1\nPARAMETER n = '', VALUE = 3, TYPE "
+        "= NON_HDL\n"
         "PARAMETER a = 3\nPORT p = 1, BUS = B0");
     const std::set<std::string> before = Dump(parser);
     (parser.*row.set)(row.name, row.property, row.value);

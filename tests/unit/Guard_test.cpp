@@ -27,7 +27,8 @@ TEST(Guard, TurnsWhateverIsThrownIntoAMessage) {
   StringBase output = "100%s";  // the argument lies in the output
   EXPECT_FALSE(Fail(output, output, ForUnknown::SaySo, std::runtime_error("why %d\n")));
   EXPECT_EQ(output, "");
-  EXPECT_FALSE(Fail(output, "a", ForUnknown::SaySo, 1));
+  output = "a";
+  EXPECT_FALSE(Fail(output, output, ForUnknown::SaySo, 1));
   EXPECT_FALSE(Fail(output, "b", ForUnknown::CutOff, 2));
   EXPECT_FALSE(Fail(output, "c", ForUnknown::EmptyText, 3));
   EXPECT_THAT(recorder.Take(),
