@@ -45,11 +45,11 @@ class TARVO_EXPORT LDXParser {
   // Failure if the file is missing, can't be read or has a bad line, or if the cores include each
   // other in a circle or nest deeper than 1,000 levels. What is wrong with a line was then issued
   // as a message, with the line itself last. May throw std::bad_alloc.
-  LDXParser(const Kel_Index& index, const Kel_Key& key, const Kel_Key& rootKey,
-            const StringBase& hdl);
+  LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,
+            const StringBase& language);
   // The same for a file of any name, taken for that of the version.
-  LDXParser(const Port::FileName& ldxFile, const Kel_Index& index, const Kel_Key& key,
-            const Kel_Key& rootKey, const StringBase& hdl);
+  LDXParser(const Port::FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
+            const Kel_Key& root, const StringBase& language);
   ~LDXParser();
   LDXParser(const LDXParser&) = delete;
   LDXParser& operator=(const LDXParser&) = delete;
@@ -112,8 +112,9 @@ class TARVO_EXPORT LDXParser {
     std::unordered_map<StringBase, std::size_t> owners;     // the same positions, by file key
   };
 
-  TARVO_LOCAL LDXParser(const Port::FileName& ldxFile, const Kel_Index& index, const Kel_Key& key,
-                        const Kel_Key& rootKey, const StringBase& hdl, const LDXParser* enclosing);
+  TARVO_LOCAL LDXParser(const Port::FileName& ldxFile, const Kel_Index& theIndex,
+                        const Kel_Key& version, const Kel_Key& root, StringBase language,
+                        const LDXParser* outer);
 
   TARVO_LOCAL void CheckNesting() const;
   TARVO_LOCAL void Parse(const Port::FileName& ldxFile);

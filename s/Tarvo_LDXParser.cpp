@@ -37,15 +37,6 @@ const char* const kBetweenLibraryAndFile = " ";
 
 constexpr unsigned kDeepestLevel = 1000;
 
-// Reads a field and steps behind it. False if there is none, or it is not closed.
-bool ReadValue(TokenReader& tokens, StringBase& field) {
-  const TokenReader::Value value = tokens.ReadValue();
-  if (!value.whole) return false;
-  field = StringBase(value.text);
-  tokens.Step();
-  return true;
-}
-
 // The analyse-order file of a version, which must be there.
 FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   FileName file =
@@ -158,21 +149,21 @@ StringList LDXParser::Side::ListSources() const {
   return paths;
 }
 
-LDXParser::LDXParser(const Kel_Index& wholeIndex, const Kel_Key& ownKey, const Kel_Key& root,
+LDXParser::LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,
                      const StringBase& language)
-    : LDXParser(GetLdxFile(wholeIndex, ownKey), wholeIndex, ownKey, root, language) {}
+    : LDXParser(GetLdxFile(theIndex, version), theIndex, version, root, language) {}
 
-LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& wholeIndex, const Kel_Key& ownKey,
+LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
                      const Kel_Key& root, const StringBase& language)
-    : LDXParser(ldxFile, wholeIndex, ownKey, root, language, nullptr) {}
+    : LDXParser(ldxFile, theIndex, version, root, language, nullptr) {}
 
-LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& wholeIndex, const Kel_Key& ownKey,
-                     const Kel_Key& root, const StringBase& language, const LDXParser* outer)
-    : index(wholeIndex),
-      key(ownKey),
-      core(Resolve(wholeIndex, ownKey)),
-      rootKey(root.IsValid() ? root : ownKey),
-      hdl(language),
+LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
+                     const Kel_Key& root, StringBase language, const LDXParser* outer)
+    : index(theIndex),
+      key(version),
+      core(Resolve(theIndex, version)),
+      rootKey(root.IsValid() ? root : version),
+      hdl(std::move(language)),
       enclosing(outer),
       level(outer ? outer->level + 1 : 1),
       synthesis("synthesis"),
@@ -220,10 +211,12 @@ void LDXParser::Parse(const FileName& ldxFile) {
 
 bool LDXParser::ParseLibraryEntry(const StringBase& line) {
   TokenReader tokens(line.View(), kDelimiters, TokenReader::WithGroups);
-  StringBase keyword, library, file;
-  if (!ReadValue(tokens, keyword)) return false;
+  StringBase keyword;
+  StringBase library;
+  StringBase file;
+  if (!tokens.ReadField(keyword)) return false;
   if (keyword != kBoth && keyword != kSynthesisOnly && keyword != kSimulationOnly) return false;
-  if (!ReadValue(tokens, library) || !ReadValue(tokens, file)) return false;
+  if (!tokens.ReadField(library) || !tokens.ReadField(file)) return false;
   if (Matches(file, kWholeLibrary)) return !tokens.MoreTokens() && AnalyseLibrary(library);
   // A language that is not closed is judged by what there is of it.
   const TokenReader::Value language = tokens.ReadValue();
@@ -235,10 +228,12 @@ bool LDXParser::ParseLibraryEntry(const StringBase& line) {
 // A keyword in other letter case, and a line that goes on behind the directory, are ignored.
 bool LDXParser::ParsePathEntry(const StringBase& line) {
   TokenReader tokens(line.View(), kDelimiters, TokenReader::WithGroups);
-  StringBase keyword, library, directory;
-  if (!ReadValue(tokens, keyword)) return false;
+  StringBase keyword;
+  StringBase library;
+  StringBase directory;
+  if (!tokens.ReadField(keyword)) return false;
   if (keyword != kIncludeDirectory) return true;
-  if (!ReadValue(tokens, library) || !ReadValue(tokens, directory)) return false;
+  if (!tokens.ReadField(library) || !tokens.ReadField(directory)) return false;
   const Kel_Key libKey(library);
   FileName location = index.GetIPLocation(key);
   location.PushPathEnd(directory);

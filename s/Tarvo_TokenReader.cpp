@@ -36,6 +36,14 @@ TokenReader::Value TokenReader::ReadValue() {
   return {first, true};
 }
 
+bool TokenReader::ReadField(StringBase& text) {
+  const Value value = ReadValue();
+  if (!value.whole) return false;
+  text = StringBase(value.text);
+  Step();
+  return true;
+}
+
 // From the opening quote to the token equal to it.
 TokenReader::Value TokenReader::ReadQuoted() {
   const std::string_view quote = GetToken();

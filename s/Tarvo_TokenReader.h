@@ -51,6 +51,10 @@ class TokenReader {
   // Passes over blanks and reads a value. The current token is then the value's last one.
   Value ReadValue();
 
+  // Reads a value that must be whole and steps behind it. False, with the text unchanged, if there
+  // is none or it is not closed.
+  bool ReadField(StringBase& text);
+
  private:
   // A token in place. The tokenizer assigns it as it would a string.
   struct Token {

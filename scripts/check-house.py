@@ -28,7 +28,7 @@ RANKS = [
     (5, r"(include|s)/Tarvo_Kel_Index\..*"),
     (6, r"(include|s)/Tarvo_QVRParser\..*"),
     (7, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
-    (8, r"(include|s)/Tarvo_KelIP\..*"),
+    (8, r"(include|s)/Tarvo_KelIP(_Catalogues)?\..*"),
     (9, r"(include|s)/Tarvo_KelLibrary\..*"),
     (10, r"(tools|tests|bench|examples|fuzz)/.*"),
 ]
@@ -48,7 +48,7 @@ def rank_of(path):
     """The rank and the module of a file, or None for one that the table does not know."""
     for rank, pattern in RANKS:
         if re.fullmatch(pattern, path):
-            stem = pathlib.Path(path).stem.removesuffix("_Hdl")  # a second source of its parser
+            stem = re.sub("_(Hdl|Catalogues)$", "", pathlib.Path(path).stem)  # second sources
             module = path.split("/")[0] if rank in (0, 10) else stem
             return rank, module
     return None

@@ -1,0 +1,83 @@
+#ifndef TARVO_TEWPARSER_H
+#define TARVO_TEWPARSER_H
+
+#include <vector>
+
+#include "Port_FileName.h"
+#include "Tarvo_Export.h"
+#include "Tarvo_Kel_Key.h"
+
+namespace Tarvo {
+
+class Kel_Index;
+class QVRParser;
+
+// The netlists of a core: a table that says which of them apply at which values of the core's
+// parameters. It is read once; each query selects the rows whose values equal, as texts, those that
+// the parameters have at that moment.
+//
+//     const Tarvo::QVRParser description(index, key);
+//     const Tarvo::TEWParser netlists(index, key, &description);
+//     for (const auto& netlist : netlists.ListFiles()) std::cout << netlist << '\n';
+//
+// A netlist may belong to another core, its library. No netlist is asked whether it exists.
+//
+// Lifetime: the index and the description must outlive the parser. Threads: like an int, together
+// with these two; nobody may set a parameter while the parser is asked.
+class TARVO_EXPORT TEWParser {
+ public:
+  // Reads the table of a version. The description may be null; then only a table without parameters
+  // can be read. Throws AppException with level NotFound for a key, or the library of a netlist,
+  // that is not in the index, and with level Failure if the file can't be read, has no usable
+  // header or a bad row. Each line that is no header was then issued as an error. May throw
+  // std::bad_alloc.
+  TEWParser(const Kel_Index& theIndex, const Kel_Key& key, const QVRParser* description);
+  // The same for a file of any name, taken for that of the version.
+  TEWParser(const Port::FileName& tewFile, const Kel_Index& theIndex, const Kel_Key& key,
+            const QVRParser* description);
+  ~TEWParser();
+  TEWParser(const TEWParser&) = delete;
+  TEWParser& operator=(const TEWParser&) = delete;
+
+  // The absolute paths of the selected netlists, in the order of the table. One that stands in
+  // several selected rows is listed for each.
+  StringList ListFiles() const;
+
+  // The absolute directories of the libraries of the selected netlists, in the order of their
+  // bytes, each once. Throws AppException with level NotFound for a library that has left the index
+  // since.
+  StringList ListLibraries() const;
+
+  // The library of a selected netlist, whose absolute path must be that of ListFiles. Throws
+  // AppException with level Failure for any other file, and as ListLibraries does.
+  Kel_Key GetFileLibrary(const Port::FileName& file) const;
+
+ private:
+  struct Netlist {
+    Kel_Key library;
+    Port::FileName location;
+  };
+  struct Row {
+    StringList values;
+    std::vector<Netlist> netlists;
+  };
+
+  // What became of a line. One that states nothing has no value at its start.
+  enum Result { Read, StatesNothing, Unparsable };
+
+  TARVO_LOCAL void Parse(const Port::FileName& tewFile, const Kel_Key& key);
+  TARVO_LOCAL Result ParseHeader(const StringBase& line, const StringList& parameterNames);
+  TARVO_LOCAL Result ParseFileEntry(const StringBase& line, const Kel_Key& key);
+  TARVO_LOCAL Netlist MakeNetlist(const StringBase& file, const Kel_Key& key) const;
+  TARVO_LOCAL StringList GetParameterValues() const;
+  TARVO_LOCAL std::vector<const Netlist*> Select() const;
+
+  const Kel_Index& index;
+  const QVRParser* qvrParser;
+  StringList headerNames;
+  std::vector<Row> rows;
+};
+
+}  // namespace Tarvo
+
+#endif
