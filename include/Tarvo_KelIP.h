@@ -11,7 +11,7 @@ class Kel_Index;
 class KelIPImpl;
 
 // One version of one IP core, opened: answers for its options, parameters, generics, ports, bus and
-// I/O interfaces.
+// I/O interfaces, HDL sources and netlists.
 //
 //     const std::unique_ptr<Tarvo::KelIP> ip(library.CreateIP("pulse_counter"));
 //     Tarvo::StringList ports;
@@ -23,10 +23,11 @@ class KelIPImpl;
 //
 // Results: true with the output replaced by the answer, which may be empty; false with an empty
 // output, and a message that says why. Get operations on a record's property and
-// SetParameterProperty issue a warning, all others an error. An argument may be the output itself
-// or lie in it.
+// SetParameterProperty issue a warning, all others an error; what arrives without a text of its own
+// is always an error. Where there may be false without a
+// message, it is said so. An argument may be the output itself or lie in it.
 //
-// Failures: the constructor and the four operations below it throw; all others throw nothing. A
+// Failures: the constructor and the operations that say so throw; all others throw nothing. A
 // text that is given as `const char*` becomes a string at the call, which may throw std::bad_alloc
 // there.
 //
@@ -35,13 +36,17 @@ class KelIPImpl;
 // operations; separate instances of one library may not work at the same time as a refresh of it.
 class TARVO_EXPORT KelIP {
  public:
+  // Properties of a core that its key gives: NAME, VERSION.
   static const StringBase KEL_IP_NAME;
   static const StringBase KEL_IP_VERSION;
+  // The option STYLE, and its values HDL (sources), BLACKBOX (netlists) and MIX (both).
   static const StringBase KEL_STYLE_OPTION_NAME;
   static const StringBase KEL_STYLE_OPTION_VALUE_HDL;
   static const StringBase KEL_STYLE_OPTION_VALUE_BLACKBOX;
   static const StringBase KEL_STYLE_OPTION_VALUE_MIX;
+  // The option HDL, which names the language of the sources (see LDXParser).
   static const StringBase KEL_LANGUAGE_OPTION_NAME;
+  // Properties of a source: LIBRARY, LANGUAGE, FILENAME_HEAD, FILENAME_TAIL; of a netlist: LIBRARY.
   static const StringBase KEL_HDL_LIBRARY_PROPERTY;
   static const StringBase KEL_HDL_LANGUAGE_PROPERTY;
   static const StringBase KEL_HDL_FILENAME_HEAD_PROPERTY;
@@ -73,8 +78,9 @@ class TARVO_EXPORT KelIP {
 
   bool GetParameterProperty(const StringBase& parameter, const StringBase& property,
                             StringBase& value) const;
-  // Changes what GetParameterProperty answers, and nothing else: the generic of that name, for one,
-  // stays as it is.
+  // Sets a property of that parameter alone, as QVRParser::SetParameterProperty does; the generic
+  // of that name stays as it is. Whatever follows from the property changes with it: the members of
+  // interfaces from BUS and IO_IF, the netlists that apply from VALUE.
   bool SetParameterProperty(const StringBase& parameter, const StringBase& property,
                             const StringBase& value);
   bool ListParameters(StringList& list) const;
@@ -104,6 +110,51 @@ class TARVO_EXPORT KelIP {
   bool ListIOInterfaceProperties(const StringBase& interface, StringList& list) const;
   bool ListIOInterfaceParameters(const StringBase& interface, StringList& list) const;
   bool ListIOInterfacePorts(const StringBase& interface, StringList& list) const;
+
+  // HDL sources, of a core whose option STYLE is HDL, as it is by default, or MIX. Any other core
+  // has none: false without a message. The analyse order is read by the first question that needs
+  // it (see LDXParser); if that fails, the next question tries again.
+  //
+  // Absolute paths of the sources in analyse order, and absolute directories of the libraries that
+  // they belong to, in the same order.
+  bool ListSynthesisSources(StringList& list) const;
+  bool ListSimulationSources(StringList& list) const;
+  bool ListSynthesisLibraries(StringList& list) const;
+  bool ListSimulationLibraries(StringList& list) const;
+  // The libraries that are given a Verilog include directory, as keys or bare names, and the
+  // absolute directory of one: that one, or else the library's own directory.
+  bool ListVerilogIncludeLibraries(StringList& list) const;
+  bool GetVerilogIncludeLocation(const StringBase& library, StringBase& value) const;
+  // LIBRARY is the key of the library that a listed source belongs to. LANGUAGE ("Verilog" or
+  // "VHDL", by the extension), FILENAME_HEAD and FILENAME_TAIL follow from the path alone, listed
+  // or not. False without a message if there is no such value or property. The list has all four
+  // names for a source that belongs to a library, and is false without a message for any other.
+  bool GetSourceProperty(const StringBase& source, const StringBase& property,
+                         StringBase& value) const;
+  bool ListSourceProperties(const StringBase& source, StringList& list) const;
+
+  // Netlists, of a core whose option STYLE is BLACKBOX or MIX. Any other core has none: false
+  // without a message. The table is read by the first question that needs it (see TEWParser), and
+  // each answer holds for the parameters' values of that moment.
+  //
+  // Absolute paths of the netlists that apply, and absolute directories of their libraries, sorted.
+  bool ListNetlists(StringList& list) const;
+  bool ListNetlistLibraries(StringList& list) const;
+  // LIBRARY is the key of the library that a netlist belongs to; an error for a netlist that does
+  // not apply. False without a message for any other property.
+  bool GetNetlistProperty(const StringBase& netlist, const StringBase& property,
+                          StringBase& value) const;
+  bool ListNetlistProperties(const StringBase& netlist, StringList& list) const;
+
+  // Replace the list by the names of all properties that have a meaning for a kind of element, the
+  // same for every core. Always true; may throw std::bad_alloc.
+  bool ListAllParameterProperties(StringList& list) const;
+  bool ListAllGenericProperties(StringList& list) const;
+  bool ListAllPortProperties(StringList& list) const;
+  bool ListAllBusInterfaceProperties(StringList& list) const;
+  bool ListAllIOInterfaceProperties(StringList& list) const;
+  bool ListAllSourceProperties(StringList& list) const;
+  bool ListAllNetlistProperties(StringList& list) const;
 
  private:
   std::unique_ptr<KelIPImpl> impl;

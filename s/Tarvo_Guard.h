@@ -37,7 +37,8 @@ enum class Severity {
 inline Port_Message::Severity SeverityFor(const std::exception& exception, Severity severity) {
   if (severity == Severity::Warning) return Port_Message::Warning;
   const auto* const own = dynamic_cast<const AppException*>(&exception);
-  const bool fatal = severity == Severity::ErrorOrFatal && own && own->level == AppException::Fatal;
+  const bool fatal =
+      severity == Severity::ErrorOrFatal && own != nullptr && own->level == AppException::Fatal;
   return fatal ? Port_Message::Fatal : Port_Message::Error;
 }
 
@@ -116,15 +117,15 @@ inline void Clear(NoOutput /*none*/) noexcept {}
 inline void Clear(StringBase& text) noexcept { text.Empty(); }
 inline void Clear(StringList& list) noexcept { list.clear(); }
 
-// Does the work, which sets the output as its last step. If it throws, issues the failure and
-// clears the output. True when the work came to its end, or what it returned if it returns a bool.
-// The output is cleared behind the message, not before the work: an argument may lie within it, as
-// in `library.ListIPProperties(list[0], list)`.
+// Does the work, which sets the output as its last step. If it throws, issues the failure. True
+// when the work came to its end, or what it returned if it returns a bool; else the output is
+// cleared. The output is cleared behind the message, not before the work: an argument may lie
+// within it, as in `library.ListIPProperties(list[0], list)`.
 template <class Output, class FailureType, class Work>
 bool Guard(Output&& output, const FailureType& failure, const Work& work) noexcept {
   try {
     if constexpr (std::is_same_v<decltype(work()), bool>) {
-      return work();
+      if (work()) return true;
     } else {
       work();
       return true;

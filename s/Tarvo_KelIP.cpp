@@ -1,11 +1,16 @@
 #include "Tarvo_KelIP.h"
 
+#include <algorithm>
+
 #include "Port_FileName.h"
 #include "Tarvo_Guard.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
+#include "Tarvo_LDXParser.h"
 #include "Tarvo_QVRParser.h"
 #include "Tarvo_Report.h"
+#include "Tarvo_TEWParser.h"
+#include "Tarvo_Word.h"
 
 namespace Tarvo {
 
@@ -26,36 +31,101 @@ namespace {
 
 constexpr Report::Module kModule{"s/Tarvo_KelIP", "1.0"};
 
+// Replaces the list by a parser's answer. False without a parser.
+template <class Parser>
+bool Answer(StringList& list, const Parser* parser, StringList (Parser::*question)() const) {
+  if (parser) list = (parser->*question)();
+  return parser != nullptr;
+}
+
+// Empty for a source that is not listed, if that is needed, and for an unknown property.
+StringBase SourceProperty(const LDXParser& order, const StringBase& source,
+                          const StringBase& property) {
+  const Port::FileName file(Port::FileName(source).GetAbsolutePath());
+  if (property == KelIP::KEL_HDL_LIBRARY_PROPERTY) return order.GetFileLibrary(file).GetKey();
+  if (property == KelIP::KEL_HDL_LANGUAGE_PROPERTY) return order.GetFileLanguage(file);
+  if (property == KelIP::KEL_HDL_FILENAME_HEAD_PROPERTY) return file.GetHead();
+  if (property == KelIP::KEL_HDL_FILENAME_TAIL_PROPERTY) return file.GetTail();
+  return {};
+}
+
 }  // namespace
 
 // What an instance holds. Name and version come from the index, not from the text that a caller
 // gave.
 class KelIPImpl {
  public:
-  KelIPImpl(const Kel_Index& wholeIndex, const StringBase& text)
-      : location(wholeIndex.GetIPLocation(Kel_Key(text))), key(wholeIndex.GetIPKey(Kel_Key(text))) {
-    TARVO_TRACE("Constructing IP instance %s v%s from path %s\n", key.GetName(), key.GetVersion(),
-                location.GetAbsolutePath());
-    qvrParser = std::make_unique<QVRParser>(wholeIndex, key);
-    TARVO_TRACE("Finished constructing IP instance %s v%s\n", key.GetName(), key.GetVersion());
-  }
+  KelIPImpl(const Kel_Index& theIndex, const StringBase& text);
 
-  StringBase GetProperty(const StringBase& name) const {
-    if (name == KelIP::KEL_IP_NAME) return key.GetName();
-    if (name == KelIP::KEL_IP_VERSION) return key.GetVersion();
-    return qvrParser->GetOptionValue(name);
-  }
+  StringBase GetProperty(const StringBase& name) const;
+  StringList ListProperties() const;
 
-  StringList ListProperties() const {
-    StringList names = qvrParser->ListOptions();
-    names.insert(names.begin(), {KelIP::KEL_IP_NAME, KelIP::KEL_IP_VERSION});
-    return names;
-  }
+  // The parsers, made when they are first asked for; null if the core's style has no such files. If
+  // making one throws, there is none, and the next call tries again.
+  const LDXParser* GetLDXParser();
+  const TEWParser* GetTEWParser();
 
+  const Kel_Index& index;
   const Port::FileName location;
   const Kel_Key key;
   std::unique_ptr<QVRParser> qvrParser;
+
+ private:
+  bool HasStyle(const StringBase& style) const;
+  StringBase GetLanguage() const;
+
+  std::unique_ptr<LDXParser> ldxParser;
+  std::unique_ptr<TEWParser> tewParser;
 };
+
+KelIPImpl::KelIPImpl(const Kel_Index& theIndex, const StringBase& text)
+    : index(theIndex),
+      location(index.GetIPLocation(Kel_Key(text))),
+      key(index.GetIPKey(Kel_Key(text))) {
+  TARVO_TRACE("Constructing IP instance %s v%s from path %s\n", key.GetName(), key.GetVersion(),
+              location.GetAbsolutePath());
+  qvrParser = std::make_unique<QVRParser>(index, key);
+  TARVO_TRACE("Finished constructing IP instance %s v%s\n", key.GetName(), key.GetVersion());
+}
+
+StringBase KelIPImpl::GetProperty(const StringBase& name) const {
+  if (name == KelIP::KEL_IP_NAME) return key.GetName();
+  if (name == KelIP::KEL_IP_VERSION) return key.GetVersion();
+  return qvrParser->GetOptionValue(name);
+}
+
+StringList KelIPImpl::ListProperties() const {
+  StringList names = qvrParser->ListOptions();
+  names.insert(names.begin(), {KelIP::KEL_IP_NAME, KelIP::KEL_IP_VERSION});
+  return names;
+}
+
+// Whether the style is this one, or the one that has everything.
+bool KelIPImpl::HasStyle(const StringBase& style) const {
+  const StringBase value = qvrParser->GetOptionValue(KelIP::KEL_STYLE_OPTION_NAME);
+  return Matches(value, style) || Matches(value, KelIP::KEL_STYLE_OPTION_VALUE_MIX);
+}
+
+// Asked for only if it is stated, in this very letter case: a description has no default for it.
+StringBase KelIPImpl::GetLanguage() const {
+  const StringList options = qvrParser->ListOptions();
+  const auto stated = std::find(options.begin(), options.end(), KelIP::KEL_LANGUAGE_OPTION_NAME);
+  return stated == options.end() ? LDXParser::LDX_HDL_VHDL : qvrParser->GetOptionValue(*stated);
+}
+
+const LDXParser* KelIPImpl::GetLDXParser() {
+  if (!ldxParser && HasStyle(KelIP::KEL_STYLE_OPTION_VALUE_HDL)) {
+    ldxParser = std::make_unique<LDXParser>(index, key, Kel_Key(), GetLanguage());
+  }
+  return ldxParser.get();
+}
+
+const TEWParser* KelIPImpl::GetTEWParser() {
+  if (!tewParser && HasStyle(KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX)) {
+    tewParser = std::make_unique<TEWParser>(index, key, qvrParser.get());
+  }
+  return tewParser.get();
+}
 
 KelIP::KelIP(const Kel_Index& index, const StringBase& key)
     : impl(std::make_unique<KelIPImpl>(index, key)) {}
@@ -231,6 +301,120 @@ bool KelIP::ListIOInterfacePorts(const StringBase& interface, StringList& list) 
                Failure(kModule, "Unable to list I/O interface %s ports for IP %s\n%s\n", interface,
                        impl->key.GetKey()),
                [&] { list = impl->qvrParser->ListIoInterfacePorts(interface); });
+}
+
+bool KelIP::ListSynthesisSources(StringList& list) const {
+  return Guard(
+      list,
+      Failure(kModule, "Unable to list synthesis analyse order for IP %s\n%s\n",
+              impl->key.GetKey()),
+      [&] { return Answer(list, impl->GetLDXParser(), &LDXParser::ListSynthesisAnalyseOrder); });
+}
+
+bool KelIP::ListSimulationSources(StringList& list) const {
+  return Guard(
+      list,
+      Failure(kModule, "Unable to list simulation analyse order for IP %s\n%s\n",
+              impl->key.GetKey()),
+      [&] { return Answer(list, impl->GetLDXParser(), &LDXParser::ListSimulationAnalyseOrder); });
+}
+
+bool KelIP::ListSynthesisLibraries(StringList& list) const {
+  return Guard(
+      list,
+      Failure(kModule, "Unable to list synthesis libraries for IP %s\n%s\n", impl->key.GetKey()),
+      [&] { return Answer(list, impl->GetLDXParser(), &LDXParser::ListSynthesisLibraries); });
+}
+
+bool KelIP::ListSimulationLibraries(StringList& list) const {
+  return Guard(
+      list,
+      Failure(kModule, "Unable to list simulation libraries for IP %s\n%s\n", impl->key.GetKey()),
+      [&] { return Answer(list, impl->GetLDXParser(), &LDXParser::ListSimulationLibraries); });
+}
+
+bool KelIP::ListVerilogIncludeLibraries(StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list Verilog include libraries for IP %s\n%s\n",
+                       impl->key.GetKey()),
+               [&] {
+                 return Answer(list, impl->GetLDXParser(),
+                               &LDXParser::ListVerilogIncludeLibraryKeys);
+               });
+}
+
+bool KelIP::GetVerilogIncludeLocation(const StringBase& library, StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to locate Verilog include library %s for IP %s\n%s\n",
+                       library, impl->key.GetKey()),
+               [&] {
+                 const LDXParser* const order = impl->GetLDXParser();
+                 if (order) value = order->GetVerilogIncludeLocation(library);
+                 return order != nullptr;
+               });
+}
+
+bool KelIP::GetSourceProperty(const StringBase& source, const StringBase& property,
+                              StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to get property %s for source %s in IP %s\n%s\n", property,
+                       source, impl->key.GetKey()),
+               [&] {
+                 const LDXParser* const order = impl->GetLDXParser();
+                 if (order) value = SourceProperty(*order, source, property);
+                 return order != nullptr && value.GetLength() > 0;
+               });
+}
+
+bool KelIP::ListSourceProperties(const StringBase& source, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list source %s properties for IP %s\n%s\n", source,
+                       impl->key.GetKey()),
+               [&] {
+                 StringBase library;
+                 if (!impl->GetLDXParser()) return false;
+                 if (!GetSourceProperty(source, KEL_HDL_LIBRARY_PROPERTY, library)) return false;
+                 return ListAllSourceProperties(list);
+               });
+}
+
+bool KelIP::ListNetlists(StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list netlists for IP %s\n%s\n", impl->key.GetKey()),
+               [&] { return Answer(list, impl->GetTEWParser(), &TEWParser::ListFiles); });
+}
+
+bool KelIP::ListNetlistLibraries(StringList& list) const {
+  return Guard(
+      list,
+      Failure(kModule, "Unable to list netlist libraries for IP %s\n%s\n", impl->key.GetKey()),
+      [&] { return Answer(list, impl->GetTEWParser(), &TEWParser::ListLibraries); });
+}
+
+bool KelIP::GetNetlistProperty(const StringBase& netlist, const StringBase& property,
+                               StringBase& value) const {
+  return Guard(value,
+               Failure(kModule, "Unable to get netlist %s property %s for IP %s\n%s\n", netlist,
+                       property, impl->key.GetKey()),
+               [&] {
+                 const TEWParser* const table = impl->GetTEWParser();
+                 if (!table || property != KEL_NETLIST_LIBRARY_PROPERTY) return false;
+                 value = table->GetFileLibrary(Port::FileName(netlist)).GetKey();
+                 return true;
+               });
+}
+
+bool KelIP::ListNetlistProperties(const StringBase& netlist, StringList& list) const {
+  return Guard(list,
+               Failure(kModule, "Unable to list netlist %s properties for IP %s\n%s\n", netlist,
+                       impl->key.GetKey()),
+               [&] {
+                 StringBase library;
+                 if (!impl->GetTEWParser()) return false;
+                 if (!GetNetlistProperty(netlist, KEL_NETLIST_LIBRARY_PROPERTY, library))
+                   return false;
+                 return ListAllNetlistProperties(list);
+               });
 }
 
 }  // namespace Tarvo
