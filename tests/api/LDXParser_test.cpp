@@ -7,11 +7,10 @@
 #include <string>
 #include <vector>
 
+#include "IndexedRepository.h"
 #include "MessageRecorder.h"
 #include "OrdinaryUser.h"
-#include "RepositoryBuilder.h"
 #include "Tarvo_AppException.h"
-#include "Tarvo_Kel_Index.h"
 #include "Tarvo_LDXParser.h"
 
 namespace {
@@ -23,28 +22,21 @@ using testing::IsEmpty;
 
 const std::string kLdx = "s/Tarvo_LDXParser: ";
 
-class AnalyseOrder : public testing::Test {
+class AnalyseOrder : public testing::Test, protected IndexedRepository {
  protected:
   RepositoryBuilder::CoreBuilder Core(const std::string& key, const std::string& ldx) {
     auto core = repo.Core(key);
-    Port::FileName location;
-    location.SetHead(core.Ldx(ldx).Location().c_str());
-    index.AddIP(Kel_Key(StringBase(key.c_str())), location);
+    core.Ldx(ldx);
+    Add(key);
     return core;
   }
   LDXParser Parse(const std::string& key, const char* hdl = "VHDL") {
     return LDXParser(index, Kel_Key(StringBase(key.c_str())), Kel_Key(), hdl);
   }
-  // Paths below `ipmods`, the level `hdl` left out.
+  // The same with the levels `hdl` left out.
   std::string Shorten(const StringList& paths) const {
-    std::string text;
-    for (const StringBase& path : paths) {
-      std::string rest = path.GetText();
-      rest.erase(0, (repo / "ipmods/").size());
-      const std::size_t hdl = rest.find("/hdl/");
-      if (hdl != std::string::npos) rest.erase(hdl, 4);
-      text += (text.empty() ? "" : " ") + rest;
-    }
+    std::string text = IndexedRepository::Shorten(paths);
+    for (std::size_t hdl; (hdl = text.find("/hdl/")) != std::string::npos;) text.erase(hdl, 4);
     return text;
   }
   // Both lists, once if they are equal, or what is thrown.
@@ -72,9 +64,7 @@ class AnalyseOrder : public testing::Test {
     return "error " + kLdx + "Unable to analyse library " + library + "\n" + why + "\n";
   }
 
-  RepositoryBuilder repo;
   MessageRecorder recorder;
-  Kel_Index index;
 };
 
 TEST_F(AnalyseOrder, TakesLinesByTheirForm) {
@@ -206,14 +196,9 @@ TEST_F(AnalyseOrder, MergesByLibrary) {
        "b/b c/c | c/m c/c b/b"},
       {{{"top", "lib b all"}, {"b", ""}}, ""}};
   for (const auto& row : rows) {
-    RepositoryBuilder shape;
-    Kel_Index cores;
-    for (const auto& [name, ldx] : row.cores) {
-      Port::FileName location;
-      location.SetHead(shape.Core(name + "_v1_00_a").Ldx(ldx).Location().c_str());
-      cores.AddIP(Kel_Key(StringBase((name + "_v1_00_a").c_str())), location);
-    }
-    const LDXParser order(cores, Kel_Key("top_v1_00_a"), Kel_Key(), "VHDL");
+    index.ClearIP();
+    for (const auto& [name, ldx] : row.cores) Core(name + "_v1_00_a", ldx);
+    const LDXParser order = Parse("top_v1_00_a");
     std::string text;
     const auto add = [&](const StringList& paths) {
       for (const StringBase& path : paths) {
@@ -234,16 +219,10 @@ TEST_F(AnalyseOrder, MergesByLibrary) {
 
 TEST_F(AnalyseOrder, FindsTheLanguageOfIncludedCores) {
   const auto include = [&](const std::string& description, const char* hdl) {
-    auto core = Core("sub_v1_00_a", "");
-    if (!description.empty()) core.Qvr(description);
-    core.Ldx("lib sub_v1_00_a a");
-    Core("top_v1_00_a", "lib sub all");
     index.ClearIP();
-    for (const char* key : {"sub_v1_00_a", "top_v1_00_a"}) {
-      Port::FileName location;
-      location.SetHead(repo.Core(key).Location().c_str());
-      index.AddIP(Kel_Key(key), location);
-    }
+    if (!description.empty()) repo.Core("sub_v1_00_a").Qvr(description);
+    Core("sub_v1_00_a", "lib sub_v1_00_a a");
+    Core("top_v1_00_a", "lib sub all");
     return Read("top_v1_00_a", hdl);
   };
   EXPECT_EQ(include("", "Verilog"), "sub_v1_00_a/verilog/a.v");
