@@ -13,4 +13,6 @@ show() {
 }
 show -L examples/repository list
 show -L examples/overlay -L examples/repository which word_fifo pulse_counter_v1_00_a pulse_counter
-show -L examples/repository show word_fifo
+show -L examples/repository show word_fifo --section ports
+show -L examples/repository sources event_station --for simulation
+show -L examples/repository netlists crc_unit --set WIDTH=16

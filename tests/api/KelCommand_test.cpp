@@ -133,6 +133,45 @@ TEST(KelShow, WritesJsonOfAnyBytes) {
           "\"ADVANCED_USER\"}}]}");
 }
 
+// The paths that a call writes, those of one repository shortened.
+std::string Paths(const std::string& arguments, int status = 0) {
+  const CommandResult result = Kel("-L repository " + arguments);
+  EXPECT_EQ(result.status, status) << arguments;
+  std::string paths = result.output + result.errors;
+  const std::string root = kExamples + "/repository/ipmods/";
+  for (std::size_t at; (at = paths.find(root)) != std::string::npos;) paths.erase(at, root.size());
+  return paths;
+}
+
+TEST(KelSources, ListsThemInOrder) {
+  const std::string own = "tone_gen_v1_00_a/hdl/";
+  EXPECT_EQ(Paths("sources tone_gen --for synthesis"),
+            own + "verilog/phase_acc.v\n" + own + "vhdl/tone_gen.vhd\n");
+  EXPECT_EQ(
+      Paths("sources --for simulation tone_gen"),
+      own + "vhdl/phase_acc.vhd\n" + own + "vhdl/tone_gen.vhd\n" + own + "vhdl/tone_gen_tb.vhd\n");
+  EXPECT_EQ(Paths("sources crc_unit --for synthesis"),
+            "kel: note: crc_unit_v1_00_a has no sources, its STYLE is 'BLACKBOX'\n");
+  Paths("sources tone_gen", 2);
+  Paths("sources tone_gen --for layout", 2);
+  Paths("sources nope --for synthesis", 1);
+}
+
+TEST(KelNetlists, ListsThoseThatApply) {
+  const std::string own = "crc_unit_v1_00_a/netlist/crc_unit_w";
+  EXPECT_EQ(Paths("netlists crc_unit"), own + "8_small.edif\n");
+  EXPECT_EQ(Paths("netlists crc_unit --set WIDTH=16 --set MODE=FAST"), own + "16_fast.edif\n");
+  EXPECT_EQ(Paths("netlists crc_unit --set MODE==x"), "");
+  EXPECT_EQ(Paths("netlists word_fifo"),
+            "kel: note: word_fifo_v1_00_a has no netlists, its STYLE is 'HDL'\n");
+  EXPECT_EQ(
+      Paths("netlists crc_unit --set mode=FAST", 1),
+      "kel: warning: Unable to set IP crc_unit_v1_00_a parameter mode property VALUE to FAST\n"
+      "  Cannot find Parameter mode\n");
+  Paths("netlists crc_unit --set MODE", 2);
+  Paths("netlists crc_unit --set =FAST", 2);
+}
+
 TEST(Kel, ShowsHelpAndVersion) {
   EXPECT_EQ(Kel("--help").status, 0);
   EXPECT_NE(Kel("which --help").output.find("KEY"), std::string::npos);

@@ -22,4 +22,12 @@ Status List(const Tarvo::KelLibrary& library, bool allVersions);
 Status Show(const Tarvo::KelLibrary& library, const std::string& key,
             const std::vector<std::string>& sections, bool asJson);
 
+// The sources of a core, a path on each line, in the order in which they are to be analysed.
+Status Sources(const Tarvo::KelLibrary& library, const std::string& key, bool forSimulation);
+
+// The netlists of a core that apply, a path on each line, with parameters set as each NAME=VALUE
+// says.
+Status Netlists(const Tarvo::KelLibrary& library, const std::string& key,
+                const std::vector<std::string>& settings);
+
 #endif

@@ -23,6 +23,8 @@ struct Call {
   std::vector<std::string> libraries;
   std::vector<std::string> keys;
   std::vector<std::string> sections;
+  std::string purpose;
+  std::vector<std::string> settings;
   bool allVersions = false;
   bool asJson = false;
   std::function<Status(const Tarvo::KelLibrary&)> verb;
@@ -31,17 +33,33 @@ struct Call {
 const char* const kKeyHelp =
     "A key such as abc_v1_00_a, or a core's bare name for its newest version";
 
-void DescribeVerbs(CLI::App& app, Call& call) {
+void DescribeList(CLI::App& app, Call& call) {
   CLI::App* const list = app.add_subcommand(
       "list", "Lists the newest version of each core: key, style, language, location, description");
   list->add_flag("--all", call.allVersions, "List every version");
   list->callback([&call] {
     call.verb = [&call](const auto& library) { return List(library, call.allVersions); };
   });
+}
 
+void DescribeWhich(CLI::App& app, Call& call) {
+  CLI::App* const which =
+      app.add_subcommand("which", "Tells key, name, version and location of each core");
+  which->add_option("KEY", call.keys, kKeyHelp)->required();
+  which->callback(
+      [&call] { call.verb = [&call](const auto& library) { return Which(library, call.keys); }; });
+}
+
+// A verb that asks one core.
+CLI::App* AddCoreVerb(CLI::App& app, Call& call, const char* name, const char* help) {
+  CLI::App* const verb = app.add_subcommand(name, help);
+  verb->add_option("KEY", call.keys, kKeyHelp)->required()->expected(1);
+  return verb;
+}
+
+void DescribeShow(CLI::App& app, Call& call) {
   CLI::App* const show =
-      app.add_subcommand("show", "Shows a core: options, parameters, ports and interfaces");
-  show->add_option("KEY", call.keys, kKeyHelp)->required()->expected(1);
+      AddCoreVerb(app, call, "show", "Shows a core: options, parameters, ports and interfaces");
   show->add_option("--section", call.sections, "One of these alone; may be repeated")
       ->check(CLI::IsMember(kSections))
       ->allow_extra_args(false);
@@ -51,12 +69,39 @@ void DescribeVerbs(CLI::App& app, Call& call) {
       return Show(library, call.keys.front(), call.sections, call.asJson);
     };
   });
+}
 
-  CLI::App* const which =
-      app.add_subcommand("which", "Tells key, name, version and location of each core");
-  which->add_option("KEY", call.keys, kKeyHelp)->required();
-  which->callback(
-      [&call] { call.verb = [&call](const auto& library) { return Which(library, call.keys); }; });
+void DescribeSources(CLI::App& app, Call& call) {
+  CLI::App* const sources =
+      AddCoreVerb(app, call, "sources", "Lists the HDL sources of a core in analyse order");
+  sources->add_option("--for", call.purpose, "What the sources are analysed for")
+      ->check(CLI::IsMember({"synthesis", "simulation"}))
+      ->required();
+  sources->callback([&call] {
+    call.verb = [&call](const auto& library) {
+      return Sources(library, call.keys.front(), call.purpose == "simulation");
+    };
+  });
+}
+
+std::string CheckSetting(const std::string& setting) {
+  const std::size_t equals = setting.find('=');
+  const bool good = equals != std::string::npos && equals > 0;
+  return good ? std::string() : "'" + setting + "' is not NAME=VALUE";
+}
+
+void DescribeNetlists(CLI::App& app, Call& call) {
+  CLI::App* const netlists =
+      AddCoreVerb(app, call, "netlists", "Lists the netlists of a core that apply");
+  netlists->add_option("--set", call.settings, "Sets a parameter first; may be repeated")
+      ->type_name("NAME=VALUE")
+      ->check(CheckSetting)
+      ->allow_extra_args(false);
+  netlists->callback([&call] {
+    call.verb = [&call](const auto& library) {
+      return Netlists(library, call.keys.front(), call.settings);
+    };
+  });
 }
 
 const char* const kFooter =
@@ -76,14 +121,17 @@ void DescribeCall(CLI::App& app, Call& call) {
   app.fallthrough();
   app.allow_extras();
   app.footer(kFooter);
-  DescribeVerbs(app, call);
+  for (const auto describe :
+       {DescribeList, DescribeWhich, DescribeShow, DescribeSources, DescribeNetlists}) {
+    describe(app, call);
+  }
 }
 
 // What is wrong with a call that parsed, or an empty text.
 std::string Fault(const CLI::App& app, const Call& call) {
   const std::vector<std::string> extras = app.remaining(true);
   if (!extras.empty()) return "'" + extras.front() + "' is not expected here";
-  if (!call.verb) return "A subcommand is required: list, show or which";
+  if (!call.verb) return "A subcommand is required: list, which, show, sources or netlists";
   if (call.libraries.empty()) return "--library is required";
   const bool empty = std::any_of(
       call.libraries.begin(), call.libraries.end(),
