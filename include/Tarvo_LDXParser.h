@@ -20,17 +20,43 @@ class Kel_Index;
 //     const Tarvo::LDXParser order(index, key, Tarvo::Kel_Key(), "VHDL");
 //     for (const auto& source : order.ListSynthesisAnalyseOrder()) std::cout << source << '\n';
 //
-// A library is a core version, and the sources of a library lie below its directory. Libraries
-// stand in the order in which each got its first source, and the sources of a library stand
-// together, in the order in which they were added. Each source stands once: its first place counts.
-// An entry that takes over the list of another core puts what that core adds at its own place.
-// Synthesis and simulation are independent of each other. No file is asked whether it exists.
+// The file has an entry on a line; `#` begins a comment, and quotes make one field of several
+// words. LIBRARY is the key of a core version, or a bare name for the newest one.
+//
+//     lib LIBRARY FILE [LANGUAGE]        a source, for both lists; synlib and simlib for one of
+//     them lib LIBRARY all                    all sources that the library's own file lists
+//     vlgincdir LIBRARY DIRECTORY        the Verilog include directory of a library, below this
+//     core
+//
+// A source lies in `hdl/vhdl` or `hdl/verilog` below its library's directory. Which of them, its
+// extension tells (`vhd`, `v`); a name without an extension gets that of its language. A source
+// without a LANGUAGE has that of the core whose file is read:
+//
+//     VHDL, Verilog    the core's
+//     MIXED            VHDL
+//     BOTH             by its extension; a LANGUAGE is an error, and the source is left out
+//     anything else    by its extension; a LANGUAGE is taken
+//
+// Languages are compared in any letter case. An entry with an unknown LANGUAGE is left out with an
+// error, a source that is listed already with a warning, or with a trace if an `all` brings it; the
+// order is good all the same.
+//
+// Libraries stand in the order in which each got its first source, and the sources of a library
+// stand together, in the order in which they were added. What an `all` adds stands at its place.
+// Each source stands once, its first place counts: sources are told apart by their library and the
+// text of their name below the language's directory. Synthesis and simulation are independent of
+// each other. No file is asked whether it exists.
 //
 // Everything is read by the constructor, the files of included cores too; a core that is reached
 // twice is read twice. The queries look at no file.
 //
-// Lifetime: the index must outlive the parser, and not change while it is made. Threads: like an
-// int, together with the index; several may ask one parser.
+// Failures: reading and asking may throw std::bad_alloc; so that it can be read, a line must be
+// shorter than 4 GiB. A path throws std::filesystem::filesystem_error if the repository was given
+// relative to a current directory that is gone.
+//
+// Lifetime: the index must outlive the parser. It must not change while the parser is made; later
+// only the lists of libraries and GetVerilogIncludeLocation ask it. Threads: for one at a time,
+// together with the index. Stack: an included core takes about 1.5 KiB while it is read.
 class TARVO_EXPORT LDXParser {
  public:
   static const StringBase LDX_HDL_VERILOG;
@@ -39,15 +65,17 @@ class TARVO_EXPORT LDXParser {
   static const StringBase LDX_HDL_MIXED;
 
   // Reads the analyse order of a version. The root is the version for which a whole analysis is
-  // made; an invalid key stands for this one. The language is the value of the core's option HDL.
+  // made, and which nothing below may include; callers pass an invalid key, which stands for the
+  // version itself. The language is the value of the core's option HDL.
   //
   // Throws AppException with level NotFound for a key that is not in the index, and with level
-  // Failure if the file is missing, can't be read or has a bad line, or if the cores include each
-  // other in a circle or nest deeper than 1,000 levels. What is wrong with a line was then issued
-  // as a message, with the line itself last. May throw std::bad_alloc.
+  // Failure for the key of the root, if the file is missing, can't be read or has a bad line, or if
+  // cores include each other in a circle or nest deeper than 1,000 levels. What is wrong with a
+  // line was then issued as a message, with the line itself last.
   LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,
             const StringBase& language);
-  // The same for a file of any name, taken for that of the version.
+  // The same for a file of any name, taken for that of the version, which the index needs to know
+  // only for a `vlgincdir`.
   LDXParser(const Port::FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
             const Kel_Key& root, const StringBase& language);
   ~LDXParser();
@@ -59,7 +87,8 @@ class TARVO_EXPORT LDXParser {
   StringBase GetFileLanguage(const Port::FileName& file) const;
 
   // The library of a listed source, found by the levels of its path from the version's directory
-  // on. An invalid, empty key for any other file.
+  // on, which must bear the key's normal text. An invalid, empty key for any other file, and for a
+  // source in a directory of its own that is named `vhdl` or `verilog`.
   Kel_Key GetFileLibrary(const Port::FileName& file) const;
 
   // The absolute path of a library's Verilog include directory: the one that an entry gives it, or

@@ -1,6 +1,8 @@
 #include "Tarvo_LDXParser.h"
 
 #include <algorithm>
+#include <memory>
+#include <string_view>
 #include <utility>
 
 #include "Tarvo_Existence.h"
@@ -37,6 +39,12 @@ const char* const kBetweenLibraryAndFile = " ";
 
 constexpr unsigned kDeepestLevel = 1000;
 
+// The key, which must not be that of the root of its own analysis.
+const Kel_Key& CheckRoot(const Kel_Key& key, const Kel_Key& root) {
+  if (!root.IsValid() || key != root) return key;
+  throw Report::Exception(AppException::Failure, "Circular LDX definition for %s\n", root.GetKey());
+}
+
 // The analyse-order file of a version, which must be there.
 FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   FileName file =
@@ -45,24 +53,42 @@ FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   throw Report::Exception(AppException::Failure, "Invalid LDX %s\n", file.GetName());
 }
 
-// What a location says of a source: version directory, blank, name below the language's directory.
-// The relative path alone if it has no such directory; that is nobody's file key.
-StringBase GetFileKey(FileName location) {
-  StringBase name = location.GetTail();
-  StringBase level = location.PopPathEnd();
-  for (; level.GetLength() > 0; level = location.PopPathEnd()) {
-    if (level == Kel_Index::KEL_VHDL_SUBDIRECTORY || level == Kel_Index::KEL_VERILOG_SUBDIRECTORY) {
-      location.PopPathEnd();
-      StringBase fileKey = location.PopPathEnd();
-      fileKey.Append(kBetweenLibraryAndFile);
-      fileKey.Append(name);
-      return fileKey;
+// Takes the last level off a path; empty if there is none.
+std::string_view PopLevel(std::string_view& path) {
+  while (!path.empty() && path.back() == '/') path.remove_suffix(1);
+  const std::size_t slash = path.rfind('/');
+  const std::size_t start = slash == std::string_view::npos ? 0 : slash + 1;
+  const std::string_view level = path.substr(start);
+  path = path.substr(0, start);
+  return level;
+}
+
+// What a location says of a source: version directory, blank, name below the language's directory,
+// which is the nearest one of such a name. The relative path alone if there is none.
+StringBase GetFileKey(const FileName& location) {
+  const StringBase directory = location.GetPath();
+  std::string_view rest = directory.View();
+  std::vector<std::string_view> levels;
+  std::string_view level = PopLevel(rest);
+  for (; !level.empty(); level = PopLevel(rest)) {
+    if (level == Kel_Index::KEL_VHDL_SUBDIRECTORY.View() ||
+        level == Kel_Index::KEL_VERILOG_SUBDIRECTORY.View()) {
+      break;
     }
-    level.Append("/");
-    level.Append(name);
-    name = level;
+    levels.push_back(level);
   }
-  return name;
+  StringBase fileKey;
+  if (!level.empty()) {
+    PopLevel(rest);
+    fileKey = StringBase(PopLevel(rest));
+    fileKey.Append(kBetweenLibraryAndFile);
+  }
+  for (auto name = levels.rbegin(); name != levels.rend(); ++name) {
+    fileKey.Append(name->data(), static_cast<unsigned>(name->size()));
+    fileKey.Append("/");
+  }
+  fileKey.Append(location.GetTail());
+  return fileKey;
 }
 
 // The key as the index stores it, or as it is if the index does not know it.
@@ -114,7 +140,7 @@ StringBase GetEntryKey(const Kel_Key& library, const StringBase& file,
                        const StringBase& missingExtension) {
   StringBase fileKey = library.GetKey();
   fileKey.Append(kBetweenLibraryAndFile);
-  fileKey.Append(file);
+  fileKey.Append(file.GetText());  // up to a NUL byte, where its name on disk ends too
   if (missingExtension.GetLength() > 0) {
     fileKey.Append(".");
     fileKey.Append(missingExtension);
@@ -151,7 +177,8 @@ StringList LDXParser::Side::ListSources() const {
 
 LDXParser::LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,
                      const StringBase& language)
-    : LDXParser(GetLdxFile(theIndex, version), theIndex, version, root, language) {}
+    : LDXParser(GetLdxFile(theIndex, CheckRoot(version, root)), theIndex, version, root, language) {
+}
 
 LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
                      const Kel_Key& root, const StringBase& language)
@@ -160,7 +187,7 @@ LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const K
 LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
                      const Kel_Key& root, StringBase language, const LDXParser* outer)
     : index(theIndex),
-      key(version),
+      key(CheckRoot(version, root)),
       core(Resolve(theIndex, version)),
       rootKey(root.IsValid() ? root : version),
       hdl(std::move(language)),
@@ -168,10 +195,6 @@ LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const K
       level(outer ? outer->level + 1 : 1),
       synthesis("synthesis"),
       simulation("simulation") {
-  if (root.IsValid() && key == root) {
-    throw Report::Exception(AppException::Failure, "Circular LDX definition for %s\n",
-                            root.GetKey());
-  }
   CheckNesting();
   Parse(ldxFile);
 }
@@ -287,10 +310,12 @@ bool LDXParser::AnalyseLibrary(const StringBase& library) {
   return Guard(NoOutput(), Failure(kModule, "Unable to analyse library %s\n%s\n", library), [&] {
     const Kel_Key libKey(library);
     const StringBase language = LanguageOf(libKey);
-    LDXParser nested(GetLdxFile(index, libKey), index, libKey, rootKey, language, this);
-    MergeSide(synthesis, nested.synthesis, nested);
-    MergeSide(simulation, nested.simulation, nested);
-    MergeIncludeDirectories(nested);
+    // Not on the stack, of which each level of a deep chain needs some.
+    const std::unique_ptr<LDXParser> nested(
+        new LDXParser(GetLdxFile(index, libKey), index, libKey, rootKey, language, this));
+    MergeSide(synthesis, nested->synthesis, *nested);
+    MergeSide(simulation, nested->simulation, *nested);
+    MergeIncludeDirectories(*nested);
   });
 }
 

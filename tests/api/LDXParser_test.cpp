@@ -153,6 +153,38 @@ TEST_F(AnalyseOrder, ReportsFileEntries) {
   }
 }
 
+// What an included core is called, and looked up by, is the text of the entry.
+TEST_F(AnalyseOrder, NamesIncludedCoresAsTheirEntriesDo) {
+  Core("a_v1_00_a", "lib a_v1_00_a s//a.vhd");
+  Core("b_v1_00_a", "lib a s/a.vhd\nlib a all");
+  EXPECT_EQ(Read("b"), "a_v1_00_a/vhdl/s/a.vhd");
+  EXPECT_THAT(recorder.Take(), IsEmpty());
+  Core("e_v1_00_a", "lib e e.vhd\nlib e e.vhd");
+  Core("f_v1_00_a", "lib e all");
+  EXPECT_EQ(Read("f"), "e_v1_00_a/vhdl/e.vhd");
+  EXPECT_THAT(recorder.Take(), testing::Each(testing::HasSubstr("LDXParser: e - File e_v1_00_a:")));
+  repo.Core("g_v1_00_a").Qvr("OPTION HDL = Verilog");
+  Core("g_v1_00_a", "");
+  Core("g_v2_00_a", "lib g a");
+  Core("h_v1_00_a", "lib g all");
+  EXPECT_EQ(Read("h"), "g_v2_00_a/verilog/a.v");
+  Core("a_v1_00_a", "lib none all x");
+  EXPECT_EQ(Read("a"), Invalid("a_v1_00_a"));
+  EXPECT_EQ(recorder.Take().size(), 1U);
+  Core("a_v1_00_a", "vlgincdir b data x\nvlgincdir a .\nvlgincdir a data x");
+  EXPECT_THAT(Parse("a").ListVerilogIncludeLibraryKeys(), ElementsAre("a"));
+}
+
+// Each byte of a long path is looked at once.
+TEST_F(AnalyseOrder, TakesPathsOfAnyLength) {
+  std::string path;
+  for (int i = 0; i < 200000; ++i) path += "d/";
+  Core("a_v1_00_a", "lib a " + path + "a.vhd\nlib a " + path + "b.vhd");
+  const LDXParser order = Parse("a");
+  const Port::FileName last(order.ListSynthesisAnalyseOrder().back());
+  EXPECT_EQ(order.GetFileLibrary(last).GetKey(), "a_v1_00_a");
+}
+
 TEST_F(AnalyseOrder, WarnsOfDuplicatesAndKeepsTheFirst) {
   Core("xyz_v1_00_a", "");
   Core("abc_v1_00_a",
@@ -315,6 +347,32 @@ TEST_F(AnalyseOrder, EndsEveryCircle) {
     EXPECT_EQ(messages.size(), row.messages);
     EXPECT_THAT(messages.front(),
                 testing::HasSubstr("\nCircular LDX definition for " + row.closedAt + "\n"));
+  }
+}
+
+// The root is told by the text of its key alone; all else is left to the levels between.
+TEST_F(AnalyseOrder, KnowsItsRoot) {
+  const auto read = [&](const char* key, const char* root) {
+    const LDXParser order(index, Kel_Key(key), Kel_Key(root), "VHDL");
+    return Shorten(order.ListSynthesisAnalyseOrder());
+  };
+  Core("a_v1_00_a", "lib a a.vhd");
+  Core("b_v1_00_a", "lib a all");
+  EXPECT_EQ(read("a", "a_v1_00_a"), "a_v1_00_a/vhdl/a.vhd");
+  EXPECT_EQ(read("b", "a_v1_00_a"), "a_v1_00_a/vhdl/a.vhd");
+  const LDXParser other(Port::FileName(File("b_v1_00_a").c_str()), index, Kel_Key("none"),
+                        Kel_Key(), "VHDL");
+  EXPECT_EQ(Shorten(other.ListSynthesisAnalyseOrder()), "a_v1_00_a/vhdl/a.vhd");
+  for (const char* key : {"a_v1_00_a", "unknown_v1_00_a"}) {
+    fs::remove(File("a_v1_00_a"));
+    try {
+      read(key, key);
+      FAIL();
+    } catch (const AppException& exception) {
+      EXPECT_EQ(exception.level, AppException::Failure);
+      EXPECT_STREQ(exception.what(),
+                   (std::string("Circular LDX definition for ") + key + "\n").c_str());
+    }
   }
 }
 
