@@ -65,12 +65,12 @@ constexpr Report::Module kModule{"s/Tarvo_QVRParser", "1.0"};
 
 bool IsVector(const PropertyList& port) {
   const StringBase* const range = FindValue(port, Q::QVR_PORT_VEC);
-  return range && range->GetLength() > 0;
+  return range != nullptr && range->GetLength() > 0;
 }
 
 bool IsInterrupt(const PropertyList& port) {
   const StringBase* const signal = FindValue(port, Q::QVR_PORT_SIGIS);
-  return signal && Matches(*signal, Q::QVR_PORT_SIGIS_INTERRUPT);
+  return signal != nullptr && Matches(*signal, Q::QVR_PORT_SIGIS_INTERRUPT);
 }
 
 const DefaultRow kParameterDefaults[] = {{&Q::QVR_ASSIGNMENT, &Q::QVR_ASSIGNMENT_OPTIONAL},

@@ -83,7 +83,7 @@ Json Parameters(const KelIP& ip) {
     parameters.push_back({{"name", Text(name)},
                           {"value", Value(properties, QVRParser::QVR_PROPERTY_VALUE)},
                           {"default_value", Value(properties, QVRParser::QVR_PROPERTY_DEFAULT)},
-                          {"generic", isGeneric.count(name) > 0},
+                          {"generic", isGeneric.contains(name)},
                           {"properties", properties}});
   });
   return parameters;
