@@ -83,8 +83,9 @@ StringBase GetFileKey(const FileName& location) {
     fileKey = StringBase(PopLevel(rest));
     fileKey.Append(kBetweenLibraryAndFile);
   }
-  for (auto name = levels.rbegin(); name != levels.rend(); ++name) {
-    fileKey.Append(name->data(), static_cast<unsigned>(name->size()));
+  std::reverse(levels.begin(), levels.end());
+  for (const std::string_view name : levels) {
+    fileKey.Append(name.data(), static_cast<unsigned>(name.size()));
     fileKey.Append("/");
   }
   fileKey.Append(location.GetTail());
