@@ -2,16 +2,21 @@
 
 #include <algorithm>
 #include <cstddef>
+#include <filesystem>
 #include <set>
 #include <string_view>
 
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_QVRParser.h"
 #include "Text.h"
+#include "Verbs.h"
 
 namespace {
 
+namespace fs = std::filesystem;
+using Tarvo::Kel_Key;
 using Tarvo::KelIP;
+using Tarvo::KelLibrary;
 using Tarvo::QVRParser;
 using Tarvo::StringBase;
 using Tarvo::StringList;
@@ -147,22 +152,60 @@ Json Interfaces(const KelIP& ip) {
   return interfaces;
 }
 
+// The directories of a version in the repositories of a call, in their order.
+std::vector<std::string> Directories(const Call& call, const Kel_Key& key) {
+  std::vector<std::string> directories;
+  for (const std::string& repository : Repositories(call)) {
+    std::error_code error;
+    const fs::path versions = fs::absolute(repository) / "ipmods";
+    for (fs::directory_iterator entry(versions, error), end; !error && entry != end;
+         entry.increment(error)) {
+      const Kel_Key other(StringBase(entry->path().filename().c_str()));
+      if (other == key && entry->is_directory(error)) directories.push_back(entry->path());
+    }
+  }
+  return directories;
+}
+
+Json Place(const KelLibrary& library, const Call& call, const KelIP& ip) {
+  const Kel_Key key(ip.GetKey());
+  const std::string location = Text(ip.GetLocation());
+  Json hidden = Json::array();
+  for (const std::string& directory : Directories(call, key)) {
+    if (directory != location) hidden.push_back(directory);
+  }
+  Json others = Json::array();
+  StringList keys;
+  library.ListAllIPKeys(keys);
+  for (const StringBase& text : keys) {
+    const Kel_Key other(text);
+    if (other.GetName() == key.GetName() && other != key) others.push_back(Text(text));
+  }
+  return {{"name", Text(ip.GetName())},
+          {"version", Text(ip.GetVersion())},
+          {"location", location},
+          {"repository", fs::path(location).parent_path().parent_path().string()},
+          {"hides", hidden},
+          {"other_versions", others}};
+}
+
 using Section = Json (*)(const KelIP&);
 const Section kSectionMakers[] = {Options, Parameters, Ports, Interfaces};
 
 }  // namespace
 
-const std::vector<std::string> kSections = {"options", "parameters", "ports", "interfaces"};
+const std::vector<std::string> kSections = {"place", "options", "parameters", "ports",
+                                            "interfaces"};
 
-Json Describe(const KelIP& ip, const std::vector<std::string>& sections) {
-  Json core = {{"key", Text(ip.GetKey())},
-               {"name", Text(ip.GetName())},
-               {"version", Text(ip.GetVersion())},
-               {"location", Text(ip.GetLocation())}};
-  for (std::size_t i = 0; i < kSections.size(); ++i) {
-    if (std::count(sections.begin(), sections.end(), kSections[i])) {
-      core[kSections[i]] = kSectionMakers[i](ip);
-    }
+Json Describe(const KelLibrary& library, const Call& call, const KelIP& ip,
+              const std::vector<std::string>& sections) {
+  const auto wanted = [&](const std::string& section) {
+    return std::find(sections.begin(), sections.end(), section) != sections.end();
+  };
+  Json core = {{"key", Text(ip.GetKey())}};
+  if (wanted(kSections.front())) core[kSections.front()] = Place(library, call, ip);
+  for (std::size_t i = 1; i < kSections.size(); ++i) {
+    if (wanted(kSections[i])) core[kSections[i]] = kSectionMakers[i - 1](ip);
   }
   return core;
 }

@@ -1,7 +1,8 @@
 #include <algorithm>
 
+#include "Json.h"
+#include "Messages.h"
 #include "Table.h"
-#include "Tarvo_Kel_Key.h"
 #include "Text.h"
 #include "Verbs.h"
 
@@ -26,10 +27,14 @@ bool ComesBefore(const KelLibrary& library, const Kel_Key& left, const Kel_Key& 
   return left != right && left.GetKey() == library.GetLatestIPKey(left.GetName());
 }
 
-std::vector<Kel_Key> AllVersions(const KelLibrary& library) {
+std::vector<Kel_Key> Versions(const KelLibrary& library, const std::vector<std::string>& globs) {
   StringList texts;
   library.ListAllIPKeys(texts);
-  std::vector<Kel_Key> keys(texts.begin(), texts.end());
+  std::vector<Kel_Key> keys;
+  for (const StringBase& text : texts) {
+    const Kel_Key key(text);
+    if (MatchesAny(key, globs)) keys.push_back(key);
+  }
   std::stable_sort(keys.begin(), keys.end(), [&](const Kel_Key& left, const Kel_Key& right) {
     return ComesBefore(library, left, right);
   });
@@ -38,17 +43,34 @@ std::vector<Kel_Key> AllVersions(const KelLibrary& library) {
 
 }  // namespace
 
-Status List(const KelLibrary& library, bool allVersions) {
+Status List(const KelLibrary& library, const Call& call) {
   Table table;
+  Json cores = Json::array();
   StringBase core;
-  for (const Kel_Key& key : AllVersions(library)) {
-    const bool newest = table.IsEmpty() || key.GetName() != core;
+  for (const Kel_Key& key : Versions(library, call.keys)) {
+    const bool newest = cores.empty() || key.GetName() != core;
     core = key.GetName();
-    if (!newest && !allVersions) continue;
+    if (!newest && !call.allVersions) continue;
     const StringBase& text = key.GetKey();
-    table.Add({Text(text), Option(library, text, "STYLE"), Option(library, text, "HDL"),
-               Text(library.GetLocation(text)), Option(library, text, "DESC")});
+    const std::string location = Text(library.GetLocation(text));
+    const std::string style = Option(library, text, "STYLE");
+    const std::string language = Option(library, text, "HDL");
+    const std::string description = Option(library, text, "DESC");
+    table.Add({Text(text), style, language, location, description});
+    cores.push_back({{"key", Text(text)},
+                     {"name", Text(key.GetName())},
+                     {"version", Text(key.GetVersion())},
+                     {"style", style},
+                     {"language", language},
+                     {"location", location},
+                     {"description", description}});
   }
-  table.Write();
-  return StatusClean;
+  if (call.asJson) {
+    WriteJson({{"cores", cores}});
+  } else {
+    table.Write();
+  }
+  if (!cores.empty() || call.keys.empty()) return StatusClean;
+  Messages::Note("no core fits '" + call.keys.front() + "'");
+  return StatusFindings;
 }

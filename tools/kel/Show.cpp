@@ -15,6 +15,7 @@ struct Columns {
   std::vector<const char*> names;
 };
 const Columns kColumns[] = {
+    {"place", {"name", "value"}},
     {"options", {"name", "value"}},
     {"parameters", {"name", "value", "default_value", "generic", "description"}},
     {"ports", {"name", "direction", "vector", "interfaces", "description"}},
@@ -38,7 +39,7 @@ Table TableOf(const Json& section, const Columns& columns) {
   Table table;
   for (const auto& [name, record] : section.items()) {
     if (section.is_object()) {
-      table.Add({name, record.get<std::string>()});
+      table.Add({name, record.is_array() ? Join(record) : record.get<std::string>()});
       continue;
     }
     Table::Row fields;
@@ -72,15 +73,14 @@ void WriteTables(const Json& core, bool withHeadings) {
 
 }  // namespace
 
-Status Show(const Tarvo::KelLibrary& library, const std::string& key,
-            const std::vector<std::string>& sections, bool asJson) {
-  const std::unique_ptr<Tarvo::KelIP> ip(library.CreateIP(key.c_str()));
+Status Show(const Tarvo::KelLibrary& library, const Call& call) {
+  const std::unique_ptr<Tarvo::KelIP> ip = OpenCore(library, call.key);
   if (!ip) return StatusFindings;
-  const Json core = Describe(*ip, sections.empty() ? kSections : sections);
-  if (asJson) {
+  const Json core = Describe(library, call, *ip, call.sections.empty() ? kSections : call.sections);
+  if (call.asJson) {
     WriteJson(core);
   } else {
-    WriteTables(core, sections.size() != 1);
+    WriteTables(core, call.sections.size() != 1);
   }
   return StatusClean;
 }

@@ -1,59 +1,61 @@
-#include <iostream>
+#include <filesystem>
 #include <memory>
 
+#include "Formats.h"
 #include "Messages.h"
-#include "Table.h"
 #include "Tarvo_KelIP.h"
 #include "Text.h"
 #include "Verbs.h"
 
 namespace {
 
+namespace fs = std::filesystem;
 using Tarvo::KelIP;
 using Tarvo::StringBase;
 using Tarvo::StringList;
 
-using Question = bool (KelIP::*)(StringList&) const;
+std::string Property(const KelIP& ip, const StringBase& source, const StringBase& name) {
+  StringBase value;
+  ip.GetSourceProperty(source, name, value);
+  return Text(value);
+}
 
-// A core whose style has no such files gives an empty list, which is worth a word. Any other
-// failure has its message.
-void WriteList(const KelIP& ip, Question question, const char* what) {
-  const int errors = Messages::ErrorCount();
-  StringList paths;
-  Table table;
-  if ((ip.*question)(paths)) {
-    for (const StringBase& path : paths) table.Add({Text(path)});
-  } else if (Messages::ErrorCount() == errors) {
-    StringBase style;
-    ip.GetIPProperty(KelIP::KEL_STYLE_OPTION_NAME, style);
-    std::cerr << "kel: note: " << ip.GetKey() << " has no " << what << ", its "
-              << KelIP::KEL_STYLE_OPTION_NAME << " is '" << style << "'\n";
+// Paths are compared as texts; links are not followed.
+std::string Relative(const StringBase& path, const std::string& directory) {
+  if (directory.empty()) return Text(path);
+  const fs::path base = fs::absolute(directory).lexically_normal();
+  return fs::path(Text(path)).lexically_normal().lexically_relative(base);
+}
+
+std::vector<IncludeDirectory> IncludeDirectories(const KelIP& ip, const std::string& relativeTo) {
+  std::vector<IncludeDirectory> directories;
+  StringList libraries;
+  ip.ListVerilogIncludeLibraries(libraries);
+  for (const StringBase& library : libraries) {
+    StringBase directory;
+    ip.GetVerilogIncludeLocation(library, directory);
+    directories.push_back({Relative(directory, relativeTo), Text(directory)});
   }
-  table.Write();
+  return directories;
 }
 
 }  // namespace
 
-Status Sources(const Tarvo::KelLibrary& library, const std::string& key, bool forSimulation) {
-  const std::unique_ptr<KelIP> ip(library.CreateIP(key.c_str()));
+Status Sources(const Tarvo::KelLibrary& library, const Call& call) {
+  const std::unique_ptr<KelIP> ip = OpenCore(library, call.key);
   if (!ip) return StatusFindings;
-  WriteList(*ip, forSimulation ? &KelIP::ListSimulationSources : &KelIP::ListSynthesisSources,
-            "sources");
-  return StatusClean;
-}
-
-// Netlists for other values than those that were asked for would be a wrong answer, so there are
-// none if a parameter is unknown.
-Status Netlists(const Tarvo::KelLibrary& library, const std::string& key,
-                const std::vector<std::string>& settings) {
-  const std::unique_ptr<KelIP> ip(library.CreateIP(key.c_str()));
-  if (!ip) return StatusFindings;
-  for (const std::string& setting : settings) {
-    const std::size_t equals = setting.find('=');
-    const std::string name = setting.substr(0, equals);
-    const std::string value = setting.substr(equals + 1);
-    if (!ip->SetParameterProperty(name.c_str(), "VALUE", value.c_str())) return StatusFindings;
+  const auto question =
+      call.purpose == "simulation" ? &KelIP::ListSimulationSources : &KelIP::ListSynthesisSources;
+  SourceList list = {Text(ip->GetKey()), call.purpose, {}, {}};
+  StringList paths;
+  if (!AskForFiles(*ip, question, "sources", paths)) return StatusFindings;
+  for (const StringBase& path : paths) {
+    list.sources.push_back({Relative(path, call.relativeTo),
+                            Property(*ip, path, KelIP::KEL_HDL_LIBRARY_PROPERTY),
+                            Property(*ip, path, KelIP::KEL_HDL_LANGUAGE_PROPERTY)});
   }
-  WriteList(*ip, &KelIP::ListNetlists, "netlists");
+  if (!paths.empty()) list.includeDirectories = IncludeDirectories(*ip, call.relativeTo);
+  const std::string format = call.asJson ? "json" : call.format.empty() ? "list" : call.format;
+  WriteSources(list, format);
   return StatusClean;
 }

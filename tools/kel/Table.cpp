@@ -5,26 +5,9 @@
 #include <algorithm>
 #include <cstddef>
 #include <iostream>
-#include <string_view>
 #include <utility>
 
-namespace {
-
-std::string Printable(std::string_view field) {
-  constexpr std::string_view digits = "0123456789abcdef";
-  std::string text;
-  for (const char c : field) {
-    const auto byte = static_cast<unsigned char>(c);
-    if (byte >= ' ' && byte != 0x7F) {
-      text += c;
-    } else {
-      text += {'\\', 'x', digits[byte / 16], digits[byte % 16]};
-    }
-  }
-  return text;
-}
-
-}  // namespace
+#include "Text.h"
 
 void Table::Add(const Row& fields) {
   Row row;

@@ -1,33 +1,56 @@
 #ifndef KEL_VERBS_H
 #define KEL_VERBS_H
 
+#include <memory>
 #include <string>
 #include <vector>
 
+#include "Call.h"
 #include "Status.h"
+#include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary.h"
+#include "Tarvo_Kel_Key.h"
 
-// What the command does, one function for each verb. Each writes its answer to standard output and
-// leaves what the library does not know to the messages.
+// What the command does, one function for each verb. Each writes its answer to standard output, as
+// a document if the call asks for JSON, and leaves what the library does not know to the messages.
 
-// A line for each key or bare name: the key it resolves to, name, version and location.
-Status Which(const Tarvo::KelLibrary& library, const std::vector<std::string>& keys);
+// The newest version of each core, or each version, whose description could be read: key, style,
+// language, location and description.
+Status List(const Tarvo::KelLibrary& library, const Call& call);
 
-// A line for the newest version of each core, or for each version, whose description could be read:
-// key, style, language, location and description.
-Status List(const Tarvo::KelLibrary& library, bool allVersions);
+// For each key or bare name: the key it stands for, name, version and location.
+Status Which(const Tarvo::KelLibrary& library, const Call& call);
 
-// What a core is: its options, parameters, ports and interfaces, or some of these sections, as
-// tables or as a JSON document.
-Status Show(const Tarvo::KelLibrary& library, const std::string& key,
-            const std::vector<std::string>& sections, bool asJson);
+// What a core is: its place, options, parameters, ports and interfaces.
+Status Show(const Tarvo::KelLibrary& library, const Call& call);
 
-// The sources of a core, a path on each line, in the order in which they are to be analysed.
-Status Sources(const Tarvo::KelLibrary& library, const std::string& key, bool forSimulation);
+// The sources of a core, in the order in which they are to be analysed.
+Status Sources(const Tarvo::KelLibrary& library, const Call& call);
 
-// The netlists of a core that apply, a path on each line, with parameters set as each NAME=VALUE
-// says.
-Status Netlists(const Tarvo::KelLibrary& library, const std::string& key,
-                const std::vector<std::string>& settings);
+// The netlists of a core that apply to the values that the call sets.
+Status Netlists(const Tarvo::KelLibrary& library, const Call& call);
+
+// What is wrong with the cores, found by opening all that belongs to them. Takes the messages of
+// the library over; those that came before are given.
+Status Check(Tarvo::KelLibrary& library, const Call& call);
+
+// What the verbs share.
+
+// Whether the key or its base name fits one of the patterns; true for none.
+bool MatchesAny(const Tarvo::Kel_Key& key, const std::vector<std::string>& globs);
+
+// Opens a core, or suggests other keys.
+std::unique_ptr<Tarvo::KelIP> OpenCore(const Tarvo::KelLibrary& library, const std::string& key);
+
+// Asks for the paths of a core's sources or netlists. A core whose style has none gives an empty
+// list and a note that says so. False for a failure.
+bool AskForFiles(const Tarvo::KelIP& ip, bool (Tarvo::KelIP::*question)(Tarvo::StringList&) const,
+                 const char* what, Tarvo::StringList& paths);
+
+// The repositories of a call, in their order.
+std::vector<std::string> Repositories(const Call& call);
+
+// Joins the repositories as the library takes them.
+Tarvo::StringBase RepositoryPath(const Call& call);
 
 #endif

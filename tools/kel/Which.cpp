@@ -1,5 +1,6 @@
+#include "Json.h"
+#include "Nearby.h"
 #include "Table.h"
-#include "Tarvo_Kel_Key.h"
 #include "Text.h"
 #include "Verbs.h"
 
@@ -12,21 +13,34 @@ StringBase Resolve(const Tarvo::KelLibrary& library, const StringBase& text) {
   return key.IsValid() ? key.GetKey() : library.GetLatestIPKey(text);
 }
 
-// The location is asked for first: one message for an unknown key is enough.
-bool Add(Table& table, const Tarvo::KelLibrary& library, const StringBase& text) {
-  const StringBase location = library.GetLocation(text);
-  if (location.GetLength() == 0) return false;
-  table.Add({Text(Resolve(library, text)), Text(library.GetName(text)),
-             Text(library.GetVersion(text)), Text(location)});
-  return true;
-}
-
 }  // namespace
 
-Status Which(const Tarvo::KelLibrary& library, const std::vector<std::string>& keys) {
+// The location is asked for first: one message for an unknown key is enough.
+Status Which(const Tarvo::KelLibrary& library, const Call& call) {
   Table table;
-  bool allFound = true;
-  for (const std::string& key : keys) allFound = Add(table, library, key.c_str()) && allFound;
-  table.Write();
-  return allFound ? StatusClean : StatusFindings;
+  Json cores = Json::array();
+  for (const std::string& asked : call.keys) {
+    const StringBase text = asked.c_str();
+    const std::string location = Text(library.GetLocation(text));
+    if (location.empty()) {
+      SuggestKeys(library, asked);
+      continue;
+    }
+    const std::string key = Text(Resolve(library, text));
+    const std::string name = Text(library.GetName(text));
+    const std::string version = Text(library.GetVersion(text));
+    table.Add({key, name, version, location});
+    cores.push_back({{"asked", asked},
+                     {"key", key},
+                     {"name", name},
+                     {"version", version},
+                     {"location", location}});
+  }
+  const bool foundAll = cores.size() == call.keys.size();
+  if (call.asJson) {
+    WriteJson({{"cores", cores}});
+  } else {
+    table.Write();
+  }
+  return foundAll ? StatusClean : StatusFindings;
 }

@@ -1,0 +1,199 @@
+#include <unistd.h>
+
+#include <chrono>
+#include <filesystem>
+#include <iostream>
+#include <map>
+#include <set>
+
+#include "Findings.h"
+#include "Json.h"
+#include "NetlistTable.h"
+#include "Tarvo_AppException.h"
+#include "Tarvo_FileScanner.h"
+#include "Tarvo_Kel_Index.h"
+#include "Text.h"
+#include "Verbs.h"
+
+namespace {
+
+namespace fs = std::filesystem;
+using Tarvo::Kel_Index;
+using Tarvo::Kel_Key;
+using Tarvo::KelIP;
+using Tarvo::StringBase;
+using Tarvo::StringList;
+
+// All versions that have a directory, those without a description too.
+std::set<std::string> Keys(const Call& call) {
+  std::set<std::string> keys;
+  for (const std::string& repository : Repositories(call)) {
+    std::error_code error;
+    for (fs::directory_iterator entry(fs::path(repository) / "ipmods", error), end;
+         !error && entry != end; entry.increment(error)) {
+      const Kel_Key key(StringBase(entry->path().filename().c_str()));
+      std::error_code ignored;
+      if (key.IsValid() && entry->is_directory(ignored) && MatchesAny(key, call.keys)) {
+        keys.insert(Text(key.GetKey()));
+      }
+    }
+  }
+  return keys;
+}
+
+// A word on a terminal now and then, so that one sees that it goes on.
+class Progress {
+ public:
+  explicit Progress(std::size_t count, bool isQuiet)
+      : total(count), shown(!isQuiet && ::isatty(STDERR_FILENO) != 0) {}
+  ~Progress() {
+    if (written) std::cerr << "\r\x1B[K";
+  }
+  Progress(const Progress&) = delete;
+  Progress& operator=(const Progress&) = delete;
+
+  void Step() {
+    ++done;
+    const auto now = std::chrono::steady_clock::now();
+    if (!shown || now - last < std::chrono::milliseconds(500)) return;
+    last = now;
+    written = true;
+    std::cerr << "\rkel: checked " << done << " of " << total << " cores\x1B[K";
+  }
+
+ private:
+  std::size_t total;
+  std::size_t done = 0;
+  bool shown;
+  bool written = false;
+  std::chrono::steady_clock::time_point last = std::chrono::steady_clock::now();
+};
+
+class Checker {
+ public:
+  Checker(Tarvo::KelLibrary& openLibrary, FindingCollector& collector)
+      : library(openLibrary), findings(collector) {}
+
+  void CheckCore(const std::string& key) {
+    findings.Begin(key);
+    const std::unique_ptr<KelIP> ip(library.CreateIP(key.c_str()));
+    if (!ip) return;
+    CheckSources(*ip);
+    CheckNetlists(*ip);
+  }
+
+  // Sources that are missing, and that no core's own file was found to list.
+  void Finish() {
+    for (const auto& [path, isPlaced] : missing) {
+      if (!isPlaced)
+        findings.Add({path, 0, "error", "is listed as a source but does not exist", ""});
+    }
+  }
+
+ private:
+  void CheckSources(const KelIP& ip) {
+    const Port::FileName file = DataFile(ip, Kel_Index::KEL_LDX_EXTENSION);
+    const std::string name = Text(file.GetName());
+    findings.Begin(name);
+    StringList paths;
+    StringList others;
+    if (!ip.ListSynthesisSources(paths) || !ip.ListSimulationSources(others)) return;
+    paths.insert(paths.end(), others.begin(), others.end());
+    for (const StringBase& path : paths) {
+      std::error_code error;
+      if (fs::exists(path.GetText(), error)) continue;
+      bool& isPlaced = missing[Text(path)];
+      const unsigned line = FindSource(file, Text(path));
+      if (line == 0) continue;
+      isPlaced = true;
+      findings.Add({name, line, "error", "source does not exist: " + Text(path), ""});
+    }
+  }
+
+  // The line of the file that lists the source, or 0.
+  static unsigned FindSource(const Port::FileName& file, const std::string& path) {
+    Tarvo::FileScanner lines(file);
+    StringBase line;
+    for (unsigned number = 0; lines.GetNextLine(line, number);) {
+      const std::vector<std::string> fields = Fields(line.View());
+      if (fields.size() < 3) continue;
+      for (const char* directory : {"/hdl/vhdl/", "/hdl/verilog/"}) {
+        for (const char* extension : {"", ".vhd", ".v"}) {
+          const std::string end = directory + fields[2] + extension;
+          if (path.size() >= end.size() &&
+              path.compare(path.size() - end.size(), end.size(), end) == 0)
+            return number;
+        }
+      }
+    }
+    return 0;
+  }
+
+  void CheckNetlists(KelIP& ip) {
+    const Port::FileName file = DataFile(ip, Kel_Index::KEL_TEW_EXTENSION);
+    const std::string name = Text(file.GetName());
+    findings.Begin(name);
+    StringList paths;
+    if (!ip.ListNetlists(paths)) return;
+    for (const NetlistTable::Row& row : ReadNetlistTable(ip).rows) {
+      for (const std::string& path : row.netlists) {
+        std::error_code error;
+        if (fs::exists(path, error)) continue;
+        findings.Add({name, row.line, "error", "netlist does not exist: " + path, ""});
+      }
+    }
+  }
+
+  Tarvo::KelLibrary& library;
+  FindingCollector& findings;
+  std::map<std::string, bool> missing;  // and whether the line that lists it was found
+};
+
+std::string Plural(std::size_t count, const char* noun) {
+  return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
+}
+
+void Write(const std::vector<Finding>& findings, std::size_t cores, bool asJson) {
+  std::size_t errors = 0;
+  Json list = Json::array();
+  for (const Finding& finding : findings) {
+    if (finding.severity == "error") ++errors;
+    list.push_back({{"file", finding.file},
+                    {"line", finding.line > 0 ? Json(finding.line) : Json(nullptr)},
+                    {"severity", finding.severity},
+                    {"text", finding.text}});
+    if (asJson) continue;
+    const std::string line = finding.line > 0 ? ":" + std::to_string(finding.line) : "";
+    std::cout << Printable(finding.file) << line << ": " << finding.severity << ": "
+              << Printable(finding.text) << '\n';
+  }
+  const std::size_t warnings = findings.size() - errors;
+  if (asJson) {
+    WriteJson({{"cores", cores}, {"errors", errors}, {"warnings", warnings}, {"findings", list}});
+  } else {
+    std::cout << Plural(cores, "core") << ", " << Plural(errors, "error") << ", "
+              << Plural(warnings, "warning") << '\n';
+  }
+}
+
+}  // namespace
+
+Status Check(Tarvo::KelLibrary& library, const Call& call) {
+  const std::set<std::string> keys = Keys(call);
+  std::vector<Finding> found;
+  {
+    FindingCollector findings;
+    findings.Begin(Text(RepositoryPath(call)));
+    library.SetRepositoryPath(RepositoryPath(call));
+    Checker checker(library, findings);
+    Progress progress(keys.size(), call.quiet);
+    for (const std::string& key : keys) {
+      checker.CheckCore(key);
+      progress.Step();
+    }
+    checker.Finish();
+    found = findings.Take();
+  }
+  Write(found, keys.size(), call.asJson);
+  return found.empty() ? StatusClean : StatusFindings;
+}

@@ -1,0 +1,193 @@
+#include "CommandLine.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <iostream>
+
+#include "Describe.h"
+#include "Formats.h"
+
+namespace {
+
+const char* const kKeyHelp =
+    "A key such as abc_v1_00_a, or a core's bare name for its newest version";
+const char* const kGlobHelp = "A key or name, in which * ? [...] stand for any text";
+
+const char* const kFooter =
+    "Exit status: 0 all well, 1 something was found or a key is unknown, 2 the words of\n"
+    "the call are wrong, 3 the repository path can't be set. 'kel help VERB' shows an example.\n";
+
+// A verb, with an example of its use.
+CLI::App* AddVerb(CLI::App& app, Call& call, const char* name, const char* help,
+                  const char* example) {
+  CLI::App* const verb = app.add_subcommand(name, help);
+  verb->footer(std::string("Example: kel -L examples/repository ") + example + "\n");
+  verb->callback([&call, name] { call.verb = name; });
+  return verb;
+}
+
+void AddKey(CLI::App* verb, Call& call) { verb->add_option("KEY", call.key, kKeyHelp)->required(); }
+
+void DescribeList(CLI::App& app, Call& call) {
+  CLI::App* const list =
+      AddVerb(app, call, "list",
+              "Lists the newest version of each core: key, style, language, location, description",
+              "list 'pulse*' --all");
+  list->add_option("GLOB", call.keys, kGlobHelp)->expected(0, 1);
+  list->add_flag("--all", call.allVersions, "List every version");
+}
+
+void DescribeWhich(CLI::App& app, Call& call) {
+  CLI::App* const which =
+      AddVerb(app, call, "which", "Tells key, name, version and location of each core",
+              "which word_fifo pulse_counter_v1_00_a");
+  which->add_option("KEY", call.keys, kKeyHelp)->required();
+}
+
+void DescribeShow(CLI::App& app, Call& call) {
+  CLI::App* const show = AddVerb(
+      app, call, "show", "Shows all about a core: place, options, parameters, ports, interfaces",
+      "show event_station --section ports");
+  AddKey(show, call);
+  show->add_option("--section", call.sections, "One of these alone; may be repeated")
+      ->check(CLI::IsMember(kSections))
+      ->allow_extra_args(false);
+}
+
+void DescribeSources(CLI::App& app, Call& call) {
+  CLI::App* const sources =
+      AddVerb(app, call, "sources", "Lists the HDL sources of a core in analyse order",
+              "sources event_station --for simulation --format ghdl");
+  AddKey(sources, call);
+  sources->add_option("--for", call.purpose, "What the sources are analysed for")
+      ->check(CLI::IsMember({"synthesis", "simulation"}))
+      ->required();
+  sources->add_option("--format", call.format, "How they are written; 'list' is a path on a line")
+      ->check(CLI::IsMember(FormatNames()))
+      ->default_str("list");
+  sources->add_option("--relative-to", call.relativeTo, "Write paths relative to this directory")
+      ->type_name("DIR");
+}
+
+std::string CheckSetting(const std::string& setting) {
+  const std::size_t equals = setting.find('=');
+  const bool good = equals != std::string::npos && equals > 0;
+  return good ? std::string() : "'" + setting + "' is not NAME=VALUE";
+}
+
+void DescribeNetlists(CLI::App& app, Call& call) {
+  CLI::App* const netlists =
+      AddVerb(app, call, "netlists", "Lists the netlists of a core that apply",
+              "netlists crc_unit --set WIDTH=16 --set MODE=FAST");
+  AddKey(netlists, call);
+  netlists->add_option("--set", call.settings, "Sets a parameter first; may be repeated")
+      ->type_name("NAME=VALUE")
+      ->check(CheckSetting)
+      ->allow_extra_args(false);
+  netlists->add_flag("--table", call.wholeTable,
+                     "List all of them with their values, those that apply marked by *");
+}
+
+void DescribeCheck(CLI::App& app, Call& call) {
+  CLI::App* const check = AddVerb(
+      app, call, "check", "Opens every core and all that belongs to it, and lists what is wrong",
+      "check 'pulse*'");
+  check->add_option("GLOB", call.keys, kGlobHelp);
+}
+
+void DescribeHelp(CLI::App& app, Call& call) {
+  CLI::App* const help =
+      AddVerb(app, call, "help", "Shows this help, or that of a verb", "help list");
+  help->add_option("VERB", call.keys, "The verb")->expected(0, 1);
+}
+
+void DescribeCall(CLI::App& app, Call& call) {
+  app.name("kel");
+  app.description("Answers questions about repositories of IP cores.");
+  app.set_version_flag("--version", "kel " KEL_VERSION_TEXT);
+  app.add_option("-L,--library", call.libraries,
+                 "A repository, or several with ';' between; may be repeated, the first wins")
+      ->type_name("DIR")
+      ->allow_extra_args(false);
+  app.add_flag("--json", call.asJson, "Write a JSON document");
+  app.add_flag("--trace", call.withTraces, "Tell on standard error what is read");
+  app.add_flag("--quiet", call.quiet, "Say nothing on standard error; the exit status tells");
+  app.add_option("--color", call.color, "Whether messages are coloured")
+      ->check(CLI::IsMember({"auto", "always", "never"}))
+      ->default_str("auto");
+  app.require_subcommand(0, 1);
+  app.fallthrough();
+  app.allow_extras();
+  app.footer(kFooter);
+  for (const auto describe : {DescribeList, DescribeWhich, DescribeShow, DescribeSources,
+                              DescribeNetlists, DescribeCheck, DescribeHelp}) {
+    describe(app, call);
+  }
+}
+
+// What is wrong with a call that parsed, or an empty text.
+std::string Fault(const CLI::App& app, const Call& call) {
+  const std::vector<std::string> extras = app.remaining(true);
+  const std::string verbs = "list, which, show, sources, netlists or check";
+  if (call.verb.empty() && !extras.empty() && extras.front().front() != '-') {
+    return "there is no verb '" + extras.front() + "', but " + verbs;
+  }
+  if (!extras.empty()) return "'" + extras.front() + "' is not expected here";
+  if (call.verb.empty()) return "a verb is required: " + verbs;
+  if (call.libraries.empty()) return "-L DIR is required, the repository to ask";
+  const bool empty = std::any_of(
+      call.libraries.begin(), call.libraries.end(),
+      [](const std::string& path) { return path.find_first_not_of(';') == std::string::npos; });
+  return empty ? "-L needs the name of a directory" : "";
+}
+
+Status Refuse(const std::string& fault, const std::string& verb) {
+  const std::string help = verb.empty() ? "kel --help" : "kel help " + verb;
+  std::cerr << "kel: error: " << fault << "\nRun '" << help << "' for more information.\n";
+  return StatusUsage;
+}
+
+// The verb that the words name, also if they are wrong behind it.
+std::string VerbOf(const CLI::App& app) {
+  const std::vector<CLI::App*> verbs = app.get_subcommands();
+  return verbs.empty() ? "" : verbs.front()->get_name();
+}
+
+Status ShowHelp(const CLI::App& app, const std::vector<std::string>& verbs) {
+  const CLI::App* shown = &app;
+  if (!verbs.empty()) {
+    try {
+      shown = app.get_subcommand(verbs.front());
+    } catch (const CLI::OptionNotFound&) {
+      return Refuse("there is no verb '" + verbs.front() + "'", "");
+    }
+  }
+  std::cout << shown->help(shown == &app ? "" : "kel");
+  return StatusClean;
+}
+
+}  // namespace
+
+std::optional<Call> ReadCall(int argc, char** argv, Status& status) {
+  CLI::App app;
+  Call call;
+  DescribeCall(app, call);
+  try {
+    app.parse(argc, argv);
+  } catch (const CLI::Success& help) {
+    app.exit(help);
+    status = StatusClean;
+    return std::nullopt;
+  } catch (const CLI::ParseError& error) {
+    status = Refuse(error.what(), VerbOf(app));
+    return std::nullopt;
+  }
+  if (call.verb == "help") {
+    status = ShowHelp(app, call.keys);
+    return std::nullopt;
+  }
+  const std::string fault = Fault(app, call);
+  if (fault.empty()) return call;
+  status = Refuse(fault, call.verb);
+  return std::nullopt;
+}

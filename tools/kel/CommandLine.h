@@ -1,0 +1,13 @@
+#ifndef KEL_COMMANDLINE_H
+#define KEL_COMMANDLINE_H
+
+#include <optional>
+
+#include "Call.h"
+#include "Status.h"
+
+// Reads the words of a call. If there is nothing to run, because help was asked for or the words
+// are wrong, that was written, and `status` is what to end with.
+std::optional<Call> ReadCall(int argc, char** argv, Status& status);
+
+#endif

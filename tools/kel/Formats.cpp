@@ -1,0 +1,197 @@
+#include "Formats.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <iostream>
+#include <iterator>
+#include <string_view>
+
+#include "Table.h"
+
+namespace {
+
+namespace fs = std::filesystem;
+
+const char* const kVhdl = "VHDL";
+const char* const kVerilog = "Verilog";
+
+// The text with a backslash in front of each of these characters.
+std::string Backslashed(const std::string& text, std::string_view special) {
+  std::string escaped;
+  for (const char c : text) {
+    if (special.find(c) != std::string_view::npos) escaped += '\\';
+    escaped += c;
+  }
+  return escaped;
+}
+
+std::string ShellWord(const std::string& text) {
+  const auto isPlain = [](char c) {
+    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') ||
+           std::string_view("_-./,:+@%").find(c) != std::string_view::npos;
+  };
+  if (!text.empty() && std::all_of(text.begin(), text.end(), isPlain)) return text;
+  std::string word = "'";
+  for (const char c : text) word += c == '\'' ? std::string("'\\''") : std::string(1, c);
+  return word + "'";
+}
+
+// A string of a document, with quotes, as JSON and TOML have it.
+std::string Quoted(const std::string& text) {
+  return Json(text).dump(-1, ' ', false, Json::error_handler_t::replace);
+}
+
+std::string TclWord(const std::string& text) {
+  std::string word = Backslashed(text, "\\\"$[]{}");
+  for (std::size_t at; (at = word.find('\n')) != std::string::npos;) word.replace(at, 1, "\\n");
+  return "\"" + word + "\"";
+}
+
+// A pattern that stands for this path alone.
+std::string GlobLiteral(const std::string& path) {
+  std::string pattern;
+  for (const char c : path) {
+    const bool special = std::string_view("*?[]").find(c) != std::string_view::npos;
+    pattern += special ? std::string("[") + c + "]" : std::string(1, c);
+  }
+  return pattern;
+}
+
+void WriteList(const SourceList& list) {
+  Table table;
+  for (const Source& source : list.sources) table.Add({source.path});
+  table.Write();
+}
+
+void WriteJsonList(const SourceList& list) {
+  Json sources = Json::array();
+  Json libraries = Json::array();
+  for (const Source& source : list.sources) {
+    sources.push_back(
+        {{"path", source.path}, {"library", source.library}, {"language", source.language}});
+    if (libraries.empty() || libraries.back() != source.library)
+      libraries.push_back(source.library);
+  }
+  Json directories = Json::array();
+  for (const IncludeDirectory& directory : list.includeDirectories) {
+    directories.push_back(directory.path);
+  }
+  WriteJson({{"key", list.key},
+             {"purpose", list.purpose},
+             {"libraries", libraries},
+             {"sources", sources},
+             {"include_directories", directories}});
+}
+
+// Comments name the libraries, which the format can't say.
+void WriteFileList(const SourceList& list) {
+  const std::string_view special = " \t\\\"";
+  for (const IncludeDirectory& directory : list.includeDirectories) {
+    std::cout << "+incdir+" << Backslashed(directory.path, special) << '\n';
+  }
+  std::string library;
+  for (const Source& source : list.sources) {
+    if (source.language != kVerilog) continue;
+    if (source.library != library) std::cout << "// library " << source.library << '\n';
+    library = source.library;
+    std::cout << Backslashed(source.path, special) << '\n';
+  }
+}
+
+void WriteGhdl(const SourceList& list) {
+  std::cout << "#!/bin/sh\n# Analyses into the current directory; GHDL_FLAGS go to every call.\n"
+               "set -e\n";
+  for (const Source& source : list.sources) {
+    if (source.language != kVhdl) continue;
+    std::cout << "ghdl -a $GHDL_FLAGS --work=" << ShellWord(source.library) << ' '
+              << ShellWord(source.path) << '\n';
+  }
+}
+
+Json EdamFile(const Source& source) {
+  Json file = {{"name", source.path}};
+  if (!source.language.empty()) {
+    file["file_type"] = source.language == kVhdl ? "vhdlSource" : "verilogSource";
+  }
+  file["logical_name"] = source.library;
+  return file;
+}
+
+// The files of an include directory, by name; none if it can't be read.
+std::vector<std::string> FilesIn(const std::string& directory) {
+  std::vector<std::string> files;
+  std::error_code error;
+  for (fs::directory_iterator entry(directory, error), end; !error && entry != end;
+       entry.increment(error)) {
+    if (entry->is_regular_file(error)) files.push_back(entry->path().filename());
+  }
+  std::sort(files.begin(), files.end());
+  return files;
+}
+
+void WriteEdam(const SourceList& list) {
+  Json files = Json::array();
+  for (const IncludeDirectory& directory : list.includeDirectories) {
+    for (const std::string& name : FilesIn(directory.location)) {
+      files.push_back({{"name", directory.path + "/" + name},
+                       {"file_type", "verilogSource"},
+                       {"is_include_file", true},
+                       {"include_path", directory.path}});
+    }
+  }
+  for (const Source& source : list.sources) files.push_back(EdamFile(source));
+  const Json document = {{"version", "0.2.1"}, {"name", list.key}, {"files", files}};
+  std::cout << document.dump(2, ' ', false, Json::error_handler_t::replace) << '\n';
+}
+
+void WriteVhdlLs(const SourceList& list) {
+  std::cout << "[libraries]\n";
+  std::string library;
+  bool open = false;
+  for (const Source& source : list.sources) {
+    if (source.language != kVhdl) continue;
+    if (!open || source.library != library) {
+      std::cout << (open ? "]\n" : "") << Quoted(source.library) << ".files = [\n";
+    }
+    library = source.library;
+    open = true;
+    std::cout << "  " << Quoted(GlobLiteral(source.path)) << ",\n";
+  }
+  if (open) std::cout << "]\n";
+}
+
+void WriteTcl(const SourceList& list) {
+  std::cout << "# Each source is a dict of library, language and path.\nset kel_sources {}\n";
+  for (const Source& source : list.sources) {
+    std::cout << "lappend kel_sources [dict create library " << TclWord(source.library)
+              << " language " << TclWord(source.language) << " path " << TclWord(source.path)
+              << "]\n";
+  }
+  std::cout << "set kel_include_directories {}\n";
+  for (const IncludeDirectory& directory : list.includeDirectories) {
+    std::cout << "lappend kel_include_directories " << TclWord(directory.path) << '\n';
+  }
+}
+
+struct Format {
+  const char* name;
+  void (*write)(const SourceList&);
+};
+const Format kFormats[] = {{"list", WriteList}, {"json", WriteJsonList}, {"f", WriteFileList},
+                           {"ghdl", WriteGhdl}, {"edam", WriteEdam},     {"vhdl_ls", WriteVhdlLs},
+                           {"tcl", WriteTcl}};
+
+}  // namespace
+
+std::vector<std::string> FormatNames() {
+  std::vector<std::string> names;
+  for (const Format& format : kFormats) names.emplace_back(format.name);
+  return names;
+}
+
+void WriteSources(const SourceList& list, const std::string& format) {
+  const auto chosen =
+      std::find_if(std::begin(kFormats), std::end(kFormats),
+                   [&](const Format& candidate) { return candidate.name == format; });
+  if (chosen != std::end(kFormats)) chosen->write(list);
+}

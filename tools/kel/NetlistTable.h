@@ -1,0 +1,31 @@
+#ifndef KEL_NETLISTTABLE_H
+#define KEL_NETLISTTABLE_H
+
+#include <string>
+#include <vector>
+
+#include "Port_FileName.h"
+#include "Tarvo_KelIP.h"
+
+// The whole table of a core's netlists, found by asking the instance at each combination of values
+// that its file names. A combination that several lines share stands once, at its first line.
+struct NetlistTable {
+  struct Row {
+    unsigned line;
+    std::vector<std::string> values;
+    std::vector<std::string> netlists;
+    bool applies;  // at the values that the parameters had
+  };
+
+  std::vector<std::string> parameters;
+  std::vector<Row> rows;
+};
+
+// Leaves the instance's parameters as they were. The table is empty if the core's file can't be
+// read, which the instance itself reports.
+NetlistTable ReadNetlistTable(Tarvo::KelIP& ip);
+
+// The name of one of a core's data files, with its directory.
+Port::FileName DataFile(const Tarvo::KelIP& ip, const Tarvo::StringBase& extension);
+
+#endif
