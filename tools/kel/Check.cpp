@@ -176,15 +176,29 @@ void Write(const std::vector<Finding>& findings, std::size_t cores, bool asJson)
   }
 }
 
+// What the walk over all repositories finds of the cores that are asked for, and of what is no
+// core.
+std::vector<Finding> Walk(Tarvo::KelLibrary& library, const Call& call) {
+  FindingCollector findings;
+  findings.Begin(Text(RepositoryPath(call)));
+  library.SetRepositoryPath(RepositoryPath(call));
+  std::vector<Finding> found;
+  for (const Finding& finding : findings.Take()) {
+    const fs::path directory = fs::path(finding.file).parent_path().parent_path().filename();
+    const Kel_Key key(StringBase(directory.c_str()));
+    if (!key.IsValid() || MatchesAny(key, call.keys)) found.push_back(finding);
+  }
+  return found;
+}
+
 }  // namespace
 
 Status Check(Tarvo::KelLibrary& library, const Call& call) {
   const std::set<std::string> keys = Keys(call);
-  std::vector<Finding> found;
+  std::vector<Finding> found = Walk(library, call);
   {
     FindingCollector findings;
-    findings.Begin(Text(RepositoryPath(call)));
-    library.SetRepositoryPath(RepositoryPath(call));
+    for (const Finding& finding : found) findings.Add(finding);
     Checker checker(library, findings);
     Progress progress(keys.size(), call.quiet);
     for (const std::string& key : keys) {

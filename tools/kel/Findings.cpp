@@ -71,6 +71,15 @@ bool AnnouncesBadLine(const std::string& text) {
          (BeginsWith(text, "Library ") && text.find(" already has path ") != std::string::npos);
 }
 
+// A duplicate is told for synthesis and for simulation, and by each name that its core was called
+// by. It is one finding all the same.
+std::string WithoutSide(const std::string& text) {
+  const std::size_t file = text.find(" - File ");
+  const std::size_t end = text.find(" already exists in ");
+  if (file == std::string::npos || end == std::string::npos) return text;
+  return text.substr(file + 3, end - file - 3) + " is listed already";
+}
+
 }  // namespace
 
 bool Finding::operator<(const Finding& other) const {
@@ -105,7 +114,6 @@ void FindingCollector::TakeTrace(const std::string& text) {
   }
 }
 
-// A duplicate is told for synthesis and for simulation, and is one finding all the same.
 void FindingCollector::TakeMessage(const Port_Message& message) {
   const std::vector<std::string> lines = Lines(message.text);
   if (lines.empty()) return;
@@ -117,13 +125,13 @@ void FindingCollector::TakeMessage(const Port_Message& message) {
     pending.push_back({"", 0, kError, lines[0], ""});
   } else {
     const bool isWarning = message.severity == Port_Message::Warning;
-    const std::string text = lines[0].substr(0, lines[0].find(" already exists in "));
     Add({reading.empty() ? subject : reading.back(), 0, isWarning ? kWarning : kError,
-         text == lines[0] ? text : text + " is listed already", ""});
+         WithoutSide(lines[0]), ""});
   }
 }
 
-// The innermost file that is read ends at its bad line.
+// The innermost file that is read ends at its bad line. Where a header is bad, each line behind it
+// is tried as one.
 void FindingCollector::TakeBadLine(const std::string& file, unsigned line,
                                    const std::string& text) {
   while (!reading.empty()) {
@@ -131,6 +139,8 @@ void FindingCollector::TakeBadLine(const std::string& file, unsigned line,
     reading.pop_back();
     if (found) break;
   }
+  const bool isHeader = BeginsWith(text, "unparsable header: ");
+  if (isHeader && !filesWithoutHeader.insert(file).second) return;
   if (pending.empty()) Add({file, line, kError, text, ""});
   for (Finding& reason : pending) Add({file, line, kError, reason.text, reason.cause});
   pending.clear();
@@ -156,7 +166,7 @@ void FindingCollector::TakeWrapped(const std::string& text, const std::string& r
 std::vector<Finding> FindingCollector::Take() const {
   const auto hasOwn = [&](const Finding& finding) {
     return std::any_of(findings.begin(), findings.end(), [&](const Finding& other) {
-      return other.file == finding.cause && other.cause.empty();
+      return other.file == finding.cause && other.cause != other.file;
     });
   };
   std::vector<Finding> taken;

@@ -46,6 +46,7 @@ class FindingCollector {
   std::string subject;
   std::vector<std::string> reading;  // the files that are open, the innermost last
   std::vector<Finding> pending;      // reasons whose line is told by the message to come
+  std::set<std::string> filesWithoutHeader;
   std::set<Finding> findings;
   Port_MsgManData::Handler previous;
 };
