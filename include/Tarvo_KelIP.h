@@ -24,16 +24,19 @@ class KelIPImpl;
 // Results: true with the output replaced by the answer, which may be empty; false with an empty
 // output, and a message that says why. Get operations on a record's property and
 // SetParameterProperty issue a warning, all others an error; what arrives without a text of its own
-// is always an error. Where there may be false without a
-// message, it is said so. An argument may be the output itself or lie in it.
+// is always an error. Where there may be false without a message, it is said so. An argument may be
+// the output itself or lie in it.
 //
 // Failures: the constructor and the operations that say so throw; all others throw nothing. A
 // text that is given as `const char*` becomes a string at the call, which may throw std::bad_alloc
 // there.
 //
-// Lifetime: the caller owns the instance, and destroys it before the library that made it. A
-// refresh of the library does not change an instance. Threads: for one at a time, also for const
-// operations; separate instances of one library may not work at the same time as a refresh of it.
+// Lifetime: the caller owns the instance, and destroys it before the library that made it. Across a
+// refresh of the library an instance keeps its key, location and description. Sources and netlists
+// are read, at the first question for them, from where the library then says, and later changes of
+// the files are not seen; questions for libraries ask it each time. Threads: for one at a time,
+// also for const operations; separate instances of one library may not work at the same time as a
+// refresh of it.
 class TARVO_EXPORT KelIP {
  public:
   // Properties of a core that its key gives: NAME, VERSION.
@@ -111,9 +114,9 @@ class TARVO_EXPORT KelIP {
   bool ListIOInterfaceParameters(const StringBase& interface, StringList& list) const;
   bool ListIOInterfacePorts(const StringBase& interface, StringList& list) const;
 
-  // HDL sources, of a core whose option STYLE is HDL, as it is by default, or MIX. Any other core
-  // has none: false without a message. The analyse order is read by the first question that needs
-  // it (see LDXParser); if that fails, the next question tries again.
+  // HDL sources, of a core whose option STYLE is HDL, as it is by default, or MIX, in any letter
+  // case. Any other core has none: false without a message. The analyse order is read by the first
+  // question that needs it (see LDXParser); if that fails, the next question tries again.
   //
   // Absolute paths of the sources in analyse order, and absolute directories of the libraries that
   // they belong to, in the same order.
@@ -137,11 +140,13 @@ class TARVO_EXPORT KelIP {
   // without a message. The table is read by the first question that needs it (see TEWParser), and
   // each answer holds for the parameters' values of that moment.
   //
-  // Absolute paths of the netlists that apply, and absolute directories of their libraries, sorted.
+  // Absolute paths of the netlists that apply, and absolute directories of their libraries, sorted,
+  // each once.
   bool ListNetlists(StringList& list) const;
   bool ListNetlistLibraries(StringList& list) const;
   // LIBRARY is the key of the library that a netlist belongs to; an error for a netlist that does
-  // not apply. False without a message for any other property.
+  // not apply, which ListNetlistProperties reports so too. False without a message for any other
+  // property; the list is that one name.
   bool GetNetlistProperty(const StringBase& netlist, const StringBase& property,
                           StringBase& value) const;
   bool ListNetlistProperties(const StringBase& netlist, StringList& list) const;

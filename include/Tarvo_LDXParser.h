@@ -23,14 +23,14 @@ class Kel_Index;
 // The file has an entry on a line; `#` begins a comment, and quotes make one field of several
 // words. LIBRARY is the key of a core version, or a bare name for the newest one.
 //
-//     lib LIBRARY FILE [LANGUAGE]        a source, for both lists; synlib and simlib for one of
-//     them lib LIBRARY all                    all sources that the library's own file lists
-//     vlgincdir LIBRARY DIRECTORY        the Verilog include directory of a library, below this
-//     core
+//     lib LIBRARY FILE [LANGUAGE]      a source, for synthesis and simulation
+//     synlib, simlib                   the same for one of them
+//     lib LIBRARY all                  all sources that the library's own file lists, for both
+//     vlgincdir LIBRARY DIRECTORY      where a library's Verilog includes lie, below this core
 //
 // A source lies in `hdl/vhdl` or `hdl/verilog` below its library's directory. Which of them, its
-// extension tells (`vhd`, `v`); a name without an extension gets that of its language. A source
-// without a LANGUAGE has that of the core whose file is read:
+// extension tells (`vhd`, `v`), or else its language; a name without an extension gets that of its
+// language. A source without a LANGUAGE has that of the core whose file is read:
 //
 //     VHDL, Verilog    the core's
 //     MIXED            VHDL
@@ -39,7 +39,9 @@ class Kel_Index;
 //
 // Languages are compared in any letter case. An entry with an unknown LANGUAGE is left out with an
 // error, a source that is listed already with a warning, or with a trace if an `all` brings it; the
-// order is good all the same.
+// order is good all the same. Any other fault makes the whole file bad: a line of another form, an
+// extension against the language, a library that is not in the index, an include directory that
+// does not exist or is given twice, a bad file of a core that is included.
 //
 // Libraries stand in the order in which each got its first source, and the sources of a library
 // stand together, in the order in which they were added. What an `all` adds stands at its place.

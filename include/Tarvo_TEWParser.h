@@ -1,6 +1,7 @@
 #ifndef TARVO_TEWPARSER_H
 #define TARVO_TEWPARSER_H
 
+#include <unordered_set>
 #include <vector>
 
 #include "Port_FileName.h"
@@ -20,17 +21,34 @@ class QVRParser;
 //     const Tarvo::TEWParser netlists(index, key, &description);
 //     for (const auto& netlist : netlists.ListFiles()) std::cout << netlist << '\n';
 //
-// A netlist may belong to another core, its library. No netlist is asked whether it exists.
+// The file has a header and rows; `#` begins a comment.
+//
+//     MODE WIDTH FILES                   names of parameters, then the word FILES in any letter
+//     case fast 32    a.edn, b.edn            a value for each of them, then one or more netlists
+//     fast 64    OTHER:sub/c.edn         a netlist of another core, by its key or bare name
+//     "a b" ''   "my file.edn"           quotes for what holds blanks or commas, or is empty
+//
+// Values stand apart by blanks, netlists by commas. What stands behind FILES, and behind the last
+// netlist, is ignored. Netlists lie in the `netlist` directory of their core, the library; whether
+// one exists is not asked.
+//
+// A line that fails as the header is an error, unless it begins with a quote that is not closed,
+// and the next line gets its turn. So a table may be good after errors; the names of such lines
+// stay as columns.
+//
+// Failures: reading and asking may throw std::bad_alloc. A path throws
+// std::filesystem::filesystem_error if the repository was given relative to a current directory
+// that is gone.
 //
 // Lifetime: the index and the description must outlive the parser. Threads: like an int, together
-// with these two; nobody may set a parameter while the parser is asked.
+// with these two; nobody may set a parameter while the parser is asked. Each query walks all rows,
+// and the description's parameters once for each column.
 class TARVO_EXPORT TEWParser {
  public:
   // Reads the table of a version. The description may be null; then only a table without parameters
   // can be read. Throws AppException with level NotFound for a key, or the library of a netlist,
   // that is not in the index, and with level Failure if the file can't be read, has no usable
-  // header or a bad row. Each line that is no header was then issued as an error. May throw
-  // std::bad_alloc.
+  // header or a bad row.
   TEWParser(const Kel_Index& theIndex, const Kel_Key& key, const QVRParser* description);
   // The same for a file of any name, taken for that of the version.
   TEWParser(const Port::FileName& tewFile, const Kel_Index& theIndex, const Kel_Key& key,
@@ -48,8 +66,8 @@ class TARVO_EXPORT TEWParser {
   // since.
   StringList ListLibraries() const;
 
-  // The library of a selected netlist, whose absolute path must be that of ListFiles. Throws
-  // AppException with level Failure for any other file, and as ListLibraries does.
+  // The library of a selected netlist, whose absolute path must be the very text of ListFiles.
+  // Throws AppException with level Failure for any other file, and as ListLibraries does.
   Kel_Key GetFileLibrary(const Port::FileName& file) const;
 
  private:
@@ -65,8 +83,10 @@ class TARVO_EXPORT TEWParser {
   // What became of a line. One that states nothing has no value at its start.
   enum Result { Read, StatesNothing, Unparsable };
 
+  using NameSet = std::unordered_set<StringBase>;
+
   TARVO_LOCAL void Parse(const Port::FileName& tewFile, const Kel_Key& key);
-  TARVO_LOCAL Result ParseHeader(const StringBase& line, const StringList& parameterNames);
+  TARVO_LOCAL Result ParseHeader(const StringBase& line, const NameSet& parameterNames);
   TARVO_LOCAL Result ParseFileEntry(const StringBase& line, const Kel_Key& key);
   TARVO_LOCAL Netlist MakeNetlist(const StringBase& file, const Kel_Key& key) const;
   TARVO_LOCAL StringList GetParameterValues() const;

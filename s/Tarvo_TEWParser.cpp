@@ -60,7 +60,8 @@ void TEWParser::Parse(const FileName& tewFile, const Kel_Key& key) {
   const StringBase name = tewFile.GetName();
   TARVO_TRACE("  Parsing TEW File for %s\n", key.GetKey());
   FileScanner lines(tewFile);
-  const StringList parameterNames = qvrParser ? qvrParser->ListParameters() : StringList();
+  const StringList names = qvrParser ? qvrParser->ListParameters() : StringList();
+  const NameSet parameterNames(names.begin(), names.end());
   StringBase line;
   unsigned lineNumber = 0;
   Result result = StatesNothing;
@@ -80,13 +81,12 @@ void TEWParser::Parse(const FileName& tewFile, const Kel_Key& key) {
 }
 
 // The names of a line that turns out to be no header stay.
-TEWParser::Result TEWParser::ParseHeader(const StringBase& line, const StringList& parameterNames) {
+TEWParser::Result TEWParser::ParseHeader(const StringBase& line, const NameSet& parameterNames) {
   TokenReader tokens = Cut(line);
   StringBase name;
   if (!tokens.ReadField(name)) return StatesNothing;
   while (!Matches(name, kEndOfHeader)) {
-    const auto known = std::find(parameterNames.begin(), parameterNames.end(), name);
-    if (known == parameterNames.end()) return Unparsable;
+    if (parameterNames.find(name) == parameterNames.end()) return Unparsable;
     headerNames.push_back(name);
     if (!tokens.ReadField(name)) return Unparsable;
   }

@@ -15,7 +15,7 @@ struct Port_Message {
   const char* file;      // path stem of the source file that issued it
   int line;              // line of the issuing statement in that file
   const char* revision;  // revision of that file
-  const char* text;      // with its own line ends
+  const char* text;  // with its line ends; that of a wrapped exception may stand before the last
 };
 
 // The message manager: one statement makes a message and issues it.

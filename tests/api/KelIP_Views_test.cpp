@@ -116,6 +116,7 @@ TEST_F(Views, GivePropertiesOfSources) {
   EXPECT_EQ(get("no/such.v", "FILENAME_HEAD"), (fs::current_path() / "no").string());
   EXPECT_EQ(get("no/such.v", "LIBRARY"), "");
   EXPECT_EQ(get(At("hdl/vhdl/s/a.vhd"), "language"), "");
+  EXPECT_EQ(get(At("hdl/vhdl/s/a.vhd"), "library"), "");
   StringList list;
   EXPECT_TRUE(ip->ListSourceProperties(At("hdl/vhdl/b.vh").c_str(), list));
   EXPECT_THAT(list, ElementsAre("LIBRARY", "LANGUAGE", "FILENAME_HEAD", "FILENAME_TAIL"));
@@ -139,13 +140,42 @@ TEST_F(Views, FollowTheParametersWithoutReadingAgain) {
   EXPECT_EQ(Ask(*ip, &KelIP::ListNetlists), "");
   EXPECT_THAT(recorder.Take(), IsEmpty());
   StringBase value;
-  EXPECT_FALSE(ip->GetNetlistProperty(At("netlist/one.edn").c_str(), "FILE", value));
+  EXPECT_FALSE(ip->GetNetlistProperty(At("netlist/one.edn").c_str(), "library", value));
   EXPECT_THAT(recorder.Take(), IsEmpty());
+  // The list asks for the property, whose message is then the only one.
+  const std::string unknown = "error s/Tarvo_KelIP: Unable to get netlist " +
+                              At("netlist/one.edn") +
+                              " property LIBRARY for IP abc_v1_00_a\nCould not find netlist " +
+                              At("netlist/one.edn") + " in order to identify library\n\n";
+  StringList list;
   EXPECT_FALSE(ip->GetNetlistProperty(At("netlist/one.edn").c_str(), "LIBRARY", value));
-  EXPECT_THAT(recorder.Take(),
-              ElementsAre("error s/Tarvo_KelIP: Unable to get netlist " + At("netlist/one.edn") +
-                          " property LIBRARY for IP abc_v1_00_a\nCould not find netlist " +
-                          At("netlist/one.edn") + " in order to identify library\n\n"));
+  EXPECT_FALSE(ip->ListNetlistProperties(At("netlist/one.edn").c_str(), list));
+  EXPECT_THAT(recorder.Take(), ElementsAre(unknown, unknown));
+}
+
+// Whatever way the repository was given, paths come out absolute.
+TEST_F(Views, AreAbsolute) {
+  repo.Core("abc_v1_00_a")
+      .Qvr("OPTION STYLE = MIX")
+      .Ldx("synlib abc a\nsimlib xyz b")
+      .Tew("FILES\nb.edn");
+  repo.Core("xyz_v1_00_a");
+  const fs::path relative = fs::relative(repo.Path());
+  ASSERT_TRUE(library.SetRepositoryPath(relative.c_str()));
+  const std::unique_ptr<KelIP> ip(library.CreateIP("abc"));
+  const std::string at = fs::current_path() / relative / "ipmods/";
+  const auto ask = [&](bool (KelIP::*question)(StringList&) const) {
+    StringList list;
+    EXPECT_TRUE(((*ip).*question)(list));
+    return list.size() == 1 ? std::string(list[0]) : "not one";
+  };
+  EXPECT_EQ(ask(&KelIP::ListSynthesisLibraries), at + "abc_v1_00_a");
+  EXPECT_EQ(ask(&KelIP::ListSimulationLibraries), at + "xyz_v1_00_a");
+  EXPECT_EQ(ask(&KelIP::ListNetlistLibraries), at + "abc_v1_00_a");
+  EXPECT_EQ(ask(&KelIP::ListNetlists), at + "abc_v1_00_a/netlist/b.edn");
+  StringBase value;
+  EXPECT_TRUE(ip->GetNetlistProperty((relative / "ipmods/abc_v1_00_a/netlist/b.edn").c_str(),
+                                     "LIBRARY", value));
 }
 
 // A file that is bad fails each question anew, and no other, until it is mended.

@@ -55,7 +55,7 @@ TEST_F(Netlists, TakesLinesByTheirForm) {
     std::string expected;
   } rows[] = {{"FILES", "a.edn", own + "a.edn"},
               {"files and more", "\n a.edn # comment\n\n", own + "a.edn"},
-              {"FILES", "a.edn b.edn", own + "a.edn"},
+              {"FILES", "a.edn b.edn c.edn", own + "a.edn"},
               {"FILES", "a.edn ,", own + "a.edn"},
               {"FILES", "a.edn,b.edn , 'c d'", own + "a.edn " + own + "b.edn " + own + "c d"},
               {"FILES", ", a.edn", own + ","},
@@ -109,6 +109,17 @@ TEST_F(Netlists, TriesEachLineAsHeader) {
   EXPECT_THAT(recorder.Take(), IsEmpty());
 }
 
+// The text of what an operation throws.
+template <class Operation>
+std::string NotFound(const Operation& operation) {
+  try {
+    operation();
+    return "nothing";
+  } catch (const AppException& exception) {
+    return exception.what();
+  }
+}
+
 TEST_F(Netlists, FollowTheParameters) {
   repo.Core("abc_v1_00_a")
       .Tew("A B FILES\nfast 32 xyz:c.edn, b.edn\nslow 32 a.edn\nfast 32 xyz_v1_00_a:c.edn, a.edn");
@@ -133,6 +144,14 @@ TEST_F(Netlists, FollowTheParameters) {
     EXPECT_EQ(exception.what(), "Could not find netlist " + (repo / "ipmods/" + own) +
                                     "b.edn in order to identify library\n");
   }
+  EXPECT_EQ(NotFound([&] { parser.GetFileLibrary(Port::FileName("a.edn")); }),
+            "Could not find netlist a.edn in order to identify library\n");
+  const std::string path = own + "a.edn";
+  index.ClearIP();
+  EXPECT_EQ(NotFound([&] { library(path); }), "Cannot find IP key for abc_v1_00_a\n");
+  EXPECT_EQ(NotFound([&] { parser.ListLibraries(); }),
+            "Cannot find IP index entry for abc_v1_00_a\n");
+  EXPECT_EQ(Shorten(parser.ListFiles()), path);
   description->SetParameterProperty("B", "VALUE", "");
   EXPECT_THAT(parser.ListFiles(), IsEmpty());
   EXPECT_THAT(parser.ListLibraries(), IsEmpty());

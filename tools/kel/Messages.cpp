@@ -34,8 +34,9 @@ bool WantsColour(const std::string& choice) {
   if (choice != "auto") return choice == "always";
   const char* const refused = std::getenv("NO_COLOR");
   const char* const terminal = std::getenv("TERM");
-  const bool dumb = terminal && std::string(terminal) == "dumb";
-  return ::isatty(STDERR_FILENO) != 0 && !(refused && *refused) && !dumb;
+  const bool isRefused = refused != nullptr && *refused != 0;
+  const bool isDumb = terminal != nullptr && std::string(terminal) == "dumb";
+  return ::isatty(STDERR_FILENO) != 0 && !isRefused && !isDumb;
 }
 
 // Wrapped texts bring line ends of their own, so empty lines are left out.
@@ -43,7 +44,7 @@ void Show(const Lead& lead, const std::string& text) {
   if (isQuiet) return;
   std::istringstream lines(text);
   std::string shown = "kel: ";
-  const bool coloured = isColoured && *lead.colour;
+  const bool coloured = isColoured && *lead.colour != 0;
   std::string start = coloured ? std::string(lead.colour) + lead.word + "\x1B[0m" : lead.word;
   for (std::string line; std::getline(lines, line);) {
     if (line.empty()) continue;

@@ -19,10 +19,10 @@ using Tarvo::StringList;
 std::size_t Distance(const std::string& left, const std::string& right) {
   std::vector<std::size_t> row(right.size() + 1);
   std::iota(row.begin(), row.end(), 0U);
-  for (std::size_t i = 0; i < left.size(); ++i) {
+  for (const char letter : left) {
     std::size_t diagonal = row[0]++;
     for (std::size_t j = 0; j < right.size(); ++j) {
-      const std::size_t change = diagonal + (left[i] == right[j] ? 0 : 1);
+      const std::size_t change = diagonal + (letter == right[j] ? 0 : 1);
       diagonal = row[j + 1];
       row[j + 1] = std::min({change, row[j] + 1, diagonal + 1});
     }

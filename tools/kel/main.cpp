@@ -77,7 +77,7 @@ bool IsClosedPipe() {
 }  // namespace
 
 int main(int argc, char** argv) try {
-  std::signal(SIGPIPE, SIG_IGN);
+  if (std::signal(SIGPIPE, SIG_IGN) == SIG_ERR) return StatusFindings;
   Status status = StatusClean;
   const std::optional<Call> call = ReadCall(argc, argv, status);
   if (call) status = Run(*call);
