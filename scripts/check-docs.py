@@ -4,8 +4,9 @@
 Usage: check-docs.py [BUILD_DIRECTORY]
 
 In a `console` block a line behind "$ " is run with the built `kel` on the path, and the lines below
-it are what it must print; a line of three dots stands for the rest. The `cpp` block of README.md is
-compiled and run as README.md says. The project's directory is written /home/me/kel.
+it are what it must print; a line of three dots stands for the rest. A line that ends in a backslash
+goes on in the next. In a manual page the blocks are those between .EX and .EE. The `cpp` block of
+README.md is compiled and run as README.md says. The project's directory is written /home/me/kel.
 """
 
 import os
@@ -16,12 +17,23 @@ import sys
 import tempfile
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
-DOCUMENTS = ["README.md"]
+DOCUMENTS = ["README.md", "docs/kel.1"]
 SHOWN_ROOT = "/home/me/kel"
 
 
 def blocks(text, language):
     return re.findall(rf"^```{language}\n(.*?)^```$", text, re.MULTILINE | re.DOTALL)
+
+
+# What the escapes of a manual page's examples stand for.
+ESCAPES = {"-": "-", "e": "\\", "&": "", "(aq": "'", "(dq": '"', "(ha": "^", "(ti": "~", "(ga": "`"}
+
+
+def manual_blocks(text):
+    """The examples of a manual page as they are read, without its requests."""
+    for block in re.findall(r"^\.EX\n(.*?)^\.EE$", text, re.MULTILINE | re.DOTALL):
+        lines = re.sub(r"^[.'].*\n", "", block, flags=re.MULTILINE)
+        yield re.sub(r"\\(\(..|.)", lambda escape: ESCAPES[escape.group(1)], lines)
 
 
 def run(command, environment, directory=ROOT):
@@ -37,8 +49,12 @@ def matches(expected, printed):
 
 
 def console_faults(name, text, environment):
-    for block in blocks(text, "console"):
-        for command, expected in re.findall(r"^\$ (.*)\n((?:(?!\$ ).*\n)*)", block, re.MULTILINE):
+    found = list(blocks(text, "console") if name.endswith(".md") else manual_blocks(text))
+    if not found:
+        yield f"{name}: has no examples"
+    for block in found:
+        for command, expected in re.findall(r"^\$ ((?:.*\\\n)*.*)\n((?:(?!\$ ).*\n)*)", block,
+                                            re.MULTILINE):
             printed = run(command, environment)
             if not matches(expected, printed):
                 yield f"{name}: $ {command}\nprints\n{printed}"
