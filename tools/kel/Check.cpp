@@ -8,6 +8,7 @@
 
 #include "Findings.h"
 #include "Json.h"
+#include "Messages.h"
 #include "NetlistTable.h"
 #include "Tarvo_AppException.h"
 #include "Tarvo_FileScanner.h"
@@ -209,5 +210,6 @@ Status Check(Tarvo::KelLibrary& library, const Call& call) {
     found = findings.Take();
   }
   Write(found, keys.size(), call.asJson);
-  return found.empty() ? StatusClean : StatusFindings;
+  if (keys.empty()) Messages::Note("there is no core to check");
+  return found.empty() && !keys.empty() ? StatusClean : StatusFindings;
 }

@@ -23,10 +23,12 @@ bool SetParameters(KelIP& ip, const std::vector<std::string>& settings) {
 void WriteTable(const KelIP& ip, const NetlistTable& netlists, bool asJson) {
   Table table;
   Json rows = Json::array();
-  Table::Row head = {"#"};
-  head.insert(head.end(), netlists.parameters.begin(), netlists.parameters.end());
-  head.emplace_back("netlist");
-  table.Add(head);
+  if (!netlists.rows.empty()) {
+    Table::Row head = {"#"};
+    head.insert(head.end(), netlists.parameters.begin(), netlists.parameters.end());
+    head.emplace_back("netlist");
+    table.Add(head);
+  }
   for (const NetlistTable::Row& row : netlists.rows) {
     rows.push_back({{"values", row.values}, {"netlists", row.netlists}, {"applies", row.applies}});
     for (const std::string& netlist : row.netlists) {
@@ -68,14 +70,15 @@ Status Netlists(const Tarvo::KelLibrary& library, const Call& call) {
   if (!ip || !SetParameters(*ip, call.settings)) return StatusFindings;
   Tarvo::StringList paths;
   if (!AskForFiles(*ip, &KelIP::ListNetlists, "netlists", paths)) return StatusFindings;
-  Tarvo::StringList libraries;
-  if (paths.empty() && ip->ListNetlistLibraries(libraries)) {
-    Messages::Note("no netlist applies at these values; --table shows those that the table has");
-  }
   if (call.wholeTable) {
     WriteTable(*ip, ReadNetlistTable(*ip), call.asJson);
   } else {
     WriteList(*ip, paths, call.asJson);
+    Tarvo::StringList libraries;
+    const bool hasTable = ip->ListNetlistLibraries(libraries);
+    if (paths.empty() && hasTable) {
+      Messages::Note("no netlist applies at these values; --table shows which would");
+    }
   }
   return StatusClean;
 }

@@ -9,7 +9,7 @@
 #include <map>
 #include <sstream>
 
-#include "CommandLine.h"
+#include "Arguments.h"
 #include "Messages.h"
 #include "Tarvo_AppException.h"
 #include "Tarvo_KelLibrary_Utils.h"

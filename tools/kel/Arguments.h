@@ -1,5 +1,5 @@
-#ifndef KEL_COMMANDLINE_H
-#define KEL_COMMANDLINE_H
+#ifndef KEL_ARGUMENTS_H
+#define KEL_ARGUMENTS_H
 
 #include <optional>
 

@@ -1,4 +1,4 @@
-#include "CommandLine.h"
+#include "Arguments.h"
 
 #include <CLI/CLI.hpp>
 #include <algorithm>
@@ -111,7 +111,7 @@ void DescribeCall(CLI::App& app, Call& call) {
       ->allow_extra_args(false);
   app.add_flag("--json", call.asJson, "Write a JSON document");
   app.add_flag("--trace", call.withTraces, "Tell on standard error what is read");
-  app.add_flag("--quiet", call.quiet, "Say nothing on standard error; the exit status tells");
+  app.add_flag("--quiet", call.quiet, "Leave out messages and notes; the exit status tells");
   app.add_option("--color", call.color, "Whether messages are coloured")
       ->check(CLI::IsMember({"auto", "always", "never"}))
       ->default_str("auto");
@@ -134,6 +134,9 @@ std::string Fault(const CLI::App& app, const Call& call) {
   }
   if (!extras.empty()) return "'" + extras.front() + "' is not expected here";
   if (call.verb.empty()) return "a verb is required: " + verbs;
+  if (call.asJson && !call.format.empty() && call.format != "json") {
+    return "--json and --format " + call.format + " exclude each other";
+  }
   if (call.libraries.empty()) return "-L DIR is required, the repository to ask";
   const bool empty = std::any_of(
       call.libraries.begin(), call.libraries.end(),
