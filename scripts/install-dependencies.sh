@@ -1,12 +1,13 @@
 #!/usr/bin/env bash
 # Installs the Debian packages that are missing, as root or through sudo.
-# Usage: install-dependencies.sh GROUP...   with the groups build, test and check
+# Usage: install-dependencies.sh GROUP...   with the groups build, test, tools and check
 set -euo pipefail
 
 declare -A groups=(
   [build]="g++ cmake ninja-build pkg-config libboost-filesystem-dev libpcre2-dev libcli11-dev
           nlohmann-json3-dev"
   [test]="libgtest-dev libgmock-dev libbenchmark-dev"
+  [tools]="ghdl iverilog verilator yosys tcl python3-jsonschema"
   [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3"
 )
 

@@ -5,7 +5,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 
 preset=${1:-gcc-release}
-groups=(build test)
+groups=(build test tools)
 [[ $preset == gcc-* ]] || groups+=(check)
 scripts/install-dependencies.sh "${groups[@]}"
 cmake --workflow --preset "$preset"

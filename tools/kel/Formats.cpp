@@ -190,7 +190,7 @@ std::vector<std::string> FormatNames() {
 }
 
 void WriteSources(const SourceList& list, const std::string& format) {
-  const auto chosen =
+  const auto* const chosen =
       std::find_if(std::begin(kFormats), std::end(kFormats),
                    [&](const Format& candidate) { return candidate.name == format; });
   if (chosen != std::end(kFormats)) chosen->write(list);

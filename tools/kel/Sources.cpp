@@ -4,6 +4,7 @@
 #include "Formats.h"
 #include "Messages.h"
 #include "Tarvo_KelIP.h"
+#include "Tarvo_LDXParser.h"
 #include "Text.h"
 #include "Verbs.h"
 
@@ -20,11 +21,25 @@ std::string Property(const KelIP& ip, const StringBase& source, const StringBase
   return Text(value);
 }
 
-// Paths are compared as texts; links are not followed.
+// Paths are compared as texts; links are not followed. None begins like an option.
 std::string Relative(const StringBase& path, const std::string& directory) {
   if (directory.empty()) return Text(path);
   const fs::path base = fs::absolute(directory).lexically_normal();
-  return fs::path(Text(path)).lexically_normal().lexically_relative(base);
+  const std::string relative = fs::path(Text(path)).lexically_normal().lexically_relative(base);
+  const bool isPlain = relative.find_first_of("-+#/") != 0;
+  return isPlain ? relative : "./" + relative;
+}
+
+// A source whose extension tells no language lies in the directory of the one that it was given.
+std::string Language(const KelIP& ip, const StringBase& source) {
+  std::string language = Property(ip, source, KelIP::KEL_HDL_LANGUAGE_PROPERTY);
+  if (!language.empty()) return language;
+  const std::string path = Text(source);
+  const std::size_t vhdl = path.rfind("/hdl/vhdl/");
+  const std::size_t verilog = path.rfind("/hdl/verilog/");
+  if (vhdl == verilog) return "";
+  const bool isVhdl = verilog == std::string::npos || (vhdl != std::string::npos && vhdl > verilog);
+  return Text(isVhdl ? Tarvo::LDXParser::LDX_HDL_VHDL : Tarvo::LDXParser::LDX_HDL_VERILOG);
 }
 
 std::vector<IncludeDirectory> IncludeDirectories(const KelIP& ip, const std::string& relativeTo) {
@@ -52,7 +67,7 @@ Status Sources(const Tarvo::KelLibrary& library, const Call& call) {
   for (const StringBase& path : paths) {
     list.sources.push_back({Relative(path, call.relativeTo),
                             Property(*ip, path, KelIP::KEL_HDL_LIBRARY_PROPERTY),
-                            Property(*ip, path, KelIP::KEL_HDL_LANGUAGE_PROPERTY)});
+                            Language(*ip, path)});
   }
   if (!paths.empty()) list.includeDirectories = IncludeDirectories(*ip, call.relativeTo);
   const std::string format = call.asJson ? "json" : call.format.empty() ? "list" : call.format;
