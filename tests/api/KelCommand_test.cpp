@@ -168,8 +168,40 @@ TEST(KelNetlists, ListsThoseThatApply) {
       Paths("netlists crc_unit --set mode=FAST", 1),
       "kel: warning: Unable to set IP crc_unit_v1_00_a parameter mode property VALUE to FAST\n"
       "  Cannot find Parameter mode\n");
+  const std::string table = Paths("netlists crc_unit --table --set MODE=FAST");
+  EXPECT_NE(table.find("*\tFAST\t8\t" + own + "8_fast.edif\n\tFAST\t16\t"), std::string::npos);
   Paths("netlists crc_unit --set MODE", 2);
   Paths("netlists crc_unit --set =FAST", 2);
+}
+
+TEST(Kel, SaysWhatItIsAskedToSay) {
+  const std::string which = "-L repository which nope ";
+  EXPECT_EQ(Kel(which + "--quiet").errors, "");
+  EXPECT_EQ(Kel(which + "--quiet").status, 1);
+  EXPECT_EQ(Kel(which + "--color always").errors.substr(0, 24), "kel: \x1B[1;31merror: \x1B[0mU");
+  EXPECT_EQ(Kel(which).errors.find('\x1B'), std::string::npos);
+  EXPECT_EQ(Kel(which + "--trace").errors.substr(0, 11), "kel: trace:");
+  const std::string list = "'" + kKel + "' -L '" + kExamples + "/repository' list";
+  EXPECT_EQ(RunCommand("{ sleep 0.1; " + list + "; echo $? >&2; } | true").errors, "0\n");
+}
+
+TEST(Kel, SuggestsWhatThereIs) {
+  const char* const rows[][2] = {{"show puls_counter", "kel: note: a near name is pulse_counter\n"},
+                                 {"which WORD_FIFO", "kel: note: a near name is word_fifo\n"},
+                                 {"sources math_pack_v2_00_a --for synthesis",
+                                  "kel: note: the versions of this core are math_pack_v1_00_a\n"},
+                                 {"list 'x*'", "kel: note: no core fits 'x*'\n"}};
+  for (const auto& [arguments, note] : rows) {
+    const CommandResult result = Kel(std::string("-L repository ") + arguments);
+    EXPECT_EQ(result.status, 1) << arguments;
+    EXPECT_NE(result.errors.find(note), std::string::npos) << result.errors;
+  }
+  const CommandResult place = Kel("-L overlay -L repository show pulse_counter --section place");
+  const std::string hidden = "hides\t" + kExamples + "/repository/ipmods/pulse_counter_v2_00_a\n";
+  EXPECT_NE(
+      place.output.find(hidden + "other_versions\tpulse_counter_v1_00_a,pulse_counter_v1_01_b"),
+      std::string::npos);
+  EXPECT_EQ(Kel("-L .. list").status, 3);
 }
 
 TEST(Kel, ShowsHelpAndVersion) {
