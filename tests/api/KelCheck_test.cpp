@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <filesystem>
 #include <string>
 
 #include "CommandLine.h"
@@ -14,7 +15,7 @@ std::string Check(const RepositoryBuilder& repo, const std::string& arguments, i
   const CommandResult result =
       RunCommand("'" + kKel + "' check -L " + repo.Path() + " " + arguments);
   EXPECT_EQ(result.status, status);
-  EXPECT_EQ(result.errors, "");
+  EXPECT_EQ(result.errors, arguments == "nosuch" ? "kel: note: there is no core to check\n" : "");
   std::string output = result.output;
   const std::string root = repo / "ipmods/";
   for (std::size_t at; (at = output.find(root)) != std::string::npos;)
@@ -95,6 +96,40 @@ TEST(KelCheck, NamesEachFaultOnceAtItsLine) {
             "{\"format_version\":1,\"cores\":1,\"errors\":1,\"warnings\":0,\"findings\":[{\"file\":"
             "\"l4_v1_00_a/data/l4_v2_1_0.ldx\",\"line\":1,\"severity\":\"error\",\"text\":"
             "\"Filea.vdeclaredtobeVHDL\"}]}");
+}
+
+// Which line lists a file, and which file that is.
+TEST(KelCheck, FindsTheLinesOfMissingFiles) {
+  RepositoryBuilder repo;
+  Good(repo, "lib").Ldx("lib lib a.vhd\nlib lib s//m.vhd\nlib lib x,y");
+  Good(repo, "top")
+      .Ldx("lib top m.vhd\nlib lib all\nlib lib m.vhd\nlib gone g.vhd")
+      .File("hdl/vhdl/m.vhd", "");
+  repo.Core("gone_v1_00_a").Qvr("OPTION STYLE = HLD");
+  Good(repo, "net").Tew("FILES\nn.edn\nm.edn, n.edn\ntop:k.edn").File("netlist/m.edn/x", "");
+  Good(repo, "dir").Ldx("vlgincdir dir hdl/vhdl/a.vhd\nlib dir a.vhd");
+  EXPECT_EQ(Check(repo, "", 1),
+            "dir_v1_00_a/data/dir_v2_1_0.ldx: error: include directory is none: "
+            "dir_v1_00_a/hdl/vhdl/a.vhd\n"
+            "gone_v1_00_a/data/gone_v2_1_0.qvr: warning: the STYLE 'HLD' is none of HDL, BLACKBOX "
+            "and MIX\n"
+            "lib_v1_00_a/data/lib_v2_1_0.ldx:2: error: source does not exist: "
+            "lib_v1_00_a/hdl/vhdl/s/m.vhd\n"
+            "lib_v1_00_a/data/lib_v2_1_0.ldx:3: error: source does not exist: "
+            "lib_v1_00_a/hdl/vhdl/x,y.vhd\n"
+            "net_v1_00_a/data/net_v2_1_0.tew:3: error: netlist does not exist: "
+            "net_v1_00_a/netlist/m.edn\n"
+            "net_v1_00_a/data/net_v2_1_0.tew:4: error: netlist does not exist: "
+            "top_v1_00_a/netlist/k.edn\n"
+            "top_v1_00_a/data/top_v2_1_0.ldx:3: error: source does not exist: "
+            "lib_v1_00_a/hdl/vhdl/m.vhd\n"
+            "top_v1_00_a/data/top_v2_1_0.ldx:4: error: source does not exist: "
+            "gone_v1_00_a/hdl/vhdl/g.vhd\n"
+            "5 cores, 7 errors, 1 warning\n");
+  const CommandResult relative = RunCommand("cd " + repo.Path() + "/.. && '" + kKel +
+                                            "' check -L $(basename " + repo.Path() + ") '[n]e[t]'");
+  EXPECT_EQ(relative.output.substr(0, repo.Path().size()), repo.Path());
+  EXPECT_EQ(Check(repo, "nosuch", 1), "0 cores, 0 errors, 0 warnings\n");
 }
 
 // A corrupt core changes no other core's answer.

@@ -196,6 +196,17 @@ TEST(Kel, SuggestsWhatThereIs) {
     EXPECT_EQ(result.status, 1) << arguments;
     EXPECT_NE(result.errors.find(note), std::string::npos) << result.errors;
   }
+  RepositoryBuilder repo;
+  repo.Core("odd_V1_00_A").Qvr("").Ldx("lib odd a.vhd");
+  repo.Core("brok_v1_00_a").Qvr("PORT p");
+  repo.Core("broc_v1_00_a").Qvr("");
+  const CommandResult broken = Kel("show brok -L " + repo.Path());
+  EXPECT_EQ(broken.errors.find("near"), std::string::npos);
+  EXPECT_NE(broken.errors.find("line 1, PORT p"), std::string::npos);
+  EXPECT_EQ(Kel("list '[bo][rd]*[cd]' -L " + repo.Path()).output.substr(0, 12), "broc_v1_00_a");
+  EXPECT_NE(
+      Kel("sources odd --for synthesis --json -L " + repo.Path()).output.find("\"odd_v1_00_a\""),
+      std::string::npos);
   const CommandResult place = Kel("-L overlay -L repository show pulse_counter --section place");
   const std::string hidden = "hides\t" + kExamples + "/repository/ipmods/pulse_counter_v2_00_a\n";
   EXPECT_NE(

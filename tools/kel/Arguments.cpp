@@ -33,7 +33,7 @@ void DescribeList(CLI::App& app, Call& call) {
       AddVerb(app, call, "list",
               "Lists the newest version of each core: key, style, language, location, description",
               "list 'pulse*' --all");
-  list->add_option("GLOB", call.keys, kGlobHelp)->expected(0, 1);
+  list->add_option("GLOB", call.key, kGlobHelp);
   list->add_flag("--all", call.allVersions, "List every version");
 }
 
@@ -98,7 +98,7 @@ void DescribeCheck(CLI::App& app, Call& call) {
 void DescribeHelp(CLI::App& app, Call& call) {
   CLI::App* const help =
       AddVerb(app, call, "help", "Shows this help, or that of a verb", "help list");
-  help->add_option("VERB", call.keys, "The verb")->expected(0, 1);
+  help->add_option("VERB", call.key, "The verb");
 }
 
 void DescribeCall(CLI::App& app, Call& call) {
@@ -156,13 +156,38 @@ std::string VerbOf(const CLI::App& app) {
   return verbs.empty() ? "" : verbs.front()->get_name();
 }
 
-Status ShowHelp(const CLI::App& app, const std::vector<std::string>& verbs) {
+// The parser would take a word in brackets for a list, and a pattern may be one. A mark behind it
+// keeps it a word.
+constexpr char kMark = '\x01';
+
+// The words from the last to the first, as the parser wants them.
+std::vector<std::string> MarkWords(int argc, char** argv) {
+  std::vector<std::string> words(argv + std::min(argc, 1), argv + argc);
+  for (std::string& word : words) {
+    if (!word.empty() && word.front() == '[' && word.back() == ']') word += kMark;
+  }
+  std::reverse(words.begin(), words.end());
+  return words;
+}
+
+void Unmark(std::string& word) {
+  if (!word.empty() && word.back() == kMark) word.pop_back();
+}
+
+void Unmark(Call& call) {
+  for (std::string* const word : {&call.key, &call.relativeTo}) Unmark(*word);
+  for (auto* const words : {&call.keys, &call.libraries, &call.settings}) {
+    for (std::string& word : *words) Unmark(word);
+  }
+}
+
+Status ShowHelp(const CLI::App& app, const std::string& verb) {
   const CLI::App* shown = &app;
-  if (!verbs.empty()) {
+  if (!verb.empty()) {
     try {
-      shown = app.get_subcommand(verbs.front());
+      shown = app.get_subcommand(verb);
     } catch (const CLI::OptionNotFound&) {
-      return Refuse("there is no verb '" + verbs.front() + "'", "");
+      return Refuse("there is no verb '" + verb + "'", "");
     }
   }
   std::cout << shown->help(shown == &app ? "" : "kel");
@@ -176,7 +201,8 @@ std::optional<Call> ReadCall(int argc, char** argv, Status& status) {
   Call call;
   DescribeCall(app, call);
   try {
-    app.parse(argc, argv);
+    app.parse(MarkWords(argc, argv));
+    Unmark(call);
   } catch (const CLI::Success& help) {
     app.exit(help);
     status = StatusClean;
@@ -186,7 +212,7 @@ std::optional<Call> ReadCall(int argc, char** argv, Status& status) {
     return std::nullopt;
   }
   if (call.verb == "help") {
-    status = ShowHelp(app, call.keys);
+    status = ShowHelp(app, call.key);
     return std::nullopt;
   }
   const std::string fault = Fault(app, call);

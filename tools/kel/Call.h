@@ -9,7 +9,7 @@ struct Call {
   std::string verb;
   std::vector<std::string> libraries;
 
-  std::string key;                // of the core that a verb asks
+  std::string key;                // of the core that a verb asks, or one pattern
   std::vector<std::string> keys;  // or keys, or patterns, of several
   std::vector<std::string> sections;
   std::vector<std::string> settings;  // each NAME=VALUE

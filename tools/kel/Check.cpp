@@ -25,19 +25,11 @@ using Tarvo::KelIP;
 using Tarvo::StringBase;
 using Tarvo::StringList;
 
-// All versions that have a directory, those without a description too.
+// All versions that are asked for and have a directory, those without a description too.
 std::set<std::string> Keys(const Call& call) {
   std::set<std::string> keys;
-  for (const std::string& repository : Repositories(call)) {
-    std::error_code error;
-    for (fs::directory_iterator entry(fs::path(repository) / "ipmods", error), end;
-         !error && entry != end; entry.increment(error)) {
-      const Kel_Key key(StringBase(entry->path().filename().c_str()));
-      std::error_code ignored;
-      if (key.IsValid() && entry->is_directory(ignored) && MatchesAny(key, call.keys)) {
-        keys.insert(Text(key.GetKey()));
-      }
-    }
+  for (const VersionDirectory& directory : VersionDirectories(call)) {
+    if (MatchesAny(directory.key, call.keys)) keys.insert(Text(directory.key.GetKey()));
   }
   return keys;
 }
@@ -79,6 +71,7 @@ class Checker {
     findings.Begin(key);
     const std::unique_ptr<KelIP> ip(library.CreateIP(key.c_str()));
     if (!ip) return;
+    CheckStyle(*ip);
     CheckSources(*ip);
     CheckNetlists(*ip);
   }
@@ -92,6 +85,19 @@ class Checker {
   }
 
  private:
+  // A style that is none leaves nothing to open.
+  void CheckStyle(const KelIP& ip) {
+    StringBase style;
+    ip.GetIPProperty(KelIP::KEL_STYLE_OPTION_NAME, style);
+    for (const StringBase* known :
+         {&KelIP::KEL_STYLE_OPTION_VALUE_HDL, &KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX,
+          &KelIP::KEL_STYLE_OPTION_VALUE_MIX}) {
+      if (style.Compare(*known, StringBase::CompareIgnoreCase) == 0) return;
+    }
+    findings.Add({Text(DataFile(ip, Kel_Index::KEL_QVR_EXTENSION).GetName()), 0, "warning",
+                  "the STYLE '" + Text(style) + "' is none of HDL, BLACKBOX and MIX", ""});
+  }
+
   void CheckSources(const KelIP& ip) {
     const Port::FileName file = DataFile(ip, Kel_Index::KEL_LDX_EXTENSION);
     const std::string name = Text(file.GetName());
@@ -100,34 +106,66 @@ class Checker {
     StringList others;
     if (!ip.ListSynthesisSources(paths) || !ip.ListSimulationSources(others)) return;
     paths.insert(paths.end(), others.begin(), others.end());
+    CheckIncludeDirectories(ip, name);
+    std::map<std::string, unsigned> lines;
     for (const StringBase& path : paths) {
       std::error_code error;
-      if (fs::exists(path.GetText(), error)) continue;
+      if (fs::is_regular_file(path.GetText(), error)) continue;
       bool& isPlaced = missing[Text(path)];
-      const unsigned line = FindSource(file, Text(path));
-      if (line == 0) continue;
+      if (isPlaced) continue;
+      if (lines.empty()) lines = SourceLines(file);
+      const auto line = FindSource(lines, Text(path));
+      if (line == lines.end()) continue;
       isPlaced = true;
-      findings.Add({name, line, "error", "source does not exist: " + Text(path), ""});
+      findings.Add({name, line->second, "error", "source does not exist: " + Text(path), ""});
     }
   }
 
-  // The line of the file that lists the source, or 0.
-  static unsigned FindSource(const Port::FileName& file, const std::string& path) {
+  void CheckIncludeDirectories(const KelIP& ip, const std::string& name) {
+    StringList libraries;
+    ip.ListVerilogIncludeLibraries(libraries);
+    for (const StringBase& key : libraries) {
+      StringBase directory;
+      std::error_code error;
+      ip.GetVerilogIncludeLocation(key, directory);
+      if (fs::is_directory(directory.GetText(), error)) continue;
+      findings.Add({name, 0, "error", "include directory is none: " + Text(directory), ""});
+    }
+  }
+
+  // The lines of an analyse order by what they list, a library, a blank and a file.
+  static std::map<std::string, unsigned> SourceLines(const Port::FileName& file) {
+    std::map<std::string, unsigned> found;
     Tarvo::FileScanner lines(file);
     StringBase line;
     for (unsigned number = 0; lines.GetNextLine(line, number);) {
       const std::vector<std::string> fields = Fields(line.View());
       if (fields.size() < 3) continue;
-      for (const char* directory : {"/hdl/vhdl/", "/hdl/verilog/"}) {
-        for (const char* extension : {"", ".vhd", ".v"}) {
-          const std::string end = directory + fields[2] + extension;
-          if (path.size() >= end.size() &&
-              path.compare(path.size() - end.size(), end.size(), end) == 0)
-            return number;
+      const std::string library = Text(Kel_Key(StringBase(std::string_view(fields[1]))).GetKey());
+      found.try_emplace(library + " " + fs::path(fields[2]).lexically_normal().string(), number);
+    }
+    return found;
+  }
+
+  // The line that lists a source: by the key or the bare name of its library, and with or without
+  // its extension.
+  static std::map<std::string, unsigned>::const_iterator FindSource(
+      const std::map<std::string, unsigned>& lines, const std::string& path) {
+    for (const std::string directory : {"/hdl/vhdl/", "/hdl/verilog/"}) {
+      const std::size_t start = path.rfind(directory);
+      if (start == std::string::npos) continue;
+      const fs::path version = fs::path(path.substr(0, start)).filename();
+      const Kel_Key key(StringBase(version.c_str()));
+      const fs::path name = fs::path(path.substr(start + directory.size())).lexically_normal();
+      const fs::path bare = name.parent_path() / name.stem();
+      for (const StringBase* library : {&key.GetKey(), &key.GetName()}) {
+        for (const fs::path& listed : {name, bare}) {
+          const auto line = lines.find(Text(*library) + " " + listed.string());
+          if (line != lines.end()) return line;
         }
       }
     }
-    return 0;
+    return lines.end();
   }
 
   void CheckNetlists(KelIP& ip) {
@@ -139,7 +177,7 @@ class Checker {
     for (const NetlistTable::Row& row : ReadNetlistTable(ip).rows) {
       for (const std::string& path : row.netlists) {
         std::error_code error;
-        if (fs::exists(path, error)) continue;
+        if (fs::is_regular_file(path, error)) continue;
         findings.Add({name, row.line, "error", "netlist does not exist: " + path, ""});
       }
     }
@@ -195,8 +233,13 @@ std::vector<Finding> Walk(Tarvo::KelLibrary& library, const Call& call) {
 }  // namespace
 
 Status Check(Tarvo::KelLibrary& library, const Call& call) {
-  const std::set<std::string> keys = Keys(call);
-  std::vector<Finding> found = Walk(library, call);
+  Call absolute = call;
+  absolute.libraries.clear();
+  for (const std::string& repository : Repositories(call)) {
+    absolute.libraries.push_back(fs::absolute(repository).lexically_normal());
+  }
+  const std::set<std::string> keys = Keys(absolute);
+  std::vector<Finding> found = Walk(library, absolute);
   {
     FindingCollector findings;
     for (const Finding& finding : found) findings.Add(finding);
@@ -211,5 +254,6 @@ Status Check(Tarvo::KelLibrary& library, const Call& call) {
   }
   Write(found, keys.size(), call.asJson);
   if (keys.empty()) Messages::Note("there is no core to check");
+  if (keys.empty() && call.keys.empty()) return StatusUnreadable;
   return found.empty() && !keys.empty() ? StatusClean : StatusFindings;
 }

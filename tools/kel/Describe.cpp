@@ -152,27 +152,14 @@ Json Interfaces(const KelIP& ip) {
   return interfaces;
 }
 
-// The directories of a version in the repositories of a call, in their order.
-std::vector<std::string> Directories(const Call& call, const Kel_Key& key) {
-  std::vector<std::string> directories;
-  for (const std::string& repository : Repositories(call)) {
-    std::error_code error;
-    const fs::path versions = fs::absolute(repository) / "ipmods";
-    for (fs::directory_iterator entry(versions, error), end; !error && entry != end;
-         entry.increment(error)) {
-      const Kel_Key other(StringBase(entry->path().filename().c_str()));
-      if (other == key && entry->is_directory(error)) directories.push_back(entry->path());
-    }
-  }
-  return directories;
-}
-
 Json Place(const KelLibrary& library, const Call& call, const KelIP& ip) {
   const Kel_Key key(ip.GetKey());
   const std::string location = Text(ip.GetLocation());
   Json hidden = Json::array();
-  for (const std::string& directory : Directories(call, key)) {
-    if (directory != location) hidden.push_back(directory);
+  for (const VersionDirectory& directory : VersionDirectories(call)) {
+    std::error_code error;
+    const bool isOwn = fs::equivalent(directory.path, location, error);
+    if (directory.key == key && !isOwn) hidden.push_back(directory.path);
   }
   Json others = Json::array();
   StringList keys;

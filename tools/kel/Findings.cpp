@@ -6,6 +6,7 @@
 #include <sstream>
 #include <tuple>
 
+#include "Messages.h"
 #include "Tarvo_DebugMessenger.h"
 #include "Text.h"
 
@@ -106,6 +107,7 @@ void FindingCollector::Begin(const std::string& file) {
 }
 
 void FindingCollector::TakeTrace(const std::string& text) {
+  Messages::Trace(text);
   const std::string start = "  Parsing LDX File ";
   if (BeginsWith(text, start)) {
     reading.push_back(text.substr(start.size(), text.size() - start.size() - 1));
@@ -125,6 +127,11 @@ void FindingCollector::TakeMessage(const Port_Message& message) {
     pending.push_back({"", 0, kError, lines[0], ""});
   } else {
     const bool isWarning = message.severity == Port_Message::Warning;
+    const std::string start = "Unable to add directory ";
+    const std::string end = " to library";
+    if (BeginsWith(lines[0], start) && lines[0].size() > start.size() + end.size()) {
+      subject = lines[0].substr(start.size(), lines[0].size() - start.size() - end.size());
+    }
     Add({reading.empty() ? subject : reading.back(), 0, isWarning ? kWarning : kError,
          WithoutSide(lines[0]), ""});
   }

@@ -85,7 +85,7 @@ void WriteJsonList(const SourceList& list) {
 
 // Comments name the libraries, which the format can't say.
 void WriteFileList(const SourceList& list) {
-  const std::string_view special = " \t\\\"";
+  const std::string_view special = " \t\\\"$";
   for (const IncludeDirectory& directory : list.includeDirectories) {
     std::cout << "+incdir+" << Backslashed(directory.path, special) << '\n';
   }

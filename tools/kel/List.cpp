@@ -47,7 +47,9 @@ Status List(const KelLibrary& library, const Call& call) {
   Table table;
   Json cores = Json::array();
   StringBase core;
-  for (const Kel_Key& key : Versions(library, call.keys)) {
+  std::vector<std::string> globs;
+  if (!call.key.empty()) globs.push_back(call.key);
+  for (const Kel_Key& key : Versions(library, globs)) {
     const bool newest = cores.empty() || key.GetName() != core;
     core = key.GetName();
     if (!newest && !call.allVersions) continue;
@@ -70,7 +72,7 @@ Status List(const KelLibrary& library, const Call& call) {
   } else {
     table.Write();
   }
-  if (!cores.empty() || call.keys.empty()) return StatusClean;
-  Messages::Note("no core fits '" + call.keys.front() + "'");
+  if (!cores.empty() || globs.empty()) return StatusClean;
+  Messages::Note("no core fits '" + call.key + "'");
   return StatusFindings;
 }

@@ -19,6 +19,7 @@ namespace {
 int errorCount = 0;
 bool isQuiet = false;
 bool isColoured = false;
+bool withTraces = false;
 std::set<std::string> shownTexts;
 
 struct Lead {
@@ -66,9 +67,14 @@ void Install(const Call& call) {
   isQuiet = call.quiet;
   isColoured = WantsColour(call.color);
   Port_MsgManData::setHandler(ShowMessage);
-  if (!call.withTraces) return;
+  withTraces = call.withTraces;
+  if (!withTraces) return;
   Tarvo::DebugMessengerFactory::GetLogger("BaseIP")->SetSink(
-      [](const Tarvo::StringBase& text) { Show(kTrace, Text(text)); });
+      [](const Tarvo::StringBase& text) { Trace(Text(text)); });
+}
+
+void Trace(const std::string& text) {
+  if (withTraces) Show(kTrace, text);
 }
 
 void Note(const std::string& text) { Show(kNote, text); }

@@ -13,6 +13,9 @@ namespace Messages {
 // Shows messages from here on, as the call asks for.
 void Install(const Call& call);
 
+// Shows a trace, if the call asks for traces.
+void Trace(const std::string& text);
+
 // The command's own words, which change no status.
 void Note(const std::string& text);
 

@@ -8,12 +8,12 @@
 #include "Messages.h"
 #include "Tarvo_Kel_Key.h"
 #include "Text.h"
+#include "Verbs.h"
 
 namespace {
 
 using Tarvo::Kel_Key;
 using Tarvo::StringBase;
-using Tarvo::StringList;
 
 // How many letters must be added, left out or changed to make one text of the other.
 std::size_t Distance(const std::string& left, const std::string& right) {
@@ -32,6 +32,7 @@ std::size_t Distance(const std::string& left, const std::string& right) {
 
 // A third of the letters may be wrong, and a name that goes on behind the text is near as well.
 bool IsNear(const std::string& name, const std::string& text) {
+  if (text.empty()) return false;
   return name.rfind(text, 0) == 0 ||
          Distance(name, text) <= std::max<std::size_t>(1, text.size() / 3);
 }
@@ -44,24 +45,23 @@ std::string Join(const std::set<std::string>& texts) {
 
 }  // namespace
 
-void SuggestKeys(const Tarvo::KelLibrary& library, const std::string& key) {
-  StringList known;
-  library.ListAllIPKeys(known);
+void SuggestKeys(const Call& call, const std::string& key) {
   const Kel_Key asked{StringBase(key.c_str())};
+  StringBase wanted = asked.GetName();
+  wanted.MakeLower();
   std::set<std::string> versions;
   std::set<std::string> names;
-  for (const StringBase& text : known) {
-    const Kel_Key other(text);
-    if (other == asked) return;
-    if (other.GetName() == asked.GetName()) versions.insert(Text(text));
-    StringBase lower = other.GetName();
-    StringBase wanted = asked.GetName();
-    lower.MakeLower();
-    wanted.MakeLower();
-    if (IsNear(Text(lower), Text(wanted))) names.insert(Text(other.GetName()));
+  for (const VersionDirectory& directory : VersionDirectories(call)) {
+    StringBase name = directory.key.GetName();
+    if (name == asked.GetName()) {
+      if (!asked.IsValid() || directory.key == asked) return;
+      versions.insert(Text(directory.key.GetKey()));
+    }
+    name.MakeLower();
+    if (IsNear(Text(name), Text(wanted))) names.insert(Text(directory.key.GetName()));
   }
   if (!versions.empty()) {
-    if (asked.IsValid()) Messages::Note("the versions of this core are " + Join(versions));
+    Messages::Note("the versions of this core are " + Join(versions));
   } else if (!names.empty()) {
     Messages::Note("a near name is " + Join(names));
   }

@@ -1,6 +1,7 @@
 #include "NetlistTable.h"
 
 #include <algorithm>
+#include <map>
 #include <utility>
 
 #include "Tarvo_AppException.h"
@@ -30,7 +31,7 @@ std::vector<Line> ReadLines(const Port::FileName& file) {
     Tarvo::FileScanner scanner(file);
     StringBase text;
     for (unsigned number = 0; scanner.GetNextLine(text, number);) {
-      if (text.GetLength() > 0) lines.push_back({number, Fields(text.View())});
+      if (text.GetLength() > 0) lines.push_back({number, Fields(text.View(), ",")});
     }
   } catch (const Tarvo::AppException&) {
     lines.clear();
@@ -70,6 +71,23 @@ void SetValues(KelIP& ip, const Values& names, const Values& values) {
   }
 }
 
+// Those of the netlists that the files of a line name, each as NAME or LIBRARY:NAME.
+std::vector<std::string> Choose(const StringList& netlists, const std::vector<std::string>& files) {
+  std::vector<std::string> chosen;
+  for (const std::string& file : files) {
+    const std::string name = "/netlist/" + file.substr(file.find(':') + 1);
+    for (const StringBase& netlist : netlists) {
+      const std::string path = Text(netlist);
+      const bool ends = path.size() >= name.size() &&
+                        path.compare(path.size() - name.size(), name.size(), name) == 0;
+      if (!ends || std::find(chosen.begin(), chosen.end(), path) != chosen.end()) continue;
+      chosen.push_back(path);
+      break;
+    }
+  }
+  return chosen;
+}
+
 }  // namespace
 
 Port::FileName DataFile(const KelIP& ip, const StringBase& extension) {
@@ -86,19 +104,20 @@ NetlistTable ReadNetlistTable(KelIP& ip) {
   });
   if (line == lines.end()) return {};
   const Values current = CurrentValues(ip, table.parameters);
+  std::map<Values, StringList> answers;
+  const auto columns = static_cast<std::ptrdiff_t>(table.parameters.size());
   for (++line; line != lines.end(); ++line) {
     if (line->fields.size() <= table.parameters.size()) continue;
-    const auto columns = static_cast<std::ptrdiff_t>(table.parameters.size());
-    Values values(line->fields.begin(), line->fields.begin() + columns);
-    const bool known = std::any_of(table.rows.begin(), table.rows.end(),
-                                   [&](const auto& row) { return row.values == values; });
-    if (known) continue;
-    SetValues(ip, table.parameters, values);
-    StringList netlists;
-    ip.ListNetlists(netlists);
+    const auto files = line->fields.begin() + columns;
+    Values values(line->fields.begin(), files);
+    const auto [answer, isNew] = answers.try_emplace(values);
+    if (isNew) {
+      SetValues(ip, table.parameters, values);
+      ip.ListNetlists(answer->second);
+    }
     const bool applies = values == current;
-    table.rows.push_back({line->number, std::move(values), {}, applies});
-    for (const StringBase& netlist : netlists) table.rows.back().netlists.push_back(Text(netlist));
+    table.rows.push_back({line->number, std::move(values),
+                          Choose(answer->second, {files, line->fields.end()}), applies});
   }
   SetValues(ip, table.parameters, current);
   return table;

@@ -7,8 +7,8 @@
 #include "Port_FileName.h"
 #include "Tarvo_KelIP.h"
 
-// The whole table of a core's netlists, found by asking the instance at each combination of values
-// that its file names. A combination that several lines share stands once, at its first line.
+// The whole table of a core's netlists, a row for each line of its file, found by asking the
+// instance at each combination of values that the file names.
 struct NetlistTable {
   struct Row {
     unsigned line;

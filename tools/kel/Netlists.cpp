@@ -66,7 +66,7 @@ void WriteList(const KelIP& ip, const Tarvo::StringList& paths, bool asJson) {
 // Netlists for other values than those that were asked for would be a wrong answer, so there are
 // none if a parameter is unknown.
 Status Netlists(const Tarvo::KelLibrary& library, const Call& call) {
-  const std::unique_ptr<KelIP> ip = OpenCore(library, call.key);
+  const std::unique_ptr<KelIP> ip = OpenCore(library, call);
   if (!ip || !SetParameters(*ip, call.settings)) return StatusFindings;
   Tarvo::StringList paths;
   if (!AskForFiles(*ip, &KelIP::ListNetlists, "netlists", paths)) return StatusFindings;

@@ -11,6 +11,7 @@
 namespace {
 
 namespace fs = std::filesystem;
+using Tarvo::Kel_Key;
 using Tarvo::KelIP;
 using Tarvo::StringBase;
 using Tarvo::StringList;
@@ -28,6 +29,18 @@ std::string Relative(const StringBase& path, const std::string& directory) {
   const std::string relative = fs::path(Text(path)).lexically_normal().lexically_relative(base);
   const bool isPlain = relative.find_first_of("-+#/") != 0;
   return isPlain ? relative : "./" + relative;
+}
+
+// A library whose directory does not bear its key's normal text is told by that directory.
+std::string Library(const KelIP& ip, const StringBase& source, const StringList& directories) {
+  std::string library = Property(ip, source, KelIP::KEL_HDL_LIBRARY_PROPERTY);
+  if (!library.empty()) return library;
+  const std::string path = Text(source);
+  for (const StringBase& directory : directories) {
+    if (path.rfind(Text(directory) + "/", 0) != 0) continue;
+    return Text(Kel_Key(StringBase(fs::path(Text(directory)).filename().c_str())).GetKey());
+  }
+  return "";
 }
 
 // A source whose extension tells no language lies in the directory of the one that it was given.
@@ -57,17 +70,20 @@ std::vector<IncludeDirectory> IncludeDirectories(const KelIP& ip, const std::str
 }  // namespace
 
 Status Sources(const Tarvo::KelLibrary& library, const Call& call) {
-  const std::unique_ptr<KelIP> ip = OpenCore(library, call.key);
+  const std::unique_ptr<KelIP> ip = OpenCore(library, call);
   if (!ip) return StatusFindings;
-  const auto question =
-      call.purpose == "simulation" ? &KelIP::ListSimulationSources : &KelIP::ListSynthesisSources;
+  const bool isSimulation = call.purpose == "simulation";
+  const auto question = isSimulation ? &KelIP::ListSimulationSources : &KelIP::ListSynthesisSources;
+  const auto directories =
+      isSimulation ? &KelIP::ListSimulationLibraries : &KelIP::ListSynthesisLibraries;
   SourceList list = {Text(ip->GetKey()), call.purpose, {}, {}};
   StringList paths;
   if (!AskForFiles(*ip, question, "sources", paths)) return StatusFindings;
+  StringList libraries;
+  ((*ip).*directories)(libraries);
   for (const StringBase& path : paths) {
-    list.sources.push_back({Relative(path, call.relativeTo),
-                            Property(*ip, path, KelIP::KEL_HDL_LIBRARY_PROPERTY),
-                            Language(*ip, path)});
+    list.sources.push_back(
+        {Relative(path, call.relativeTo), Library(*ip, path, libraries), Language(*ip, path)});
   }
   if (!paths.empty()) list.includeDirectories = IncludeDirectories(*ip, call.relativeTo);
   const std::string format = call.asJson ? "json" : call.format.empty() ? "list" : call.format;

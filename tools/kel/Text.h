@@ -14,8 +14,8 @@ inline std::string Text(const Tarvo::StringBase& text) { return std::string(text
 // obeys nothing that a file held.
 std::string Printable(std::string_view text);
 
-// The fields of a line of a data file: words between blanks or commas, a comma being a field of its
+// The fields of a line of a data file: words between blanks, each of the marks being a field of its
 // own, and what stands between quotes.
-std::vector<std::string> Fields(std::string_view line);
+std::vector<std::string> Fields(std::string_view line, const std::string& marks = "");
 
 #endif

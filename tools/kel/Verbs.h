@@ -30,8 +30,8 @@ Status Sources(const Tarvo::KelLibrary& library, const Call& call);
 // The netlists of a core that apply to the values that the call sets.
 Status Netlists(const Tarvo::KelLibrary& library, const Call& call);
 
-// What is wrong with the cores, found by opening all that belongs to them. Takes the messages of
-// the library over; those that came before are given.
+// What is wrong with the cores, found by opening all that belongs to them. Sets the repository path
+// itself, and takes the messages of the library over.
 Status Check(Tarvo::KelLibrary& library, const Call& call);
 
 // What the verbs share.
@@ -39,13 +39,21 @@ Status Check(Tarvo::KelLibrary& library, const Call& call);
 // Whether the key or its base name fits one of the patterns; true for none.
 bool MatchesAny(const Tarvo::Kel_Key& key, const std::vector<std::string>& globs);
 
-// Opens a core, or suggests other keys.
-std::unique_ptr<Tarvo::KelIP> OpenCore(const Tarvo::KelLibrary& library, const std::string& key);
+// Opens the core of a call, or suggests other keys.
+std::unique_ptr<Tarvo::KelIP> OpenCore(const Tarvo::KelLibrary& library, const Call& call);
 
 // Asks for the paths of a core's sources or netlists. A core whose style has none gives an empty
 // list and a note that says so. False for a failure.
 bool AskForFiles(const Tarvo::KelIP& ip, bool (Tarvo::KelIP::*question)(Tarvo::StringList&) const,
                  const char* what, Tarvo::StringList& paths);
+
+// A directory of a repository whose name is a key.
+struct VersionDirectory {
+  Tarvo::Kel_Key key;
+  std::string path;
+};
+// Those of all repositories of a call, in the order of the repositories.
+std::vector<VersionDirectory> VersionDirectories(const Call& call);
 
 // The repositories of a call, in their order.
 std::vector<std::string> Repositories(const Call& call);

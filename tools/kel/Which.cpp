@@ -23,7 +23,7 @@ Status Which(const Tarvo::KelLibrary& library, const Call& call) {
     const StringBase text = asked.c_str();
     const std::string location = Text(library.GetLocation(text));
     if (location.empty()) {
-      SuggestKeys(library, asked);
+      SuggestKeys(call, asked);
       continue;
     }
     const std::string key = Text(Resolve(library, text));

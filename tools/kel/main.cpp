@@ -55,7 +55,8 @@ using Verb = Status (*)(const Tarvo::KelLibrary&, const Call&);
 const std::map<std::string, Verb> kVerbs = {
     {"list", List}, {"which", Which}, {"show", Show}, {"sources", Sources}, {"netlists", Netlists}};
 
-// Answers from whatever could be read: what could not has its message, and shows in the status.
+// Answers from whatever could be read: what could not has its message, and shows in the status,
+// unless it is another core than those that are asked for.
 Status Run(const Call& call) {
   Messages::Install(call);
   Tarvo::KelLibrary library;
@@ -64,8 +65,9 @@ Status Run(const Call& call) {
   if (!library.SetRepositoryPath(path) && (!IsPath(path) || IsEmpty(library))) {
     return StatusUnreadable;
   }
+  const int walkErrors = call.verb == "list" ? 0 : Messages::ErrorCount();
   const Status status = kVerbs.at(call.verb)(library, call);
-  return Messages::ErrorCount() == 0 ? status : StatusFindings;
+  return Messages::ErrorCount() == walkErrors ? status : StatusFindings;
 }
 
 // Whoever reads standard output may close it when he has read enough.
