@@ -50,7 +50,7 @@ void DescribeShow(CLI::App& app, Call& call) {
       "show event_station --section ports");
   AddKey(show, call);
   show->add_option("--section", call.sections, "One of these alone; may be repeated")
-      ->check(CLI::IsMember(kSections))
+      ->check(CLI::IsMember(SectionNames()))
       ->allow_extra_args(false);
 }
 

@@ -1,7 +1,6 @@
 #include "Describe.h"
 
 #include <algorithm>
-#include <cstddef>
 #include <filesystem>
 #include <set>
 #include <string_view>
@@ -176,23 +175,37 @@ Json Place(const KelLibrary& library, const Call& call, const KelIP& ip) {
           {"other_versions", others}};
 }
 
-using Section = Json (*)(const KelIP&);
-const Section kSectionMakers[] = {Options, Parameters, Ports, Interfaces};
+// A section that the instance alone can tell.
+template <Json (*Tell)(const KelIP&)>
+Json OfInstance(const KelLibrary& /*library*/, const Call& /*call*/, const KelIP& ip) {
+  return Tell(ip);
+}
+
+struct Section {
+  const char* name;
+  Json (*make)(const KelLibrary& library, const Call& call, const KelIP& ip);
+};
+const Section kMakers[] = {{"place", Place},
+                           {"options", OfInstance<Options>},
+                           {"parameters", OfInstance<Parameters>},
+                           {"ports", OfInstance<Ports>},
+                           {"interfaces", OfInstance<Interfaces>}};
 
 }  // namespace
 
-const std::vector<std::string> kSections = {"place", "options", "parameters", "ports",
-                                            "interfaces"};
+std::vector<std::string> SectionNames() {
+  std::vector<std::string> names;
+  for (const Section& section : kMakers) names.emplace_back(section.name);
+  return names;
+}
 
-Json Describe(const KelLibrary& library, const Call& call, const KelIP& ip,
-              const std::vector<std::string>& sections) {
-  const auto wanted = [&](const std::string& section) {
-    return std::find(sections.begin(), sections.end(), section) != sections.end();
-  };
+Json Describe(const KelLibrary& library, const Call& call, const KelIP& ip) {
   Json core = {{"key", Text(ip.GetKey())}};
-  if (wanted(kSections.front())) core[kSections.front()] = Place(library, call, ip);
-  for (std::size_t i = 1; i < kSections.size(); ++i) {
-    if (wanted(kSections[i])) core[kSections[i]] = kSectionMakers[i - 1](ip);
+  for (const Section& section : kMakers) {
+    const auto& chosen = call.sections;
+    const bool isWanted =
+        chosen.empty() || std::find(chosen.begin(), chosen.end(), section.name) != chosen.end();
+    if (isWanted) core[section.name] = section.make(library, call, ip);
   }
   return core;
 }

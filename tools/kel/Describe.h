@@ -10,10 +10,11 @@
 #include "Tarvo_KelLibrary.h"
 
 // The names of the sections that a description of a core has.
-extern const std::vector<std::string> kSections;
+std::vector<std::string> SectionNames();
 
-// What a core is: its key, and a member for each of these sections, in the order of the core
-// description. Of namesakes the first alone counts, for records, properties and options alike.
+// What a core is: its key, and a member for each section that the call names, or for all of them,
+// in the order of the core description. Of namesakes the first alone counts, for records,
+// properties and options alike.
 //
 //     place        name, version, location, the repository that it comes from, the directories of
 //                  other repositories that it hides, and the keys of the core's other versions
@@ -21,7 +22,6 @@ extern const std::vector<std::string> kSections;
 //     parameters   name, value, default_value, generic (or not), properties
 //     ports        name, direction, vector, default, interfaces, properties
 //     interfaces   name, kind ("bus" or "io"), parameters and ports that belong to it, properties
-Json Describe(const Tarvo::KelLibrary& library, const Call& call, const Tarvo::KelIP& ip,
-              const std::vector<std::string>& sections);
+Json Describe(const Tarvo::KelLibrary& library, const Call& call, const Tarvo::KelIP& ip);
 
 #endif

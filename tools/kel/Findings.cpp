@@ -42,9 +42,9 @@ std::optional<BadLine> ReadBadLine(const std::string& message) {
   const std::size_t comma = message.find(", ", number == std::string::npos ? 0 : number);
   if (start != 3 || number == std::string::npos || comma == std::string::npos) return std::nullopt;
   const std::string digits = message.substr(number + 6, comma - number - 6);
-  if (digits.empty() || digits.find_first_not_of("0123456789") != std::string::npos) {
-    return std::nullopt;
-  }
+  constexpr std::size_t longest = 9;
+  if (digits.empty() || digits.size() > longest) return std::nullopt;
+  if (digits.find_first_not_of("0123456789") != std::string::npos) return std::nullopt;
   const std::string what = message.substr(start + 1, file - start - 1);
   return BadLine{message.substr(file + 2, number - file - 2),
                  static_cast<unsigned>(std::stoul(digits)),
@@ -171,14 +171,14 @@ void FindingCollector::TakeWrapped(const std::string& text, const std::string& r
 }
 
 std::vector<Finding> FindingCollector::Take() const {
-  const auto hasOwn = [&](const Finding& finding) {
-    return std::any_of(findings.begin(), findings.end(), [&](const Finding& other) {
-      return other.file == finding.cause && other.cause != other.file;
-    });
-  };
+  std::set<std::string> filesWithFaults;
+  for (const Finding& finding : findings) {
+    if (finding.cause != finding.file) filesWithFaults.insert(finding.file);
+  }
   std::vector<Finding> taken;
   for (const Finding& finding : findings) {
-    if (finding.cause.empty() || !hasOwn(finding)) taken.push_back(finding);
+    const bool follows = !finding.cause.empty() && filesWithFaults.contains(finding.cause);
+    if (!follows) taken.push_back(finding);
   }
   return taken;
 }

@@ -76,7 +76,7 @@ void WriteTables(const Json& core, bool withHeadings) {
 Status Show(const Tarvo::KelLibrary& library, const Call& call) {
   const std::unique_ptr<Tarvo::KelIP> ip = OpenCore(library, call);
   if (!ip) return StatusFindings;
-  const Json core = Describe(library, call, *ip, call.sections.empty() ? kSections : call.sections);
+  const Json core = Describe(library, call, *ip);
   if (call.asJson) {
     WriteJson(core);
   } else {
