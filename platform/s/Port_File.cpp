@@ -7,8 +7,9 @@
 #include <algorithm>
 #include <cerrno>
 #include <climits>
-#include <cstring>
+#include <memory>
 #include <stdexcept>
+#include <utility>
 
 namespace Port {
 
@@ -16,7 +17,25 @@ namespace {
 
 constexpr std::string_view kByteOrderMark = "\xEF\xBB\xBF";
 
+// How much to ask of a file that does not tell its length.
+constexpr std::size_t kFirstBytes = 4096;
+
+bool IsRegular(const char* name) noexcept {
+  struct stat status = {};
+  return ::stat(name, &status) == 0 && S_ISREG(status.st_mode);
+}
+
 }  // namespace
+
+std::string_view TakeLine(std::string_view& text) {
+  const std::size_t end = text.find('\n');
+  const bool ended = end != std::string_view::npos;
+  std::string_view line = text.substr(0, end);
+  if (ended && !line.empty() && line.back() == '\r') line.remove_suffix(1);
+  if (line.size() >= StringBase<char>::All) throw std::length_error("line of more than 4 GiB");
+  text.remove_prefix(ended ? end + 1 : text.size());
+  return line;
+}
 
 Stream::~Stream() { Close(); }
 
@@ -27,63 +46,60 @@ bool Stream::Close() noexcept {
   return open < 0 || ::close(open) == 0;
 }
 
-// Without O_NONBLOCK a pipe that took the file's place would block until somebody writes to it.
+// Nothing else is opened at all, since that alone may set a device or a pipe's writer going.
+// Without O_NONBLOCK a pipe that took the file's place meanwhile would block until somebody writes
+// to it.
 bool Stream::Open(const char* name) noexcept {
+  if (!IsRegular(name)) return false;
   descriptor = ::open(name, O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK);
   return descriptor >= 0;
 }
 
-void Stream::Grow() {
-  const std::size_t grown = 2 * capacity;
-  std::unique_ptr<char[]> larger(new char[grown]);
-  std::memcpy(larger.get(), content.get(), size);
-  content = std::move(larger);
-  capacity = grown;
-}
-
-// One byte more than the file's length lets the end show without growing. The length is only where
-// to begin: some file systems give 0 for files with content, and a file may grow meanwhile.
+// Up to the length that the file has now: what is added meanwhile does not count.
 bool Stream::ReadAll() {
   struct stat status = {};
   if (::fstat(descriptor, &status) != 0 || !S_ISREG(status.st_mode)) return false;
-  capacity = static_cast<std::size_t>(status.st_size) + 1;
-  content.reset(new char[capacity]);
+  content.resize(static_cast<std::size_t>(status.st_size));
   if (!ReadBytes()) return false;
-  if (std::string_view(content.get(), size).substr(0, kByteOrderMark.size()) == kByteOrderMark) {
+  if (std::string_view(content).substr(0, kByteOrderMark.size()) == kByteOrderMark) {
     position = kByteOrderMark.size();
   }
   return true;
 }
 
+// Fills the content. One of no length grows until the end shows: some file systems give 0 for files
+// with content.
 bool Stream::ReadBytes() {
-  for (;;) {
-    if (size == capacity) Grow();
-    const ssize_t count = ::read(descriptor, content.get() + size, capacity - size);
-    if (count == 0) return true;
+  const bool lengthKnown = !content.empty();
+  std::size_t size = 0;
+  while (!lengthKnown || size < content.size()) {
+    if (size == content.size()) content.resize(std::max(2 * size, kFirstBytes));
+    const ssize_t count = ::read(descriptor, content.data() + size, content.size() - size);
+    if (count == 0) break;
     if (count < 0 && errno != EINTR) return false;
     if (count > 0) size += static_cast<std::size_t>(count);
   }
+  content.resize(size);
+  return true;
 }
 
 int Stream::readline(StringBase<char>& line) {
   line.Empty();
   if (geteof()) return -1;
-  const char* const start = content.get() + position;
-  const std::size_t left = size - position;
-  const auto* const end = static_cast<const char*>(std::memchr(start, '\n', left));
-  std::size_t length = end ? static_cast<std::size_t>(end - start) : left;
-  const std::size_t next = position + (end ? length + 1 : length);
-  if (end && length > 0 && start[length - 1] == '\r') --length;
-  if (length >= StringBase<char>::All) throw std::length_error("line of more than 4 GiB");
-  line.Assign(start, static_cast<unsigned>(length));
-  position = next;
-  return static_cast<int>(std::min<std::size_t>(length, INT_MAX));
+  std::string_view rest = std::string_view(content).substr(position);
+  const std::string_view found = TakeLine(rest);
+  line.Assign(found.data(), static_cast<unsigned>(found.size()));
+  position = content.size() - rest.size();
+  return static_cast<int>(std::min<std::size_t>(found.size(), INT_MAX));
+}
+
+std::string Stream::TakeRest() {
+  content.erase(0, std::exchange(position, 0));
+  return std::exchange(content, {});
 }
 
 bool File::canread(const char* name) noexcept {
-  struct stat status = {};
-  return ::stat(name, &status) == 0 && S_ISREG(status.st_mode) &&
-         ::faccessat(AT_FDCWD, name, R_OK, AT_EACCESS) == 0;
+  return IsRegular(name) && ::faccessat(AT_FDCWD, name, R_OK, AT_EACCESS) == 0;
 }
 
 Stream* File::open(const char* name, Access /*access*/, bool /*reserved*/) {
