@@ -2,14 +2,15 @@
 
 include_guard()
 
-# Language level, visibility and warnings of our own sources. GCC 12 sees an overlap in its own
-# library's string concatenation, so that one warning is off.
+# Language level, visibility and warnings of our own sources. Nobody is to exchange a library's
+# operations for others when it is loaded, so it calls its own directly. GCC 12 sees an overlap in its
+# own library's string concatenation, so that one warning is off.
 function(kel_settings target)
   set_target_properties(${target} PROPERTIES
     CXX_STANDARD 20 CXX_STANDARD_REQUIRED ON CXX_EXTENSIONS OFF
     CXX_VISIBILITY_PRESET hidden VISIBILITY_INLINES_HIDDEN ON
     POSITION_INDEPENDENT_CODE ON)
-  target_compile_options(${target} PRIVATE
+  target_compile_options(${target} PRIVATE -fno-semantic-interposition
     -Wall -Wextra -Wpedantic -Wshadow -Wconversion -Wformat=2 -Wnon-virtual-dtor -Wold-style-cast
     -Wcast-qual -Woverloaded-virtual $<$<CXX_COMPILER_ID:GNU>:-Wno-restrict>
     $<$<BOOL:${KEL_WARNINGS_AS_ERRORS}>:-Werror>)

@@ -143,9 +143,11 @@ inline std::strong_ordering operator<=>(const StringBase<char>& left, const char
 
 }  // namespace Port
 
+// Not noexcept: so the standard library keeps the hash of each text in a table, as it does for its
+// own strings, and hashes none again when it looks along a bucket.
 template <>
 struct std::hash<Port::StringBase<char>> {
-  std::size_t operator()(const Port::StringBase<char>& text) const noexcept {
+  std::size_t operator()(const Port::StringBase<char>& text) const {
     return std::hash<std::string_view>()(text.View());
   }
 };
