@@ -1,6 +1,7 @@
 #ifndef TARVO_QVRPARSER_H
 #define TARVO_QVRPARSER_H
 
+#include <string_view>
 #include <vector>
 
 #include "Port_FileName.h"
@@ -153,11 +154,11 @@ class TARVO_EXPORT QVRParser {
  private:
   using Records = std::vector<QVRRecord>;
 
-  TARVO_LOCAL bool ReadStatement(const StringBase& keyword, const StringBase& line);
-  TARVO_LOCAL bool ReadOption(const StringBase& line);
-  TARVO_LOCAL bool ReadParameter(const StringBase& line);
-  TARVO_LOCAL bool ReadPort(const StringBase& line);
-  TARVO_LOCAL static bool ReadInterface(const StringBase& line, const StringBase& key,
+  TARVO_LOCAL bool ReadStatement(std::string_view keyword, std::string_view line);
+  TARVO_LOCAL bool ReadOption(std::string_view line);
+  TARVO_LOCAL bool ReadParameter(std::string_view line);
+  TARVO_LOCAL bool ReadPort(std::string_view line);
+  TARVO_LOCAL static bool ReadInterface(std::string_view line, const StringBase& key,
                                         Records& interfaces);
 
   PropertyList options;

@@ -1,6 +1,7 @@
 #ifndef TARVO_TEWPARSER_H
 #define TARVO_TEWPARSER_H
 
+#include <string_view>
 #include <unordered_set>
 #include <vector>
 
@@ -86,9 +87,9 @@ class TARVO_EXPORT TEWParser {
   using NameSet = std::unordered_set<StringBase>;
 
   TARVO_LOCAL void Parse(const Port::FileName& tewFile, const Kel_Key& key);
-  TARVO_LOCAL Result ParseHeader(const StringBase& line, const NameSet& parameterNames);
-  TARVO_LOCAL Result ParseFileEntry(const StringBase& line, const Kel_Key& key);
-  TARVO_LOCAL Netlist MakeNetlist(const StringBase& file, const Kel_Key& key) const;
+  TARVO_LOCAL Result ParseHeader(std::string_view line, const NameSet& parameterNames);
+  TARVO_LOCAL Result ParseFileEntry(std::string_view line, const Kel_Key& key);
+  TARVO_LOCAL Netlist MakeNetlist(std::string_view name, const Kel_Key& key) const;
   TARVO_LOCAL StringList GetParameterValues() const;
   TARVO_LOCAL std::vector<const Netlist*> Select() const;
 

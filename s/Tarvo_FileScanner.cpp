@@ -1,6 +1,7 @@
 #include "Tarvo_FileScanner.h"
 
 #include <memory>
+#include <string_view>
 
 #include "Port_File.h"
 #include "Tarvo_Report.h"
@@ -14,22 +15,37 @@ struct Closer {
 };
 using OpenStream = std::unique_ptr<Port::Stream, Closer>;
 
-// The comment goes first, so that a tab in it is not counted. Gives the number of tabs.
-unsigned Clean(StringBase& line) {
-  const unsigned comment = line.GetIndexOfFirstChar('#');
-  if (comment != StringBase::None) line.Assign(line.GetText(), comment);
-  const unsigned tabs = line.ReplaceChars('\t', ' ');
-  line.Trim(" \t", StringBase::TrimBoth);
-  return tabs;
+constexpr char kComment = '#';
+constexpr char kTab = '\t';
+
+constexpr bool IsBlank(char c) { return c == ' ' || c == kTab; }
+
+std::string_view WithoutBlanks(std::string_view line) {
+  while (!line.empty() && IsBlank(line.back())) line.remove_suffix(1);
+  while (!line.empty() && IsBlank(line.front())) line.remove_prefix(1);
+  return line;
 }
 
+// Whether a tab stands in front of a line's comment. From a tab in a comment, the search goes on at
+// the next line.
+bool HasTabs(std::string_view text) noexcept {
+  std::size_t tab = text.find(kTab);
+  while (tab != std::string_view::npos) {
+    const std::size_t start = text.rfind('\n', tab) + 1;
+    if (text.find(kComment, start) > tab) return true;
+    tab = text.find(kTab, text.find('\n', tab));
+  }
+  return false;
+}
+
+// Whether it can be read is asked only where it could not be opened.
 OpenStream Open(const StringBase& name) {
+  OpenStream stream(Port::File::open(name, Port::File::Read));
+  if (stream) return stream;
   if (!Port::File::canread(name)) {
     throw Report::Exception(AppException::Failure, "Cannot read file %s\n", name);
   }
-  OpenStream stream(Port::File::open(name, Port::File::Read));
-  if (!stream) throw Report::Exception(AppException::Failure, "Cannot open file %s\n", name);
-  return stream;
+  throw Report::Exception(AppException::Failure, "Cannot open file %s\n", name);
 }
 
 }  // namespace
@@ -37,13 +53,8 @@ OpenStream Open(const StringBase& name) {
 FileScanner::FileScanner(const Port::FileName& file) : fileName(file.GetName()) {
   TARVO_TRACE("Opening File %s\n", fileName);
   OpenStream stream = Open(fileName);
-  StringBase line;
-  bool tabs = false;
-  while (!stream->geteof()) {
-    if (stream->readline(line) > 0 && Clean(line) > 0) tabs = true;
-    Add(line);
-  }
-  if (tabs) TARVO_TRACE("  Tabs found in file %s\n", fileName);
+  text = stream->TakeRest();
+  if (Report::IsTracing() && HasTabs(text)) TARVO_TRACE("  Tabs found in file %s\n", fileName);
   if (!Port::File::close(stream.release())) {
     throw Report::Exception(AppException::Failure, "Cannot close file %s\n", fileName);
   }
@@ -52,28 +63,50 @@ FileScanner::FileScanner(const Port::FileName& file) : fileName(file.GetName()) 
 
 FileScanner::~FileScanner() = default;
 
-void FileScanner::Add(const StringBase& line) {
-  lines.push_back({text.size(), line.GetLength()});
-  text += line.View();
+// The next line, and where the one behind it begins. At the end it is empty, and `next` stays.
+std::string_view FileScanner::FindLine(std::size_t& next) {
+  std::string_view rest = std::string_view(text).substr(position);
+  if (rest.empty()) return rest;
+  const std::string_view line = Port::TakeLine(rest);
+  next = text.size() - rest.size();
+  const std::string_view cleaned = WithoutBlanks(line.substr(0, line.find(kComment)));
+  const auto start = static_cast<std::size_t>(cleaned.data() - text.data());
+  for (std::size_t tab = 0; (tab = cleaned.find(kTab, tab)) != std::string_view::npos;) {
+    text[start + tab] = ' ';
+  }
+  return cleaned;
 }
 
-bool FileScanner::GetNextLine(StringBase& line) {
-  if (current == lines.size()) {
-    line.Empty();
-    return false;
-  }
-  const Line& next = lines[current];
-  line.Assign(text.data() + next.start, static_cast<unsigned>(next.length));
+// Goes behind the line that was found there, and gives its number. False at the end.
+bool FileScanner::StepTo(std::size_t next, unsigned int& lineNumber) {
+  lineNumber = current + 1;
+  if (next == position) return false;
+  position = next;
   ++current;
   return true;
 }
 
-bool FileScanner::GetNextLine(StringBase& line, unsigned int& lineNumber) {
-  const bool found = GetNextLine(line);
-  lineNumber = found ? current : current + 1;
-  return found;
+bool FileScanner::GetNextLine(StringBase& line) {
+  unsigned lineNumber = 0;
+  return GetNextLine(line, lineNumber);
 }
 
-void FileScanner::GoToStart() { current = 0; }
+bool FileScanner::GetNextLine(StringBase& line, unsigned int& lineNumber) {
+  std::size_t next = position;
+  const std::string_view found = FindLine(next);
+  line.Assign(found.data(), static_cast<unsigned>(found.size()));
+  return StepTo(next, lineNumber);
+}
+
+bool FileScanner::GetNextLine(std::string_view& line, unsigned int& lineNumber) {
+  std::size_t next = position;
+  line = FindLine(next);
+  return StepTo(next, lineNumber);
+}
+
+void FileScanner::GoToStart() {
+  current = 0;
+  position = 0;
+}
 
 }  // namespace Tarvo

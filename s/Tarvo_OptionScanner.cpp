@@ -1,5 +1,6 @@
 #include "Tarvo_OptionScanner.h"
 
+#include <string_view>
 #include <utility>
 
 #include "Tarvo_FileScanner.h"
@@ -33,7 +34,7 @@ namespace {
 constexpr Report::Module kModule{"s/Tarvo_OptionScanner", "1.0"};
 
 // Appends the option of a line that states one. False for a bad statement.
-bool ReadLine(const StringBase& line, PropertyList& options) {
+bool ReadLine(std::string_view line, PropertyList& options) {
   using namespace QVRStatement;
   if (!BeginsWith(line, OptionScanner::QVR_OPTION, kScannerDelimiters)) return true;
   Property option;
@@ -61,10 +62,10 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
   FileScanner lines(file);
   options = {{QVR_OPTION_NAME, key.GetName()}, {QVR_OPTION_VERSION, key.GetVersion()}};
   bool ok = true;
-  StringBase line;
+  std::string_view line;
   for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
     if (ReadLine(line, options)) continue;
-    kModule.Error("QVR unparsable OPTION: %s line %d, %s\n", name, lineNumber, line);
+    kModule.Error("QVR unparsable OPTION: %s line %d, %s\n", name, lineNumber, StringBase(line));
     ok = false;
   }
   ForEachMissing(options, kOptionDefaults,

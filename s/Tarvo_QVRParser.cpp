@@ -108,7 +108,7 @@ const Kind kPort{"Port", kPortDefaults};
 
 // Reads a record that its first pair names. That pair's value stands under each of the value keys,
 // behind the name and in front of the other pairs.
-bool ReadNamedByFirst(const StringBase& line, std::initializer_list<const StringBase*> valueKeys,
+bool ReadNamedByFirst(std::string_view line, std::initializer_list<const StringBase*> valueKeys,
                       QVRRecord& record) {
   PropertyList pairs;
   if (!QVRStatement::ReadPairs(line, pairs)) return false;
@@ -123,7 +123,7 @@ bool ReadNamedByFirst(const StringBase& line, std::initializer_list<const String
 
 // Reads a record that the pair with that key names; the name stands in front of the pair. False
 // without such a pair, and for a second one behind a name that is not empty.
-bool ReadNamedByKey(const StringBase& line, const StringBase& key, QVRRecord& record) {
+bool ReadNamedByKey(std::string_view line, const StringBase& key, QVRRecord& record) {
   PropertyList pairs;
   if (!QVRStatement::ReadPairs(line, pairs)) return false;
   bool found = false;
@@ -234,11 +234,12 @@ QVRParser::QVRParser(const Port::FileName& file) {
   const StringBase name = file.GetName();
   TARVO_TRACE("  Parsing QVR File %s\n", name);
   FileScanner lines(file);
-  StringBase line;
+  std::string_view line;
   for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
-    const StringBase keyword(FirstWord(line.View()));
+    const std::string_view keyword = FirstWord(line);
     if (ReadStatement(keyword, line)) continue;
-    kModule.Error("QVR unparsable %s: %s line %d, %s\n", keyword, name, lineNumber, line);
+    kModule.Error("QVR unparsable %s: %s line %d, %s\n", StringBase(keyword), name, lineNumber,
+                  StringBase(line));
     throw Report::Exception(AppException::Failure, "Invalid QVR %s\n", name);
   }
   TARVO_TRACE("  Parse successful\n");
@@ -247,7 +248,7 @@ QVRParser::QVRParser(const Port::FileName& file) {
 QVRParser::~QVRParser() = default;
 
 // Any other line is no statement, and ignored.
-bool QVRParser::ReadStatement(const StringBase& keyword, const StringBase& line) {
+bool QVRParser::ReadStatement(std::string_view keyword, std::string_view line) {
   if (keyword == "OPTION") return ReadOption(line);
   if (keyword == "PARAMETER") return ReadParameter(line);
   if (keyword == "BUS_INTERFACE") return ReadInterface(line, QVR_BUS_IF_NAME, busInterfaces);
@@ -256,7 +257,7 @@ bool QVRParser::ReadStatement(const StringBase& keyword, const StringBase& line)
   return true;
 }
 
-bool QVRParser::ReadOption(const StringBase& line) {
+bool QVRParser::ReadOption(std::string_view line) {
   Property option;
   const bool read =
       QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option) == QVRStatement::Read;
@@ -264,7 +265,7 @@ bool QVRParser::ReadOption(const StringBase& line) {
   return read;
 }
 
-bool QVRParser::ReadParameter(const StringBase& line) {
+bool QVRParser::ReadParameter(std::string_view line) {
   QVRRecord record;
   if (!ReadNamedByFirst(line, {&QVR_PROPERTY_VALUE, &QVR_PROPERTY_DEFAULT}, record)) return false;
   if (IsGeneric(record)) generics.push_back(record);
@@ -272,14 +273,14 @@ bool QVRParser::ReadParameter(const StringBase& line) {
   return true;
 }
 
-bool QVRParser::ReadPort(const StringBase& line) {
+bool QVRParser::ReadPort(std::string_view line) {
   QVRRecord record;
   if (!ReadNamedByFirst(line, {&QVR_BUS_IF_ROLE_NAME}, record)) return false;
   ports.push_back(std::move(record));
   return true;
 }
 
-bool QVRParser::ReadInterface(const StringBase& line, const StringBase& key, Records& interfaces) {
+bool QVRParser::ReadInterface(std::string_view line, const StringBase& key, Records& interfaces) {
   QVRRecord record;
   if (!ReadNamedByKey(line, key, record)) return false;
   interfaces.push_back(std::move(record));

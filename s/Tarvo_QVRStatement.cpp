@@ -41,14 +41,14 @@ void PassKeyword(TokenReader& tokens) {
 
 }  // namespace
 
-bool BeginsWith(const StringBase& line, const StringBase& keyword, const char* delimiters) {
-  if (!line.View().starts_with(keyword.View())) return false;
-  const std::string_view behind = line.View().substr(keyword.GetLength(), 1);
+bool BeginsWith(std::string_view line, const StringBase& keyword, const char* delimiters) {
+  if (!line.starts_with(keyword.View())) return false;
+  const std::string_view behind = line.substr(keyword.GetLength(), 1);
   return behind.empty() || std::string_view(delimiters).find(behind) != std::string_view::npos;
 }
 
-Result ReadOption(const StringBase& line, const char* delimiters, Property& option) {
-  TokenReader tokens(line.View(), delimiters, TokenReader::WithGroups);
+Result ReadOption(std::string_view line, const char* delimiters, Property& option) {
+  TokenReader tokens(line, delimiters, TokenReader::WithGroups);
   PassKeyword(tokens);
   if (!tokens.MoreTokens()) return NamesNothing;
   Property read;
@@ -61,8 +61,8 @@ Result ReadOption(const StringBase& line, const char* delimiters, Property& opti
   return Read;
 }
 
-bool ReadPairs(const StringBase& line, PropertyList& pairs) {
-  TokenReader tokens(line.View(), kListDelimiters, TokenReader::WithGroups);
+bool ReadPairs(std::string_view line, PropertyList& pairs) {
+  TokenReader tokens(line, kListDelimiters, TokenReader::WithGroups);
   PassKeyword(tokens);
   PropertyList read;
   do {

@@ -22,19 +22,19 @@ extern const char* const kListDelimiters;
 extern const char* const kScannerDelimiters;
 
 // Whether the first token of a cleaned line is that word.
-bool BeginsWith(const StringBase& line, const StringBase& keyword, const char* delimiters);
+bool BeginsWith(std::string_view line, const StringBase& keyword, const char* delimiters);
 
 // What became of a statement. One that names nothing is a keyword alone on its line.
 enum Result { Read, NamesNothing, Unparsable };
 
 // Reads the option that a line states; its first token is taken for the keyword. The output changes
 // only on Read.
-Result ReadOption(const StringBase& line, const char* delimiters, Property& option);
+Result ReadOption(std::string_view line, const char* delimiters, Property& option);
 
 // Reads the pairs of a list statement, in their order; the first token is taken for the keyword.
 // False, with the output unchanged, if there is no pair, or one has no "=", no value, or a value
 // that is not closed.
-bool ReadPairs(const StringBase& line, PropertyList& pairs);
+bool ReadPairs(std::string_view line, PropertyList& pairs);
 
 }  // namespace Tarvo::QVRStatement
 

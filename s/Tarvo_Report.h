@@ -112,15 +112,24 @@ AppException Exception(AppException::Level level, FormatFor<Arguments...> format
 }
 
 inline DebugMessenger& Logger() {
-  static const StringBase name = "BaseIP";
-  return *DebugMessengerFactory::GetLogger(name);
+  static DebugMessenger& logger = *DebugMessengerFactory::GetLogger("BaseIP");
+  return logger;
+}
+
+// For what is found out for a trace alone.
+inline bool IsTracing() noexcept {
+  try {
+    return !Logger().IsOff();
+  } catch (...) {
+    return false;
+  }
 }
 
 // Nothing else depends on whether the logger is on, so what goes wrong with a trace ends here.
 template <class BuildText>
 void TraceIfOn(const BuildText& buildText) noexcept {
+  if (!IsTracing()) return;
   try {
-    if (Logger().IsOff()) return;
     const StringBase text = buildText();
     Logger().Verbose(text);
   } catch (...) {

@@ -29,8 +29,8 @@ constexpr Report::Module kModule{"s/Tarvo_TEWParser", "1.0"};
 const char* const kDelimiters = " ,\"'";
 const char* const kEndOfHeader = "FILES";
 
-TokenReader Cut(const StringBase& line) {
-  return TokenReader(line.View(), kDelimiters, TokenReader::WithoutGroups);
+TokenReader Cut(std::string_view line) {
+  return TokenReader(line, kDelimiters, TokenReader::WithoutGroups);
 }
 
 // Goes behind a comma that something follows. False at the end of a row's netlists.
@@ -62,45 +62,45 @@ void TEWParser::Parse(const FileName& tewFile, const Kel_Key& key) {
   FileScanner lines(tewFile);
   const StringList names = qvrParser ? qvrParser->ListParameters() : StringList();
   const NameSet parameterNames(names.begin(), names.end());
-  StringBase line;
+  std::string_view line;
   unsigned lineNumber = 0;
   Result result = StatesNothing;
   while (result != Read && lines.GetNextLine(line, lineNumber)) {
     result = ParseHeader(line, parameterNames);
     if (result != Unparsable) continue;
-    kModule.Error("TEW unparsable header: %s line %d, %s\n", name, lineNumber, line);
+    kModule.Error("TEW unparsable header: %s line %d, %s\n", name, lineNumber, StringBase(line));
   }
   while (result == Read && lines.GetNextLine(line, lineNumber)) {
-    if (line.GetLength() > 0) result = ParseFileEntry(line, key);
+    if (!line.empty()) result = ParseFileEntry(line, key);
     if (result != Unparsable) continue;
     throw Report::Exception(AppException::Failure, "TEW unparsable file entry: %s line %d, %s\n",
-                            name, lineNumber, line);
+                            name, lineNumber, StringBase(line));
   }
   if (result != Read) throw Report::Exception(AppException::Failure, "Invalid TEW %s\n", name);
   TARVO_TRACE("  Parse successful\n");
 }
 
 // The names of a line that turns out to be no header stay.
-TEWParser::Result TEWParser::ParseHeader(const StringBase& line, const NameSet& parameterNames) {
+TEWParser::Result TEWParser::ParseHeader(std::string_view line, const NameSet& parameterNames) {
   TokenReader tokens = Cut(line);
-  StringBase name;
-  if (!tokens.ReadField(name)) return StatesNothing;
-  while (!Matches(name, kEndOfHeader)) {
+  std::string_view field;
+  if (!tokens.ReadField(field)) return StatesNothing;
+  for (StringBase name(field); !Matches(name, kEndOfHeader); name = StringBase(field)) {
     if (parameterNames.find(name) == parameterNames.end()) return Unparsable;
-    headerNames.push_back(name);
-    if (!tokens.ReadField(name)) return Unparsable;
+    headerNames.push_back(std::move(name));
+    if (!tokens.ReadField(field)) return Unparsable;
   }
   return Read;
 }
 
 // A comma between values is a value itself.
-TEWParser::Result TEWParser::ParseFileEntry(const StringBase& line, const Kel_Key& key) {
+TEWParser::Result TEWParser::ParseFileEntry(std::string_view line, const Kel_Key& key) {
   TokenReader tokens = Cut(line);
-  StringBase field;
+  std::string_view field;
   if (!tokens.ReadField(field)) return StatesNothing;
   Row row;
   while (row.values.size() < headerNames.size()) {
-    row.values.push_back(field);
+    row.values.emplace_back(field);
     if (!tokens.ReadField(field)) return Unparsable;
   }
   row.netlists.push_back(MakeNetlist(field, key));
@@ -113,9 +113,8 @@ TEWParser::Result TEWParser::ParseFileEntry(const StringBase& line, const Kel_Ke
 }
 
 // Reads NAME, or LIBRARY:NAME, cut at the first colon.
-TEWParser::Netlist TEWParser::MakeNetlist(const StringBase& file, const Kel_Key& key) const {
+TEWParser::Netlist TEWParser::MakeNetlist(std::string_view name, const Kel_Key& key) const {
   std::string_view library = key.GetKey().View();
-  std::string_view name = file.View();
   const std::size_t colon = name.find(':');
   if (colon != std::string_view::npos) {
     library = name.substr(0, colon);

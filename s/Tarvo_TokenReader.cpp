@@ -36,10 +36,10 @@ TokenReader::Value TokenReader::ReadValue() {
   return {first, true};
 }
 
-bool TokenReader::ReadField(StringBase& text) {
+bool TokenReader::ReadField(std::string_view& text) {
   const Value value = ReadValue();
   if (!value.whole) return false;
-  text = StringBase(value.text);
+  text = value.text;
   Step();
   return true;
 }

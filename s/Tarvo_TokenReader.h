@@ -53,7 +53,7 @@ class TokenReader {
 
   // Reads a value that must be whole and steps behind it. False, with the text unchanged, if there
   // is none or it is not closed.
-  bool ReadField(StringBase& text);
+  bool ReadField(std::string_view& text);
 
  private:
   // A token in place. The tokenizer assigns it as it would a string.
