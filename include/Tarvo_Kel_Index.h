@@ -1,7 +1,6 @@
 #ifndef TARVO_KEL_INDEX_H
 #define TARVO_KEL_INDEX_H
 
-#include <cstddef>
 #include <map>
 #include <unordered_map>
 
@@ -90,15 +89,17 @@ class TARVO_EXPORT Kel_Index {
   struct NewestFirst {
     bool operator()(const Kel_Key& left, const Kel_Key& right) const { return right < left; }
   };
-  struct NameHash {
-    TARVO_LOCAL std::size_t operator()(const StringBase& name) const noexcept;
-  };
   // By base name, the versions of that core. No list is ever empty.
   template <class Value>
-  using Table =
-      std::unordered_map<StringBase, std::multimap<Kel_Key, Value, NewestFirst>, NameHash>;
+  using Table = std::unordered_map<StringBase, std::multimap<Kel_Key, Value, NewestFirst>>;
 
-  TARVO_LOCAL bool AddIPOptions(const Kel_Key& key, const Port::FileName& location);
+  friend class KelLibraryImpl;
+
+  // A version to add, and what a first look found of it.
+  struct Candidate;
+
+  TARVO_LOCAL bool Add(const Candidate& candidate);
+  TARVO_LOCAL bool AddIPOptions(const Candidate& candidate);
 
   Table<Port::FileName> locations;
   Table<PropertyList> options;

@@ -41,6 +41,8 @@ class TARVO_EXPORT OptionScanner {
   static StringBase GetOptionValue(const PropertyList& options, const StringBase& name);
 
  private:
+  friend class Kel_Index;  // keeps the options without a copy
+
   PropertyList options;
 };
 

@@ -7,21 +7,24 @@
 
 namespace Tarvo {
 
-// Whether something of that name exists. What can't be asked for, as behind a directory without
-// permission, counts as missing.
-inline bool Exists(const Port::FileName& name) {
+// What a look at the disk tells of a name. Unknown is what can't be asked for, as behind a
+// directory without permission; a name that is too long for a file is known to be missing.
+enum class Existence { Missing, Unknown, Known };
+
+inline Existence LookFor(const Port::FileName& name) {
   boost::system::error_code error;
-  return boost::filesystem::exists(name.GetName().GetText(), error);
+  const auto status = boost::filesystem::status(name.GetName().GetText(), error);
+  if (boost::filesystem::exists(status)) return Existence::Known;
+  const bool missing = status.type() == boost::filesystem::file_not_found ||
+                       error == boost::system::errc::filename_too_long;
+  return missing ? Existence::Missing : Existence::Unknown;
 }
 
-// The same, but what can't be asked for may well be there: reading it then tells what is wrong. A
-// name that is too long for a file is known to be missing.
-inline bool MayExist(const Port::FileName& file) {
-  boost::system::error_code error;
-  const auto status = boost::filesystem::status(file.GetName().GetText(), error);
-  return status.type() != boost::filesystem::file_not_found &&
-         error != boost::system::errc::filename_too_long;
-}
+// Whether something of that name is known to exist.
+inline bool Exists(const Port::FileName& name) { return LookFor(name) == Existence::Known; }
+
+// Whether it is not known to be missing: reading it then tells what is wrong.
+inline bool MayExist(const Port::FileName& name) { return LookFor(name) != Existence::Missing; }
 
 }  // namespace Tarvo
 

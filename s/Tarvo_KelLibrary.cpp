@@ -4,10 +4,12 @@
 #include <iterator>
 
 #include "Port_FileName.h"
+#include "Tarvo_Existence.h"
 #include "Tarvo_Guard.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
+#include "Tarvo_Kel_Index_Candidate.h"
 #include "Tarvo_Kel_Key.h"
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_PropertyList.h"
@@ -69,7 +71,7 @@ class KelLibraryImpl {
 
  private:
   bool AddRepository(const StringBase& repository);
-  bool AddVersion(const fs::path& directory);
+  bool AddVersion(const fs::directory_entry& entry);
 };
 
 KelLibraryImpl::KelLibraryImpl() { TARVO_TRACE("Constructing empty KEL Library\n"); }
@@ -101,19 +103,22 @@ bool KelLibraryImpl::AddRepository(const StringBase& repository) {
   }
   bool all = true;
   for (const fs::directory_entry& entry : fs::directory_iterator(versions)) {
-    if (MayBeVersion(entry)) all = AddVersion(entry.path()) && all;
+    all = AddVersion(entry) && all;
   }
   return all;
 }
 
-// A description that can't be read costs the version its options, and nobody else anything.
-bool KelLibraryImpl::AddVersion(const fs::path& directory) {
-  const Kel_Key key(StringBase(directory.filename().c_str()));
+// Passes over what is no version. A description that can't be read costs the version its options,
+// and nobody else anything.
+bool KelLibraryImpl::AddVersion(const fs::directory_entry& entry) {
+  const Kel_Key key(StringBase(entry.path().filename().c_str()));
   if (!key.IsValid()) return true;
   Port::FileName location;
-  location.SetHead(directory.c_str());
+  location.SetHead(entry.path().c_str());
+  const Kel_Index::Candidate candidate(key, location);
+  if (candidate.described != Existence::Known && !MayBeVersion(entry)) return true;
   try {
-    return index.AddIP(key, location);
+    return index.Add(candidate);
   } catch (const AppException& exception) {
     kModule.Error("Invalid IP index entry %s at %s\n%s\n", key.GetKey(), location.GetName(),
                   exception.what());

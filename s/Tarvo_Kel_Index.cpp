@@ -1,10 +1,11 @@
 #include "Tarvo_Kel_Index.h"
 
 #include <algorithm>
-#include <cstdint>
+#include <iterator>
 #include <utility>
 
 #include "Tarvo_Existence.h"
+#include "Tarvo_Kel_Index_Candidate.h"
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_Report.h"
 
@@ -66,34 +67,28 @@ struct Insertion {
   bool isNew;
 };
 
-// Adds the entry, in front of the entries of equal versions, unless its key is there already. A new
-// list enters the table with its first entry in it, so that none is empty when memory runs out.
-template <class Table, class Value>
-auto Insert(Table& table, const Kel_Key& key, Value value) {
-  using Versions = typename Table::mapped_type;
-  using Result = Insertion<Versions>;
-  const auto core = table.find(key.GetName());
-  if (core == table.end()) {
-    Versions versions;
-    const auto entry = versions.emplace(key, std::move(value));
-    table.emplace(key.GetName(), std::move(versions));
-    return Result{entry, true};
-  }
-  Versions& versions = core->second;
+// Adds the entry, in front of the entries of equal versions, unless its key is there already.
+template <class Versions, class Value>
+Insertion<Versions> InsertVersion(Versions& versions, const Kel_Key& key, Value value) {
   const auto known = FindKey(versions, key);
-  if (known != versions.end()) return Result{known, false};
-  return Result{versions.emplace_hint(versions.lower_bound(key), key, std::move(value)), true};
+  if (known != versions.end()) return {known, false};
+  return {versions.emplace_hint(versions.lower_bound(key), key, std::move(value)), true};
+}
+
+// The same, by base name. A new list goes again if memory runs out for its first entry: none is
+// empty.
+template <class Table, class Value>
+Insertion<typename Table::mapped_type> Insert(Table& table, const Kel_Key& key, Value value) {
+  const auto [core, isNewCore] = table.try_emplace(key.GetName());
+  try {
+    return InsertVersion(core->second, key, std::move(value));
+  } catch (...) {
+    if (isNewCore) table.erase(core);
+    throw;
+  }
 }
 
 }  // namespace
-
-std::size_t Kel_Index::NameHash::operator()(const StringBase& name) const noexcept {
-  std::uint32_t hash = 0;
-  for (const char c : name.View()) {
-    hash = 5 * hash + static_cast<std::uint32_t>(static_cast<signed char>(c));
-  }
-  return hash;
-}
 
 FileName Kel_Index::GetDataFile(const FileName& location, const Kel_Key& key,
                                 const StringBase& extension) {
@@ -114,7 +109,12 @@ Kel_Index::Kel_Index() : locations(kBucketHint), options(kBucketHint) {
 Kel_Index::~Kel_Index() = default;
 
 bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
-  if (!key.IsValid() || !Exists(location)) {
+  return Add(Candidate(key, location));
+}
+
+bool Kel_Index::Add(const Candidate& candidate) {
+  const auto& [key, location, description, described] = candidate;
+  if (!key.IsValid() || (described != Existence::Known && !Exists(location))) {
     kModule.Error("Invalid IP index entry %s at %s\n", key.GetKey(), location.GetName());
     return false;
   }
@@ -123,20 +123,23 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
     TARVO_TRACE("Duplicate IP index entry %s at %s\nPrecedence given to %s\n", key.GetKey(),
                 location.GetName(), inserted.entry->second.GetName());
   }
-  const bool withOptions = inserted.isNew && AddIPOptions(key, location);
+  const bool withOptions = inserted.isNew && AddIPOptions(candidate);
   if (!withOptions) {
     TARVO_TRACE("Library IP %s found at %s\n", key.GetKey(), location.GetName());
   }
   return true;
 }
 
-bool Kel_Index::AddIPOptions(const Kel_Key& key, const FileName& location) {
-  const FileName description = GetDataFile(location, key, KEL_QVR_EXTENSION);
-  if (!MayExist(description)) {
+bool Kel_Index::AddIPOptions(const Candidate& candidate) {
+  const auto& [key, location, description, described] = candidate;
+  if (described == Existence::Missing) {
     TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
     return false;
   }
-  Insert(options, key, OptionScanner(key, description).GetOptions());
+  OptionScanner scanner(key, description);
+  const auto first = std::make_move_iterator(scanner.options.begin());
+  const auto last = std::make_move_iterator(scanner.options.end());
+  Insert(options, key, PropertyList(first, last));  // without the room for more
   return true;
 }
 

@@ -1,5 +1,7 @@
 #include "Tarvo_Kel_Key.h"
 
+#include <algorithm>
+#include <string_view>
 #include <tuple>
 #include <utility>
 
@@ -14,8 +16,18 @@ const char* const kVersionSuffix = "[_][vV][0-9]+[_][0-9][0-9][_][a-zA-Z]$";
 // The range of the version suffix. A text that goes on behind a NUL byte, where the expression sees
 // its end, has none.
 Port_Range FindSuffix(const StringBase& text) {
-  const Port_Range match = Port_Regexp(kVersionSuffix).GetRangeOfMatch(text, 0);
+  // Never destroyed, since keys may be made while the program ends.
+  static const auto& expression = *new Port_Regexp(kVersionSuffix);
+  const Port_Range match = expression.GetRangeOfMatch(text, 0);
   return match.IsEmpty() || match.last + 1 == text.GetLength() ? match : Port_Range();
+}
+
+// The version of a suffix "vMAJOR_MINOR_LETTER": "MAJOR.MINOR.LETTER", MAJOR without leading zeros.
+StringBase WriteVersion(std::string_view suffix) {
+  const std::size_t major = std::min(suffix.find_first_not_of('0', 1), suffix.find('_') - 1);
+  StringBase version(suffix.substr(major));
+  version.ReplaceChars('_', '.');
+  return version;
 }
 
 }  // namespace
@@ -60,9 +72,11 @@ bool Kel_Key::ReadSuffix(const StringBase& text, const Port_Range& suffix) {
   name = text.Extract({0, suffix.first - 1});
   StringBase lowered = text.Extract({suffix.first + 1, suffix.last});
   lowered.MakeLower();
-  key = StringBase::doFormat("%s_%s", name.GetText(), lowered.GetText());
+  key = name;
+  key.Append("_");
+  key.Append(lowered);
   revision = lowered.Extract({lowered.GetLength() - 1, lowered.GetLength() - 1});
-  version = StringBase::doFormat("%u.%02u.%s", major, minor, revision.GetText());
+  version = WriteVersion(lowered.View());
   return true;
 }
 

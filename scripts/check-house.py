@@ -25,7 +25,7 @@ RANKS = [
     (3, r"(include|s)/Tarvo_QVRStatement\..*"),
     (3.5, r"s/Tarvo_OptionDefaults\.h"),
     (4, r"(include|s)/Tarvo_OptionScanner\..*"),
-    (5, r"(include|s)/Tarvo_Kel_Index\..*"),
+    (5, r"(include|s)/Tarvo_Kel_Index(_Candidate)?\..*"),
     (6, r"(include|s)/Tarvo_QVRParser\..*"),
     (7, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
     (8, r"(include|s)/Tarvo_KelIP(_Catalogues)?\..*"),
@@ -48,7 +48,7 @@ def rank_of(path):
     """The rank and the module of a file, or None for one that the table does not know."""
     for rank, pattern in RANKS:
         if re.fullmatch(pattern, path):
-            stem = re.sub("_(Hdl|Catalogues)$", "", pathlib.Path(path).stem)  # second sources
+            stem = re.sub("_(Hdl|Catalogues|Candidate)$", "", pathlib.Path(path).stem)  # second sources
             module = path.split("/")[0] if rank in (0, 10) else stem
             return rank, module
     return None
