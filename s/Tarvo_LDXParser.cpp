@@ -33,6 +33,8 @@ const char* const kBoth = "lib";
 const char* const kSynthesisOnly = "synlib";
 const char* const kSimulationOnly = "simlib";
 const char* const kWholeLibrary = "all";
+const char* const kSynthesis = "synthesis";
+const char* const kSimulation = "simulation";
 const char* const kIncludeDirectory = "vlgincdir";
 const char* const kLanguageOption = "HDL";
 const char* const kBetweenLibraryAndFile = " ";
@@ -63,19 +65,30 @@ std::string_view PopLevel(std::string_view& path) {
   return level;
 }
 
+bool IsLanguageDirectory(std::string_view level) {
+  return level == Kel_Index::KEL_VHDL_SUBDIRECTORY.View() ||
+         level == Kel_Index::KEL_VERILOG_SUBDIRECTORY.View();
+}
+
+// Appends the levels of a path, each with one separator behind it.
+void AppendLevels(StringBase& text, std::string_view path) {
+  while (!path.empty()) {
+    const std::size_t end = std::min(path.find('/'), path.size());
+    text.Append(path.data(), static_cast<unsigned>(end));
+    if (end > 0) text.Append("/");
+    path.remove_prefix(std::min(end + 1, path.size()));
+  }
+}
+
 // What a location says of a source: version directory, blank, name below the language's directory,
 // which is the nearest one of such a name. The relative path alone if there is none.
 StringBase GetFileKey(const FileName& location) {
   const StringBase directory = location.GetPath();
   std::string_view rest = directory.View();
-  std::vector<std::string_view> levels;
+  std::size_t behindLanguage = rest.size();
   std::string_view level = PopLevel(rest);
-  for (; !level.empty(); level = PopLevel(rest)) {
-    if (level == Kel_Index::KEL_VHDL_SUBDIRECTORY.View() ||
-        level == Kel_Index::KEL_VERILOG_SUBDIRECTORY.View()) {
-      break;
-    }
-    levels.push_back(level);
+  for (; !level.empty() && !IsLanguageDirectory(level); level = PopLevel(rest)) {
+    behindLanguage = rest.size();
   }
   StringBase fileKey;
   if (!level.empty()) {
@@ -83,11 +96,7 @@ StringBase GetFileKey(const FileName& location) {
     fileKey = StringBase(PopLevel(rest));
     fileKey.Append(kBetweenLibraryAndFile);
   }
-  std::reverse(levels.begin(), levels.end());
-  for (const std::string_view name : levels) {
-    fileKey.Append(name.data(), static_cast<unsigned>(name.size()));
-    fileKey.Append("/");
-  }
+  AppendLevels(fileKey, directory.View().substr(behindLanguage));
   fileKey.Append(location.GetTail());
   return fileKey;
 }
@@ -122,18 +131,10 @@ bool ReportMisplaced(const HdlPlacement& placement, const StringBase& file) {
   return false;
 }
 
-// Where a placed file lies, from its library's directory on.
-FileName Locate(FileName location, const HdlPlacement& placement, const FileName& file) {
-  location.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
-  location.PushPathEnd(placement.subdirectory);
-  location.PushPathEnd(file.GetPath());
-  if (file.HasExtension()) {
-    location.SetTail(file.GetTail());
-  } else {
-    location.SetBase(file.GetBase());
-    location.SetExtension(placement.missingExtension);
-  }
-  return location;
+void AppendExtension(StringBase& name, const StringBase& extension) {
+  if (extension.GetLength() == 0) return;
+  name.Append(".");
+  name.Append(extension);
 }
 
 // The file key that an entry gives: the file's name as written, but for a missing extension.
@@ -142,35 +143,72 @@ StringBase GetEntryKey(const Kel_Key& library, const StringBase& file,
   StringBase fileKey = library.GetKey();
   fileKey.Append(kBetweenLibraryAndFile);
   fileKey.Append(file.GetText());  // up to a NUL byte, where its name on disk ends too
-  if (missingExtension.GetLength() > 0) {
-    fileKey.Append(".");
-    fileKey.Append(missingExtension);
-  }
+  AppendExtension(fileKey, missingExtension);
   return fileKey;
 }
 
 }  // namespace
 
-bool LDXParser::Side::Add(const Kel_Key& library, const StringBase& fileKey, Source& source) {
-  const auto [owner, isNewSource] = owners.try_emplace(fileKey, libraries.size());
-  if (!isNewSource) return false;
-  const auto [position, isNewLibrary] = positions.try_emplace(library.GetKey(), libraries.size());
-  if (isNewLibrary) libraries.push_back({library, {}});
-  owner->second = position->second;
-  libraries[position->second].sources.push_back(std::move(source));
+bool LDXParser::Side::Add(const SourcePointer& source) {
+  const bool sameKey = source->entryKey.GetLength() == 0;
+  const StringBase& fileKey = sameKey ? source->fileKey : source->entryKey;
+  if (!owners.try_emplace(fileKey.View(), source.get()).second) return false;
+  Append(source);
+  byLocation = byLocation && sameKey;
   return true;
 }
 
+// Most sources follow one of the same library.
+void LDXParser::Side::Append(const SourcePointer& source) {
+  const KeyPointer& key = source->library;
+  std::size_t position = libraries.size() - 1;
+  if (libraries.empty() || libraries.back().key != key) {
+    const auto [known, isNew] = positions.try_emplace(key->GetKey().View(), libraries.size());
+    if (isNew) libraries.push_back({key, {}});
+    position = known->second;
+  }
+  libraries[position].sources.push_back(source);
+}
+
+// With the same kind of keys, those that are new here come over without being made again, and those
+// that are known stay behind.
+LDXParser::SourcePointers LDXParser::Side::Merge(Side& other) {
+  SourcePointers known;
+  if (libraries.empty() && other.byLocation) {
+    *this = std::move(other);
+    return known;
+  }
+  if (other.byLocation) owners.merge(other.owners);
+  const bool allNew = other.byLocation && other.owners.empty();
+  for (Library& library : other.libraries) {
+    if (allNew && positions.try_emplace(library.key->GetKey().View(), libraries.size()).second) {
+      libraries.push_back(std::move(library));
+      continue;
+    }
+    for (const SourcePointer& source : library.sources) {
+      const std::string_view fileKey = source->fileKey.View();
+      const bool isNew = other.byLocation ? other.owners.count(fileKey) == 0
+                                          : owners.try_emplace(fileKey, source.get()).second;
+      if (isNew) {
+        Append(source);
+      } else {
+        known.push_back(source);
+      }
+    }
+  }
+  return known;
+}
+
 const Kel_Key* LDXParser::Side::FindLibrary(const StringBase& fileKey) const {
-  const auto owner = owners.find(fileKey);
-  return owner == owners.end() ? nullptr : &libraries[owner->second].key;
+  const auto owner = owners.find(fileKey.View());
+  return owner == owners.end() ? nullptr : owner->second->library.get();
 }
 
 StringList LDXParser::Side::ListSources() const {
   StringList paths;
   for (const Library& library : libraries) {
-    for (const Source& source : library.sources) {
-      paths.push_back(source.location.GetAbsolutePath());
+    for (const SourcePointer& source : library.sources) {
+      paths.push_back(source->location.GetAbsolutePath());
     }
   }
   return paths;
@@ -193,9 +231,7 @@ LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const K
       rootKey(root.IsValid() ? root : version),
       hdl(std::move(language)),
       enclosing(outer),
-      level(outer ? outer->level + 1 : 1),
-      synthesis("synthesis"),
-      simulation("simulation") {
+      level(outer ? outer->level + 1 : 1) {
   CheckNesting();
   Parse(ldxFile);
 }
@@ -221,27 +257,31 @@ void LDXParser::Parse(const FileName& ldxFile) {
   const StringBase name = ldxFile.GetName();
   TARVO_TRACE("  Parsing LDX File %s\n", name);
   FileScanner lines(ldxFile);
-  StringBase line;
+  std::string_view line;
   for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
-    if (line.GetLength() == 0) continue;
-    const bool isPath = Matches(StringBase(FirstWord(line.View())), kIncludeDirectory);
+    if (line.empty()) continue;
+    const bool isPath = Matches(StringBase(FirstWord(line)), kIncludeDirectory);
     if (isPath ? ParsePathEntry(line) : ParseLibraryEntry(line)) continue;
     const char* const kind = isPath ? "path" : "library";
-    kModule.Error("LDX unparsable %s entry: %s line %d, %s\n", kind, name, lineNumber, line);
+    kModule.Error("LDX unparsable %s entry: %s line %d, %s\n", kind, name, lineNumber,
+                  StringBase(line));
     throw Report::Exception(AppException::Failure, "Invalid LDX %s\n", name);
   }
   TARVO_TRACE("  Parse successful\n");
 }
 
-bool LDXParser::ParseLibraryEntry(const StringBase& line) {
-  TokenReader tokens(line.View(), kDelimiters, TokenReader::WithGroups);
-  StringBase keyword;
-  StringBase library;
-  StringBase file;
+bool LDXParser::ParseLibraryEntry(std::string_view line) {
+  TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);
+  std::string_view keyword;
+  std::string_view library;
+  std::string_view name;
   if (!tokens.ReadField(keyword)) return false;
   if (keyword != kBoth && keyword != kSynthesisOnly && keyword != kSimulationOnly) return false;
-  if (!tokens.ReadField(library) || !tokens.ReadField(file)) return false;
-  if (Matches(file, kWholeLibrary)) return !tokens.MoreTokens() && AnalyseLibrary(library);
+  if (!tokens.ReadField(library) || !tokens.ReadField(name)) return false;
+  const StringBase file(name);
+  if (Matches(file, kWholeLibrary)) {
+    return !tokens.MoreTokens() && AnalyseLibrary(StringBase(library));
+  }
   // A language that is not closed is judged by what there is of it.
   const TokenReader::Value language = tokens.ReadValue();
   tokens.Step();
@@ -250,14 +290,16 @@ bool LDXParser::ParseLibraryEntry(const StringBase& line) {
 }
 
 // A keyword in other letter case, and a line that goes on behind the directory, are ignored.
-bool LDXParser::ParsePathEntry(const StringBase& line) {
-  TokenReader tokens(line.View(), kDelimiters, TokenReader::WithGroups);
-  StringBase keyword;
-  StringBase library;
-  StringBase directory;
+bool LDXParser::ParsePathEntry(std::string_view line) {
+  TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);
+  std::string_view keyword;
+  std::string_view libraryText;
+  std::string_view directoryText;
   if (!tokens.ReadField(keyword)) return false;
   if (keyword != kIncludeDirectory) return true;
-  if (!tokens.ReadField(library) || !tokens.ReadField(directory)) return false;
+  if (!tokens.ReadField(libraryText) || !tokens.ReadField(directoryText)) return false;
+  const StringBase library(libraryText);
+  const StringBase directory(directoryText);
   const Kel_Key libKey(library);
   FileName location = index.GetIPLocation(key);
   location.PushPathEnd(directory);
@@ -274,37 +316,87 @@ bool LDXParser::ParsePathEntry(const StringBase& line) {
   return true;
 }
 
-bool LDXParser::AddFile(const StringBase& keyword, const StringBase& library,
-                        const StringBase& file, const StringBase& language) {
-  Kel_Key libKey;
-  FileName location;
+bool LDXParser::AddFile(std::string_view keyword, std::string_view library, const StringBase& file,
+                        const StringBase& language) {
   try {
-    libKey = index.GetIPKey(Kel_Key(library));
-    location = index.GetIPLocation(libKey);
+    LocateLibrary(library);
   } catch (const AppException& exception) {
-    kModule.Error("Unable to determine location for library %s, file %s\n%s\n", library, file,
-                  exception.what());
+    kModule.Error("Unable to determine location for library %s, file %s\n%s\n", StringBase(library),
+                  file, exception.what());
     return false;
   }
   const FileName name(file);
   const HdlPlacement placement = PlaceSource(hdl, language, name);
   if (placement.assumed) {
-    TARVO_TRACE("HDL language not specified for file %s:%s when IP core is MIXED\n", library, file);
+    TARVO_TRACE("HDL language not specified for file %s:%s when IP core is MIXED\n",
+                StringBase(library), file);
   }
   if (placement.verdict != HdlPlacement::Placed) return ReportMisplaced(placement, file);
-  location = Locate(location, placement, name);
-  const StringBase fileKey = GetEntryKey(libKey, file, placement.missingExtension);
-  const Source source{location, GetFileKey(location)};
-  if (keyword != kSimulationOnly) AddSource(synthesis, libKey, fileKey, source);
-  if (keyword != kSynthesisOnly) AddSource(simulation, libKey, fileKey, source);
+  EnterDirectory(placement.subdirectory);
+  Source source = MakeSource(name, placement.missingExtension);
+  source.entryKey = GetEntryKey(*latest.key, file, placement.missingExtension);
+  if (source.entryKey == source.fileKey) source.entryKey.Empty();
+  AddSource(keyword, std::make_shared<const Source>(std::move(source)));
   return true;
 }
 
-void LDXParser::AddSource(Side& side, const Kel_Key& library, const StringBase& fileKey,
-                          Source source) const {
-  if (side.Add(library, fileKey, source)) return;
-  kModule.Warning("%s - File %s:%s already exists in %s library\n", key.GetKey(), library.GetKey(),
-                  source.location.GetTail(), side.name);
+void LDXParser::LocateLibrary(std::string_view library) {
+  if (latest.key && latest.text.View() == library) return;
+  Place place;
+  place.text = StringBase(library);
+  place.key = std::make_shared<const Kel_Key>(index.GetIPKey(Kel_Key(place.text)));
+  place.location = index.GetIPLocation(*place.key);
+  latest = std::move(place);
+}
+
+void LDXParser::EnterDirectory(const StringBase& subdirectory) {
+  if (latest.subdirectory == subdirectory) return;
+  FileName directory = latest.location;
+  directory.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
+  directory.PushPathEnd(subdirectory);
+  latest.subdirectory = subdirectory;
+  latest.directory = directory.GetHead();
+  latest.fileKeyStart = GetFileKey(directory);
+}
+
+// The source of that name at the latest place. A name with levels may lead to another directory of
+// a language, so its file key is read off the whole location.
+LDXParser::Source LDXParser::MakeSource(const FileName& name,
+                                        const StringBase& missingExtension) const {
+  Source source{latest.key, name, latest.fileKeyStart, {}};
+  source.location.SetHead(latest.directory);
+  if (missingExtension.GetLength() > 0) source.location.SetExtension(missingExtension);
+  const StringBase levels = name.GetPath();
+  if (levels.GetLength() > 0) {
+    source.location.PushPathEnd(levels);
+    source.fileKey = GetFileKey(source.location);
+  } else {
+    source.fileKey.Append(source.location.GetTail());
+  }
+  return source;
+}
+
+void LDXParser::AddSource(std::string_view keyword, const SourcePointer& source) {
+  if (keyword != kBoth) PartSides();
+  const bool inSynthesis = keyword != kSimulationOnly && !synthesis.Add(source);
+  const bool inSimulation =
+      simulation ? keyword != kSynthesisOnly && !simulation->Add(source) : inSynthesis;
+  if (inSynthesis) WarnOfSecond(*source, kSynthesis);
+  if (inSimulation) WarnOfSecond(*source, kSimulation);
+}
+
+void LDXParser::WarnOfSecond(const Source& source, const char* side) const {
+  kModule.Warning("%s - File %s:%s already exists in %s library\n", key.GetKey(),
+                  source.library->GetKey(), source.location.GetTail(), side);
+}
+
+// From here on the lists for simulation are their own.
+void LDXParser::PartSides() {
+  if (!simulation) simulation = std::make_unique<Side>(synthesis);
+}
+
+const LDXParser::Side& LDXParser::Simulation() const {
+  return simulation ? *simulation : synthesis;
 }
 
 bool LDXParser::AnalyseLibrary(const StringBase& library) {
@@ -314,8 +406,7 @@ bool LDXParser::AnalyseLibrary(const StringBase& library) {
     // Not on the stack, of which each level of a deep chain needs some.
     const std::unique_ptr<LDXParser> nested(
         new LDXParser(GetLdxFile(index, libKey), index, libKey, rootKey, language, this));
-    MergeSide(synthesis, nested->synthesis, *nested);
-    MergeSide(simulation, nested->simulation, *nested);
+    MergeSides(*nested);
     MergeIncludeDirectories(*nested);
   });
 }
@@ -331,14 +422,22 @@ StringBase LDXParser::LanguageOf(const Kel_Key& library) const {
   return language.GetLength() > 0 ? language : LDX_HDL_VHDL;
 }
 
-// Takes over the sources of the nested side; it is not asked again.
-void LDXParser::MergeSide(Side& side, Side& nestedSide, const LDXParser& nested) const {
-  for (Library& library : nestedSide.libraries) {
-    for (Source& source : library.sources) {
-      if (side.Add(library.key, source.fileKey, source)) continue;
-      TARVO_TRACE("%s - File %s:%s included from %s already exists in %s library\n", key.GetKey(),
-                  library.key.GetKey(), source.location.GetTail(), nested.key.GetKey(), side.name);
-    }
+// The nested parser is of no use afterwards.
+void LDXParser::MergeSides(LDXParser& nested) {
+  if (simulation || nested.simulation) {
+    PartSides();
+    nested.PartSides();
+  }
+  const SourcePointers known = synthesis.Merge(nested.synthesis);
+  TraceKnown(known, kSynthesis, nested);
+  TraceKnown(simulation ? simulation->Merge(*nested.simulation) : known, kSimulation, nested);
+}
+
+void LDXParser::TraceKnown(const SourcePointers& sources, const char* side,
+                           const LDXParser& nested) const {
+  for (const SourcePointer& source : sources) {
+    TARVO_TRACE("%s - File %s:%s included from %s already exists in %s library\n", key.GetKey(),
+                source->library->GetKey(), source->location.GetTail(), nested.key.GetKey(), side);
   }
 }
 
@@ -364,7 +463,7 @@ StringBase LDXParser::GetFileLanguage(const FileName& file) const {
 Kel_Key LDXParser::GetFileLibrary(const FileName& file) const {
   const StringBase fileKey = GetFileKey(file);
   const Kel_Key* library = synthesis.FindLibrary(fileKey);
-  if (!library) library = simulation.FindLibrary(fileKey);
+  if (!library && simulation) library = simulation->FindLibrary(fileKey);
   return library ? *library : Kel_Key();
 }
 
@@ -377,18 +476,18 @@ StringBase LDXParser::GetVerilogIncludeLocation(const StringBase& library) const
 StringList LDXParser::ListDirectories(const Side& side) const {
   StringList directories;
   for (const Library& library : side.libraries) {
-    directories.push_back(index.GetIPLocation(library.key).GetAbsolutePath());
+    directories.push_back(index.GetIPLocation(*library.key).GetAbsolutePath());
   }
   return directories;
 }
 
 StringList LDXParser::ListSynthesisLibraries() const { return ListDirectories(synthesis); }
 
-StringList LDXParser::ListSimulationLibraries() const { return ListDirectories(simulation); }
+StringList LDXParser::ListSimulationLibraries() const { return ListDirectories(Simulation()); }
 
 StringList LDXParser::ListSynthesisAnalyseOrder() const { return synthesis.ListSources(); }
 
-StringList LDXParser::ListSimulationAnalyseOrder() const { return simulation.ListSources(); }
+StringList LDXParser::ListSimulationAnalyseOrder() const { return Simulation().ListSources(); }
 
 StringList LDXParser::ListVerilogIncludeLibraryKeys() const {
   StringList keys;
