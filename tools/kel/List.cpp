@@ -50,7 +50,7 @@ Status List(const KelLibrary& library, const Call& call) {
   std::vector<std::string> globs;
   if (!call.key.empty()) globs.push_back(call.key);
   for (const Kel_Key& key : Versions(library, globs)) {
-    const bool newest = cores.empty() || key.GetName() != core;
+    const bool newest = key.GetName() != core;
     core = key.GetName();
     if (!newest && !call.allVersions) continue;
     const StringBase& text = key.GetKey();
@@ -58,7 +58,10 @@ Status List(const KelLibrary& library, const Call& call) {
     const std::string style = Option(library, text, "STYLE");
     const std::string language = Option(library, text, "HDL");
     const std::string description = Option(library, text, "DESC");
-    table.Add({Text(text), style, language, location, description});
+    if (!call.asJson) {
+      table.Add({Text(text), style, language, location, description});
+      continue;
+    }
     cores.push_back({{"key", Text(text)},
                      {"name", Text(key.GetName())},
                      {"version", Text(key.GetVersion())},
@@ -72,7 +75,7 @@ Status List(const KelLibrary& library, const Call& call) {
   } else {
     table.Write();
   }
-  if (!cores.empty() || globs.empty()) return StatusClean;
+  if (core.GetLength() > 0 || globs.empty()) return StatusClean;
   Messages::Note("no core fits '" + call.key + "'");
   return StatusFindings;
 }
