@@ -1,21 +1,22 @@
 // What keys, the index and a walk cost. Times differ from machine to machine; compare the rows of
-// one run. `versions/s` of the walk is to stay the same from 1,000 to 50,000 versions, and the
-// long list is one core with all its versions, added newest last, which is the worst order.
+// one run.
 
 #include <benchmark/benchmark.h>
 #include <fcntl.h>
+#include <sys/resource.h>
 #include <unistd.h>
 
 #include <algorithm>
 #include <array>
 #include <cstdint>
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <optional>
 #include <string>
 #include <vector>
 
 #include "Port_FileName.h"
+#include "Scratch.h"
 #include "Tarvo_KelLibrary.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
@@ -24,6 +25,7 @@ namespace {
 
 namespace fs = std::filesystem;
 using Tarvo::Kel_Key;
+using Tarvo::KelLibrary;
 using Tarvo::StringBase;
 
 // About 140 lines and 10 KB: six options, some parameters, many ports.
@@ -44,32 +46,26 @@ std::string Description() {
   return text;
 }
 
-// A repository of that many cores of one version each, for the life of the object, with or without
-// descriptions.
-class Repository {
- public:
-  explicit Repository(std::int64_t versions, bool described = false) {
-    std::string pattern = fs::temp_directory_path() / "kel-bench-XXXXXX";
-    if (!::mkdtemp(pattern.data())) std::abort();
-    root = pattern;
+std::string CoreName(std::int64_t number) { return "core" + std::to_string(number); }
+
+// A repository of that many described cores of one version each.
+fs::path Described(std::int64_t versions) {
+  return Scratch::Prepare("described-" + std::to_string(versions), [&](const fs::path& repository) {
     const std::string text = Description();
     for (std::int64_t i = 0; i < versions; ++i) {
-      const std::string core = "core" + std::to_string(i);
-      const fs::path data = root / "ipmods" / (core + "_v1_00_a") / "data";
-      fs::create_directories(data);
-      if (described) std::ofstream(data / (core + "_v2_1_0.qvr")) << text;
+      Scratch::WriteDataFile(repository, CoreName(i), "qvr", text);
     }
-  }
-  ~Repository() { fs::remove_all(root); }
-  Repository(const Repository&) = delete;
-  Repository& operator=(const Repository&) = delete;
+  });
+}
 
-  StringBase Path() const { return root.c_str(); }
-  fs::path Versions() const { return root / "ipmods"; }
-
- private:
-  fs::path root;
-};
+// The same without descriptions: directories alone.
+fs::path Bare(std::int64_t versions) {
+  return Scratch::Prepare("bare-" + std::to_string(versions), [&](const fs::path& repository) {
+    for (std::int64_t i = 0; i < versions; ++i) {
+      fs::create_directories(repository / "ipmods" / (CoreName(i) + "_v1_00_a"));
+    }
+  });
+}
 
 void CountVersions(benchmark::State& state) {
   state.counters["versions/s"] = benchmark::Counter(static_cast<double>(state.range(0)),
@@ -82,24 +78,28 @@ void MakeKey(benchmark::State& state) {
 }
 BENCHMARK(MakeKey);
 
-void Walk(benchmark::State& state) {
-  const Repository repository(state.range(0));
-  Tarvo::KelLibrary library;
-  for (auto _ : state) benchmark::DoNotOptimize(library.SetRepositoryPath(repository.Path()));
+// The walk of a program that begins: into an empty library. Letting go of it is not measured.
+void MeasureWalk(benchmark::State& state, const fs::path& repository) {
+  const StringBase path = repository.c_str();
+  std::optional<KelLibrary> library;
+  for (auto _ : state) {
+    library.emplace();
+    benchmark::DoNotOptimize(library->SetRepositoryPath(path));
+    state.PauseTiming();
+    library.reset();
+    state.ResumeTiming();
+  }
   CountVersions(state);
 }
+
+void Walk(benchmark::State& state) { MeasureWalk(state, Described(state.range(0))); }
 BENCHMARK(Walk)->Arg(1000)->Arg(10000)->Arg(50000)->Unit(benchmark::kMillisecond);
 
-// The same with a description for each version, and beside it what reading those files costs at
-// least: the directory listed, each file opened, read and its line ends counted.
-void WalkDescribed(benchmark::State& state) {
-  const Repository repository(state.range(0), true);
-  Tarvo::KelLibrary library;
-  for (auto _ : state) benchmark::DoNotOptimize(library.SetRepositoryPath(repository.Path()));
-  CountVersions(state);
-}
-BENCHMARK(WalkDescribed)->Arg(1000)->Arg(10000)->Unit(benchmark::kMillisecond);
+void WalkBare(benchmark::State& state) { MeasureWalk(state, Bare(state.range(0))); }
+BENCHMARK(WalkBare)->Arg(1000)->Arg(10000)->Arg(50000)->Unit(benchmark::kMillisecond);
 
+// What reading the described versions costs at least: the directory listed, each file opened, read
+// and its line ends counted.
 std::ptrdiff_t CountLines(const std::string& name) {
   std::array<char, 65536> buffer;
   std::ptrdiff_t lines = 0;
@@ -112,10 +112,10 @@ std::ptrdiff_t CountLines(const std::string& name) {
 }
 
 void ReadPlainly(benchmark::State& state) {
-  const Repository repository(state.range(0), true);
+  const fs::path versions = Described(state.range(0)) / "ipmods";
   for (auto _ : state) {
     std::ptrdiff_t lines = 0;
-    for (const fs::directory_entry& entry : fs::directory_iterator(repository.Versions())) {
+    for (const fs::directory_entry& entry : fs::directory_iterator(versions)) {
       const std::string key = entry.path().filename();
       lines += CountLines(entry.path() / "data" / (key.substr(0, key.find('_')) + "_v2_1_0.qvr"));
     }
@@ -123,7 +123,33 @@ void ReadPlainly(benchmark::State& state) {
   }
   CountVersions(state);
 }
-BENCHMARK(ReadPlainly)->Arg(1000)->Arg(10000)->Unit(benchmark::kMillisecond);
+BENCHMARK(ReadPlainly)->Arg(1000)->Arg(10000)->Arg(50000)->Unit(benchmark::kMillisecond);
+
+// The process's memory in KiB: now, and the most that it ever had.
+double ResidentNow() {
+  std::ifstream status("/proc/self/statm");
+  double pages = 0;
+  status >> pages >> pages;
+  return pages * static_cast<double>(::sysconf(_SC_PAGESIZE)) / 1024;
+}
+
+double ResidentMost() {
+  rusage usage = {};
+  ::getrusage(RUSAGE_SELF, &usage);
+  return static_cast<double>(usage.ru_maxrss);
+}
+
+// One walk, in a process that has done nothing else: only so is the peak that of the walk.
+void Memory(benchmark::State& state) {
+  const StringBase path = Described(state.range(0)).c_str();
+  KelLibrary library;
+  const double before = ResidentNow();
+  for (auto _ : state) library.SetRepositoryPath(path);
+  const double after = ResidentNow();
+  state.counters["KiB/version"] = (after - before) / static_cast<double>(state.range(0));
+  state.counters["MiB above the end"] = (ResidentMost() - after) / 1024;
+}
+BENCHMARK(Memory)->Arg(50000)->Iterations(1)->Unit(benchmark::kMillisecond);
 
 // The index alone: `shape` gives the text of the i-th key.
 void Add(benchmark::State& state, std::string (*shape)(int)) {
@@ -137,14 +163,17 @@ void Add(benchmark::State& state, std::string (*shape)(int)) {
   }
   CountVersions(state);
 }
-BENCHMARK_CAPTURE(Add, many_cores, [](int i) { return "core" + std::to_string(i) + "_v1_00_a"; })
-    ->Arg(1000)
-    ->Arg(10000)
-    ->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(Add, long_list, [](int i) { return "core_v" + std::to_string(i) + "_00_a"; })
-    ->Arg(1000)
-    ->Arg(10000)
-    ->Unit(benchmark::kMillisecond);
+
+std::string ManyCores(int i) { return CoreName(i) + "_v1_00_a"; }
+std::string NewestLast(int i) { return "core_v" + std::to_string(i) + "_00_a"; }
+std::string NewestFirst(int i) { return NewestLast(1'000'000 - i); }
+// One version, written in as many ways.
+std::string EqualVersions(int i) { return "core_v" + std::string(1 + i, '0') + "_00_a"; }
+
+BENCHMARK_CAPTURE(Add, many_cores, ManyCores)->Arg(5000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Add, newest_last, NewestLast)->Arg(5000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Add, newest_first, NewestFirst)->Arg(5000)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Add, equal_versions, EqualVersions)->Arg(100)->Unit(benchmark::kMillisecond);
 
 }  // namespace
 

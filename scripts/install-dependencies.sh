@@ -8,7 +8,7 @@ declare -A groups=(
           nlohmann-json3-dev"
   [test]="libgtest-dev libgmock-dev libbenchmark-dev"
   [tools]="ghdl iverilog verilator yosys tcl python3-jsonschema"
-  [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3"
+  [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3 valgrind"
 )
 
 missing=()
