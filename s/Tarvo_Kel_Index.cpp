@@ -113,8 +113,9 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
 }
 
 bool Kel_Index::Add(const Candidate& candidate) {
-  const auto& [key, location, description, described] = candidate;
-  if (!key.IsValid() || (described != Existence::Known && !Exists(location))) {
+  const Kel_Key& key = candidate.key;
+  const FileName& location = candidate.location;
+  if (!key.IsValid() || (candidate.described != Existence::Known && !Exists(location))) {
     kModule.Error("Invalid IP index entry %s at %s\n", key.GetKey(), location.GetName());
     return false;
   }
@@ -131,12 +132,13 @@ bool Kel_Index::Add(const Candidate& candidate) {
 }
 
 bool Kel_Index::AddIPOptions(const Candidate& candidate) {
-  const auto& [key, location, description, described] = candidate;
-  if (described == Existence::Missing) {
+  const Kel_Key& key = candidate.key;
+  const FileName& location = candidate.location;
+  if (candidate.described == Existence::Missing) {
     TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
     return false;
   }
-  OptionScanner scanner(key, description);
+  OptionScanner scanner(key, candidate.description);
   const auto first = std::make_move_iterator(scanner.options.begin());
   const auto last = std::make_move_iterator(scanner.options.end());
   Insert(options, key, PropertyList(first, last));  // without the room for more

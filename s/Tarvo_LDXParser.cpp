@@ -160,11 +160,11 @@ bool LDXParser::Side::Add(const SourcePointer& source) {
 
 // Most sources follow one of the same library.
 void LDXParser::Side::Append(const SourcePointer& source) {
-  const KeyPointer& key = source->library;
+  const KeyPointer& library = source->library;
   std::size_t position = libraries.size() - 1;
-  if (libraries.empty() || libraries.back().key != key) {
-    const auto [known, isNew] = positions.try_emplace(key->GetKey().View(), libraries.size());
-    if (isNew) libraries.push_back({key, {}});
+  if (libraries.empty() || libraries.back().key != library) {
+    const auto [known, isNew] = positions.try_emplace(library->GetKey().View(), libraries.size());
+    if (isNew) libraries.push_back({library, {}});
     position = known->second;
   }
   libraries[position].sources.push_back(source);
