@@ -95,10 +95,10 @@ class TARVO_EXPORT Kel_Index {
 
   friend class KelLibraryImpl;
 
-  // A version to add, and what a first look found of it.
+  // A version that is there, to be added.
   struct Candidate;
 
-  TARVO_LOCAL bool Add(const Candidate& candidate);
+  TARVO_LOCAL void Add(const Candidate& candidate);
   TARVO_LOCAL bool AddIPOptions(const Candidate& candidate);
 
   Table<Port::FileName> locations;

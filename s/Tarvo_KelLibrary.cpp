@@ -116,9 +116,12 @@ bool KelLibraryImpl::AddVersion(const fs::directory_entry& entry) {
   Port::FileName location;
   location.SetHead(entry.path().c_str());
   const Kel_Index::Candidate candidate(key, location);
-  if (candidate.described != Existence::Known && !MayBeVersion(entry)) return true;
+  const bool known = candidate.described == Existence::Known;
+  if (!known && !MayBeVersion(entry)) return true;
   try {
-    return index.Add(candidate);
+    if (!known) return index.AddIP(key, location);
+    index.Add(candidate);
+    return true;
   } catch (const AppException& exception) {
     kModule.Error("Invalid IP index entry %s at %s\n%s\n", key.GetKey(), location.GetName(),
                   exception.what());

@@ -109,16 +109,17 @@ Kel_Index::Kel_Index() : locations(kBucketHint), options(kBucketHint) {
 Kel_Index::~Kel_Index() = default;
 
 bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
-  return Add(Candidate(key, location));
-}
-
-bool Kel_Index::Add(const Candidate& candidate) {
-  const Kel_Key& key = candidate.key;
-  const FileName& location = candidate.location;
-  if (!key.IsValid() || (candidate.described != Existence::Known && !Exists(location))) {
+  if (!key.IsValid() || !Exists(location)) {
     kModule.Error("Invalid IP index entry %s at %s\n", key.GetKey(), location.GetName());
     return false;
   }
+  Add(Candidate(key, location));
+  return true;
+}
+
+void Kel_Index::Add(const Candidate& candidate) {
+  const Kel_Key& key = candidate.key;
+  const FileName& location = candidate.location;
   const auto inserted = Insert(locations, key, location);
   if (!inserted.isNew) {
     TARVO_TRACE("Duplicate IP index entry %s at %s\nPrecedence given to %s\n", key.GetKey(),
@@ -128,7 +129,6 @@ bool Kel_Index::Add(const Candidate& candidate) {
   if (!withOptions) {
     TARVO_TRACE("Library IP %s found at %s\n", key.GetKey(), location.GetName());
   }
-  return true;
 }
 
 bool Kel_Index::AddIPOptions(const Candidate& candidate) {

@@ -8,14 +8,14 @@
 
 namespace Tarvo {
 
-// A walk asks the disk once for each version: a description that is there shows that its location
-// is there too, and a directory. Nothing is asked for an invalid key.
+// A walk asks the disk once for most versions: a description that is there shows that its location
+// is there too, and a directory.
 struct Kel_Index::Candidate {
   Candidate(const Kel_Key& theKey, const Port::FileName& theLocation)
       : key(theKey),
         location(theLocation),
         description(GetDataFile(location, key, KEL_QVR_EXTENSION)),
-        described(key.IsValid() ? LookFor(description) : Existence::Missing) {}
+        described(LookFor(description)) {}
 
   const Kel_Key& key;
   const Port::FileName& location;

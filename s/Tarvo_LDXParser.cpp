@@ -352,6 +352,7 @@ void LDXParser::LocateLibrary(std::string_view library) {
 void LDXParser::EnterDirectory(const StringBase& subdirectory) {
   if (latest.subdirectory == subdirectory) return;
   FileName directory = latest.location;
+  directory.SetBase("");
   directory.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
   directory.PushPathEnd(subdirectory);
   latest.subdirectory = subdirectory;

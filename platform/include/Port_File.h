@@ -17,7 +17,7 @@ namespace Port {
 PORT_EXPORT std::string_view TakeLine(std::string_view& text);
 
 // An open text file. File::open makes it and File::close ends its life. The whole content is read
-// at opening, so later changes on disk do not show.
+// at opening, as long as it then is, so later changes on disk do not show.
 //
 // Lines are those of TakeLine. A UTF-8 byte order mark at the start is skipped. All other bytes,
 // NULs included, come as they are.
