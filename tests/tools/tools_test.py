@@ -11,6 +11,7 @@ import copy
 import json
 import os
 import pathlib
+import pty
 import re
 import shutil
 import subprocess
@@ -283,6 +284,25 @@ def odd_paths(folder, scratch):
         run("verilator", "--lint-only", "-f", "odd.f", cwd=scratch)
 
 
+def terminal(scratch):
+    """A terminal gets no control character of any file from any verb or format."""
+    data = scratch / "ipmods/a_v1_00_a/data"
+    data.mkdir(parents=True)
+    (data / "a_v2_1_0.qvr").write_text("OPTION STYLE = MIX\nOPTION DESC = \x1b[31m\nPORT p\x1b = \x1b\n")
+    (data / "a_v2_1_0.ldx").write_text("lib a x\x1b[2J.vhd\nlib a y\x1b[2J.v Verilog\n")
+    (data / "a_v2_1_0.tew").write_text("FILES\nn\x1b.edif\n")
+    sourcing = ["sources", "a", "--for", "synthesis", "--format"]
+    for words in [["list"], ["show", "a"], ["show", "a", "--json"], ["check"], ["netlists", "a"], ["which", "\x1b"],
+                  *[[*sourcing, form] for form in ["list", "json", "f", "ghdl", "edam", "vhdl_ls", "tcl"]]]:
+        screen, end = pty.openpty()
+        subprocess.run([KEL, "--color", "never", "-L", scratch, *words], stdout=end, stderr=end, timeout=60)
+        os.close(end)
+        shown = os.read(screen, 65536)
+        os.close(screen)
+        if not shown or b"\x1b" in shown:
+            raise Fault(f"{words} shows {shown}")
+
+
 def main():
     failed = 0
 
@@ -327,6 +347,7 @@ def main():
               ["crc_unit_w8_small.edif", *more])
     check("netlists again", netlists_again)
     check("odd paths", odd_paths, "o'd \"d\" $x [y] {z} #\\t")
+    check("terminal", terminal)
     check("odd paths with a line break", odd_paths, "new\nline")
     sys.exit(1 if failed else 0)
 

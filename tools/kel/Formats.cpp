@@ -1,12 +1,16 @@
 #include "Formats.h"
 
+#include <unistd.h>
+
 #include <algorithm>
 #include <filesystem>
 #include <iostream>
 #include <iterator>
+#include <sstream>
 #include <string_view>
 
 #include "Table.h"
+#include "Text.h"
 
 namespace {
 
@@ -181,6 +185,27 @@ const Format kFormats[] = {{"list", WriteList}, {"json", WriteJsonList}, {"f", W
                            {"ghdl", WriteGhdl}, {"edam", WriteEdam},     {"vhdl_ls", WriteVhdlLs},
                            {"tcl", WriteTcl}};
 
+// While one of these lives, what is written to standard output is kept.
+class Keeper {
+ public:
+  Keeper() : output(std::cout.rdbuf(kept.rdbuf())) {}
+  ~Keeper() { std::cout.rdbuf(output); }
+  Keeper(const Keeper&) = delete;
+  Keeper& operator=(const Keeper&) = delete;
+
+  std::string Text() const { return kept.str(); }
+
+ private:
+  std::ostringstream kept;
+  std::streambuf* output;
+};
+
+std::string WrittenBy(const Format& format, const SourceList& list) {
+  const Keeper keeper;
+  format.write(list);
+  return keeper.Text();
+}
+
 }  // namespace
 
 std::vector<std::string> FormatNames() {
@@ -193,5 +218,8 @@ void WriteSources(const SourceList& list, const std::string& format) {
   const auto* const chosen =
       std::find_if(std::begin(kFormats), std::end(kFormats),
                    [&](const Format& candidate) { return candidate.name == format; });
-  if (chosen != std::end(kFormats)) chosen->write(list);
+  if (chosen == std::end(kFormats)) return;
+  if (::isatty(STDOUT_FILENO) == 0) return chosen->write(list);
+  std::istringstream lines(WrittenBy(*chosen, list));
+  for (std::string line; std::getline(lines, line);) std::cout << Printable(line) << '\n';
 }

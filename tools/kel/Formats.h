@@ -37,7 +37,8 @@ struct SourceList {
   std::vector<IncludeDirectory> includeDirectories;
 };
 
-// Writes to standard output, in one of those formats.
+// Writes to standard output, in one of those formats. A terminal is shown control characters as
+// \xNN; a file or pipe gets each byte of a name.
 void WriteSources(const SourceList& list, const std::string& format);
 
 #endif
