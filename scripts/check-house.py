@@ -30,7 +30,8 @@ RANKS = [
     (7, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
     (8, r"(include|s)/Tarvo_KelIP(_Catalogues)?\..*"),
     (9, r"(include|s)/Tarvo_KelLibrary\..*"),
-    (10, r"(tools|tests|bench|examples|fuzz)/.*"),
+    (10, r"(tools|tests|bench|examples)/.*"),
+    (11, r"fuzz/.*"),
 ]
 # What one of these may not include, whatever its rank.
 FORBIDDEN = [
@@ -39,8 +40,8 @@ FORBIDDEN = [
     (r"(s|include)/.*", r"(unistd|fcntl|sys/.*|dirent)(\.h)?", "only platform/ makes system calls"),
 ]
 # A header of these folders is private, and only these may include it.
-PRIVATE = [(r"s/.*", r"s/.*|tests/unit/.*"), (r"platform/s/.*", r"platform/s/.*"),
-           (r"tools/.*", r"tools/.*"), (r"tests/.*", r"tests/.*"), (r"bench/.*", r"bench/.*")]
+PRIVATE = [(r"s/.*", r"s/.*|tests/unit/.*|fuzz/.*"), (r"platform/s/.*", r"platform/s/.*"),
+           (r"tools/.*", r"tools/.*"), (r"tests/.*", r"(tests|fuzz)/.*"), (r"bench/.*", r"bench/.*")]
 INCLUDE = re.compile(r'^\s*#\s*include\s*[<"]([^>"]+)[>"]')
 
 
@@ -49,7 +50,7 @@ def rank_of(path):
     for rank, pattern in RANKS:
         if re.fullmatch(pattern, path):
             stem = re.sub("_(Hdl|Catalogues|Candidate)$", "", pathlib.Path(path).stem)  # second sources
-            module = path.split("/")[0] if rank in (0, 10) else stem
+            module = path.split("/")[0] if rank in (0, 10, 11) else stem
             return rank, module
     return None
 
