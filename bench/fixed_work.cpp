@@ -1,5 +1,5 @@
-// Work of a fixed size, whose instructions scripts/check-instructions.py counts: a walk, a request for
-// everything of one core, and an analyse order. Nothing here may depend on time or place.
+// Work of a fixed size, whose instructions scripts/check-instructions.py counts: a walk, a request
+// for everything of one core, and an analyse order. Nothing here may depend on time or place.
 
 #include <cstddef>
 #include <cstdlib>
