@@ -167,13 +167,10 @@ void Add(benchmark::State& state, std::string (*shape)(int)) {
 std::string ManyCores(int i) { return CoreName(i) + "_v1_00_a"; }
 std::string NewestLast(int i) { return "core_v" + std::to_string(i) + "_00_a"; }
 std::string NewestFirst(int i) { return NewestLast(1'000'000 - i); }
-// One version, written in as many ways.
-std::string EqualVersions(int i) { return "core_v" + std::string(1 + i, '0') + "_00_a"; }
 
 BENCHMARK_CAPTURE(Add, many_cores, ManyCores)->Arg(5000)->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(Add, newest_last, NewestLast)->Arg(5000)->Unit(benchmark::kMillisecond);
 BENCHMARK_CAPTURE(Add, newest_first, NewestFirst)->Arg(5000)->Unit(benchmark::kMillisecond);
-BENCHMARK_CAPTURE(Add, equal_versions, EqualVersions)->Arg(100)->Unit(benchmark::kMillisecond);
 
 }  // namespace
 

@@ -24,10 +24,10 @@ class QVRParser;
 //
 // The file has a header and rows; `#` begins a comment.
 //
-//     MODE WIDTH FILES                   names of parameters, then the word FILES in any letter
-//     case fast 32    a.edn, b.edn            a value for each of them, then one or more netlists
-//     fast 64    OTHER:sub/c.edn         a netlist of another core, by its key or bare name
-//     "a b" ''   "my file.edn"           quotes for what holds blanks or commas, or is empty
+//     MODE WIDTH FILES              names of parameters, and FILES in any letter case
+//     fast 32    a.edn, b.edn       a value for each of them, then one or more netlists
+//     fast 64    OTHER:sub/c.edn    a netlist of another core, by its key or bare name
+//     "a b" ''   "my file.edn"      quotes for what holds blanks or commas, or is empty
 //
 // Values stand apart by blanks, netlists by commas. What stands behind FILES, and behind the last
 // netlist, is ignored. Netlists lie in the `netlist` directory of their core, the library; whether

@@ -7,9 +7,8 @@
 // The statements of a core description, for both of its readers: the one of options alone, and the
 // one of everything. A statement is a line that begins with one of five keywords:
 //
-//     OPTION name = value                             the value runs to the end of the line
-//     PARAMETER name = value, key = value, ...        and likewise BUS_INTERFACE, IO_INTERFACE,
-//     PORT
+//     OPTION name = value                         the value runs to the end of the line
+//     PARAMETER name = value, key = value, ...    and likewise PORT and the two interfaces
 //
 // Values are those of TokenReader. In a list a comma goes on to a further pair if something stands
 // behind it; at anything else the list is over, and the rest of the line is ignored.
