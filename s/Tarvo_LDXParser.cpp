@@ -187,7 +187,7 @@ LDXParser::SourcePointers LDXParser::Side::Merge(Side& other) {
     }
     for (const SourcePointer& source : library.sources) {
       const std::string_view fileKey = source->fileKey.View();
-      const bool isNew = other.byLocation ? other.owners.count(fileKey) == 0
+      const bool isNew = other.byLocation ? !other.owners.contains(fileKey)
                                           : owners.try_emplace(fileKey, source.get()).second;
       if (isNew) {
         Append(source);

@@ -24,7 +24,6 @@ namespace {
 
 using namespace Tarvo;
 namespace fs = std::filesystem;
-using testing::ElementsAre;
 using testing::HasSubstr;
 using testing::IsEmpty;
 
