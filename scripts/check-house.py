@@ -30,6 +30,7 @@ RANKS = [
     (7, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
     (8, r"(include|s)/Tarvo_KelIP(_Catalogues)?\..*"),
     (9, r"(include|s)/Tarvo_KelLibrary\..*"),
+    (9.5, r"s/Tarvo_Version\.cpp"),
     (10, r"(tools|tests|bench|examples)/.*"),
     (11, r"fuzz/.*"),
 ]

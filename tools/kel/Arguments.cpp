@@ -6,6 +6,7 @@
 
 #include "Describe.h"
 #include "Formats.h"
+#include "Tarvo_Version.h"
 
 namespace {
 
@@ -104,7 +105,7 @@ void DescribeHelp(CLI::App& app, Call& call) {
 void DescribeCall(CLI::App& app, Call& call) {
   app.name("kel");
   app.description("Answers questions about repositories of IP cores.");
-  app.set_version_flag("--version", "kel " KEL_VERSION_TEXT);
+  app.set_version_flag("--version", std::string("kel ") + Tarvo::GetLibraryVersion());
   app.add_option("-L,--library", call.libraries,
                  "A repository, or several with ';' between; may be repeated, the first wins")
       ->type_name("DIR")
