@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
 # Installs the Debian packages that are missing, as root or through sudo.
-# Usage: install-dependencies.sh GROUP...   with the groups build, test, tools and check
+# Usage: install-dependencies.sh GROUP...   with the groups build, test, tools, check and package
 set -euo pipefail
 
 declare -A groups=(
@@ -8,7 +8,9 @@ declare -A groups=(
           nlohmann-json3-dev"
   [test]="libgtest-dev libgmock-dev libbenchmark-dev"
   [tools]="ghdl iverilog verilator yosys tcl python3-jsonschema"
-  [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3 valgrind"
+  [package]="dpkg-dev file libgtest-dev libgmock-dev"
+  [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3 valgrind
+          doxygen"
 )
 
 missing=()
