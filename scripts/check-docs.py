@@ -5,8 +5,10 @@ Usage: check-docs.py [BUILD_DIRECTORY]
 
 In a `console` block a line behind "$ " is run with the built `kel` on the path, and the lines below
 it are what it must print; a line of three dots stands for the rest. A line that ends in a backslash
-goes on in the next. In a manual page the blocks are those between .EX and .EE. The `cpp` block of
-README.md is compiled and run as README.md says. The project's directory is written /home/me/kel.
+goes on in the next. In a manual page the blocks are those between .EX and .EE. Each `cpp` block is
+compiled and run as README.md says, and prints what the `text` block behind it shows. Data files, whose
+first line is a comment with their path, make a repository, in which the document's lines are then run.
+The project's directory is written /home/me/kel. And the headers' pages come without a warning.
 """
 
 import os
@@ -17,7 +19,7 @@ import sys
 import tempfile
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
-DOCUMENTS = ["README.md", "docs/kel.1"]
+DOCUMENTS = ["README.md", "docs/guide.md", "docs/formats.md", "docs/kel.1"]
 SHOWN_ROOT = "/home/me/kel"
 
 
@@ -48,40 +50,79 @@ def matches(expected, printed):
     return printed == expected
 
 
-def console_faults(name, text, environment):
+def console_faults(name, text, environment, directory):
     found = list(blocks(text, "console") if name.endswith(".md") else manual_blocks(text))
-    if not found:
-        yield f"{name}: has no examples"
     for block in found:
         for command, expected in re.findall(r"^\$ ((?:.*\\\n)*.*)\n((?:(?!\$ ).*\n)*)", block,
                                             re.MULTILINE):
-            printed = run(command, environment)
+            printed = run(command, environment, directory)
             if not matches(expected, printed):
                 yield f"{name}: $ {command}\nprints\n{printed}"
 
 
-def program_faults(text, build, environment):
-    """The compiler's call stands in the block that names the program's file, and what the program
-    prints in the one block of text."""
-    (program,) = blocks(text, "cpp")
-    (call,) = [block for block in blocks(text, "sh") if "program.cpp" in block]
+def call_of(readme):
+    """The plain compiler's call that the README shows."""
+    (call,) = [block for block in blocks(readme, "sh") if "program.cpp" in block]
+    return call
+
+
+def program_faults(name, text, call, build, environment):
+    """Each program is built by the call, and prints what the next block of text shows."""
+    pairs = re.findall(r"^```cpp\n(.*?)^```$.*?^```text\n(.*?)^```$", text, re.MULTILINE | re.DOTALL)
+    if len(pairs) != len(blocks(text, "cpp")):
+        yield f"{name}: a program without what it prints"
+    call = call.replace("build/demo", build).replace("-Iinclude", f"-Iinclude -I{build}/include")
+    for program, shown in pairs:
+        with tempfile.TemporaryDirectory() as scratch:
+            source, binary = pathlib.Path(scratch, "program.cpp"), pathlib.Path(scratch, "program")
+            source.write_text(program)
+            printed = run(call.replace("program.cpp", str(source)).replace("-o program", f"-o {binary}") +
+                          f"\n{binary}", environment)
+        if not matches(shown, printed):
+            yield f"{name}: a program prints\n{printed}"
+
+
+def write_files(text, directory):
+    """Writes each data file that a document shows: its first line is a comment with its path."""
+    for extension in ("qvr", "ldx", "tew"):
+        for block in blocks(text, extension):
+            path = directory / block.split("\n")[0].removeprefix("# ")
+            path.parent.mkdir(parents=True, exist_ok=True)
+            path.write_text(block)
+
+
+def document_faults(name, call, build, environment):
+    text = (ROOT / name).read_text()
     with tempfile.TemporaryDirectory() as scratch:
-        source, binary = pathlib.Path(scratch, "program.cpp"), pathlib.Path(scratch, "program")
-        source.write_text(program)
-        call = call.replace("program.cpp", str(source)).replace("-o program", f"-o {binary}")
-        printed = run(call.replace("build/demo", build) + f"\n{binary}", environment)
-    (shown,) = blocks(text, "text")
-    if printed != shown:
-        yield f"README.md: the program prints\n{printed}"
+        write_files(text, pathlib.Path(scratch))
+        shows_files = any(pathlib.Path(scratch).iterdir())
+        if shows_files:
+            # All is well but for the sources and netlists, which a document doesn't hold.
+            findings = run("kel -L . check", environment, scratch).splitlines()[:-1]
+            bad = [finding for finding in findings if " does not exist: " not in finding]
+            if bad or not findings:
+                yield f"{name}: its files are not good:\n{bad}"
+        yield from console_faults(name, text, environment, scratch if shows_files else ROOT)
+    yield from program_faults(name, text, call, build, environment)
+
+
+def page_faults(environment):
+    """The pages of the headers, without a warning."""
+    printed = run("mkdir -p build && doxygen docs/Doxyfile", environment)
+    if "warning" in printed or "error" in printed:
+        yield f"docs/Doxyfile: {printed}"
 
 
 def main():
     build = sys.argv[1] if len(sys.argv) > 1 else "build/gcc-release"
     environment = dict(os.environ, PATH=f"{ROOT / build / 'bin'}:{os.environ['PATH']}")
     faults = []
+    readme = (ROOT / "README.md").read_text()
     for name in DOCUMENTS:
-        faults += console_faults(name, (ROOT / name).read_text(), environment)
-    faults += program_faults((ROOT / "README.md").read_text(), build, environment)
+        faults += document_faults(name, call_of(readme), build, environment)
+    if blocks(readme, "cpp") != [(ROOT / "examples/consumer/program.cpp").read_text()]:
+        faults.append("examples/consumer/program.cpp is not the program of README.md")
+    faults += page_faults(environment)
     print("\n".join(faults) or "The documents' examples print what they show")
     return 1 if faults else 0
 
