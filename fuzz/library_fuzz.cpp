@@ -12,9 +12,9 @@
 #include "Law.h"
 #include "Port_MsgManData.h"
 #include "Questions.h"
+#include "RepositoryBuilder.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary.h"
-#include "Workspace.h"
 
 namespace {
 
@@ -40,19 +40,19 @@ std::vector<std::string_view> Cut(std::string_view input) {
 }
 
 // What the input before left is exchanged, so that directories need not be made anew.
-void MakeRepository(const Workspace& workspace, const std::vector<std::string_view>& pieces) {
-  static fs::path third = workspace.Path("ipmods/abc_v1_00_a/include/x");
+void MakeRepository(RepositoryBuilder& repo, const std::vector<std::string_view>& pieces) {
+  static fs::path third;
   std::error_code error;
-  fs::remove(third, error);
+  if (!third.empty()) fs::remove(third, error);
   std::string name(pieces.front().substr(0, 255));
   for (char& c : name) c = c == '/' ? '_' : c;
-  third = fs::path(workspace.Path("ipmods/x")).replace_filename(name);
+  third = fs::path(repo / "ipmods/x").replace_filename(name);
   fs::create_directory(third, error);
   for (std::size_t i = 0; i < std::size(kFiles); ++i) {
     if (i + 1 < pieces.size()) {
-      workspace.Write(kFiles[i], pieces[i + 1]);
+      repo.File(kFiles[i], std::string(pieces[i + 1]));
     } else {
-      fs::remove(workspace.Path(kFiles[i]), error);
+      fs::remove(repo / kFiles[i], error);
     }
   }
 }
@@ -157,13 +157,14 @@ void AskCore(const KelLibrary& library, const StringBase& key, std::string_view 
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  static const Workspace workspace;
+  static RepositoryBuilder repo;
+  static const bool made = fs::create_directories(repo / "ipmods/abc_v1_00_a/include");
+  Law(made, "there is a directory to work in");
   Port_MsgManData::setHandler([](const Port_Message&) { ++messages; });
   const std::string_view input(reinterpret_cast<const char*>(data), size);
-  MakeRepository(workspace, Cut(input));
+  MakeRepository(repo, Cut(input));
   KelLibrary library;
-  const std::string path = fs::path(workspace.Path("x")).parent_path();
-  Asked([&] { return library.SetRepositoryPath(path.c_str()); });
+  Asked([&] { return library.SetRepositoryPath(repo.Path().c_str()); });
   StringList keys;
   Law(library.ListAllIPKeys(keys), "keys can be listed");
   for (const StringBase& key : keys) AskCore(library, key, input);

@@ -12,6 +12,7 @@
 #include "Port_FileName.h"
 #include "Port_MsgManData.h"
 #include "Questions.h"
+#include "RepositoryBuilder.h"
 #include "Tarvo_AppException.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_Kel_Index.h"
@@ -20,7 +21,6 @@
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_TEWParser.h"
 #include "Tarvo_TokenReader.h"
-#include "Workspace.h"
 
 namespace {
 
@@ -37,26 +37,24 @@ class Cores {
  public:
   Cores() {
     for (const char* const name : {"abc_v1_00_a", "def_v2_00_b"}) {
-      const Kel_Key key(name);
+      const auto core = repo.Core(name)
+                            .Qvr("OPTION HDL = MIXED\nPARAMETER P = 1\nPARAMETER Q = 2\n")
+                            .Ldx("lib " + std::string(name) + " one.vhd\nlib abc_v1_00_a two\n");
       FileName location;
-      location.SetHead((workspace.Path("ipmods/") + name).c_str());
-      const std::string data = "ipmods/" + std::string(name) + "/data/" + key.GetName().GetText();
-      workspace.Write(data + "_v2_1_0.qvr",
-                      "OPTION HDL = MIXED\nPARAMETER P = 1\nPARAMETER Q = 2\n");
-      workspace.Write(data + "_v2_1_0.ldx",
-                      "lib " + std::string(name) + " one.vhd\nlib abc_v1_00_a two\n");
-      index.AddIP(key, location);
+      location.SetHead(core.Location().c_str());
+      index.AddIP(Kel_Key(name), location);
     }
   }
 
-  FileName Write(std::string_view content) const {
-    return FileName(workspace.Write("file", content).c_str());
+  FileName Write(std::string_view content) {
+    repo.File("file", std::string(content));
+    return FileName((repo / "file").c_str());
   }
 
   Kel_Index index;
 
  private:
-  Workspace workspace;
+  RepositoryBuilder repo;
 };
 
 // The result of what may throw an exception of ours, and nothing else; null then.
@@ -84,7 +82,7 @@ void CheckTokens(std::string_view line) {
   }
 }
 
-void ReadLines(const Cores& cores, std::string_view content) {
+void ReadLines(Cores& cores, std::string_view content) {
   FileScanner views(cores.Write(content));
   FileScanner copies = views;
   std::string_view line;
@@ -117,7 +115,7 @@ bool ReadDifferently(std::string_view content) {
   return false;
 }
 
-void ReadDescription(const Cores& cores, std::string_view content) {
+void ReadDescription(Cores& cores, std::string_view content) {
   const FileName file = cores.Write(content);
   const auto options =
       Made([&] { return std::make_unique<OptionScanner>(Kel_Key("abc_v1_00_a"), file); });
@@ -144,7 +142,7 @@ void ReadDescription(const Cores& cores, std::string_view content) {
   Law(stated == scanned, "both find the same options");
 }
 
-void ReadOrder(const Cores& cores, std::string_view content) {
+void ReadOrder(Cores& cores, std::string_view content) {
   const Kel_Key key("abc_v1_00_a");
   if (content.empty()) return;
   const FileName file = cores.Write(content.substr(1));
@@ -170,7 +168,7 @@ void ReadOrder(const Cores& cores, std::string_view content) {
   }
 }
 
-void ReadBlackBoxes(const Cores& cores, std::string_view content) {
+void ReadBlackBoxes(Cores& cores, std::string_view content) {
   const Kel_Key key("abc_v1_00_a");
   const FileName file = cores.Write(content);
   QVRParser parser(cores.index, key);
@@ -187,7 +185,7 @@ void ReadBlackBoxes(const Cores& cores, std::string_view content) {
   }
 }
 
-void ReadKey(const Cores&, std::string_view content) {
+void ReadKey(Cores&, std::string_view content) {
   const Kel_Key key{StringBase(content)};
   const Kel_Key again(key.GetKey());
   Law(again == key && again.IsValid() == key.IsValid(), "a key reads its own text");
@@ -198,13 +196,13 @@ void ReadKey(const Cores&, std::string_view content) {
       "a key begins with its name");
 }
 
-constexpr void (*kReaders[])(const Cores&, std::string_view) = {ReadLines, ReadDescription,
-                                                                ReadOrder, ReadBlackBoxes, ReadKey};
+constexpr void (*kReaders[])(Cores&, std::string_view) = {ReadLines, ReadDescription, ReadOrder,
+                                                          ReadBlackBoxes, ReadKey};
 
 }  // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  static const Cores cores;
+  static Cores cores;
   Port_MsgManData::setHandler([](const Port_Message&) {});
   if (size == 0) return 0;
   const std::string_view content(reinterpret_cast<const char*>(data) + 1, size - 1);
