@@ -36,12 +36,20 @@ install(FILES "${PROJECT_BINARY_DIR}/TarvoKelConfig.cmake"
 # The build tree is a package too, for find_package with TarvoKel_DIR.
 export(EXPORT TarvoKelTargets NAMESPACE TarvoKel:: FILE "${PROJECT_BINARY_DIR}/TarvoKelTargets.cmake")
 
+# A shared library knows itself what it needs; pkg-config would ask for it wherever programs are built.
+if(NOT BUILD_SHARED_LIBS)
+  set(KEL_PRIVATE_NEEDS "Libs.private: -lboost_filesystem\nRequires.private: libpcre2-8\n")
+endif()
 configure_file(cmake/tarvo-kel.pc.in tarvo-kel.pc @ONLY)
 install(FILES "${PROJECT_BINARY_DIR}/tarvo-kel.pc" DESTINATION "${CMAKE_INSTALL_LIBDIR}/pkgconfig"
   COMPONENT development)
 
 install(TARGETS kel RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}" COMPONENT command)
-install(FILES docs/kel.1 DESTINATION "${CMAKE_INSTALL_MANDIR}/man1" COMPONENT command)
+set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS docs/kel.1)
+execute_process(COMMAND gzip -9 --no-name --stdout "${PROJECT_SOURCE_DIR}/docs/kel.1"
+  OUTPUT_FILE "${PROJECT_BINARY_DIR}/kel.1.gz" COMMAND_ERROR_IS_FATAL ANY)
+install(FILES "${PROJECT_BINARY_DIR}/kel.1.gz" DESTINATION "${CMAKE_INSTALL_MANDIR}/man1"
+  COMPONENT command)
 install(FILES tools/kel/completions/kel.bash COMPONENT command
   DESTINATION "${CMAKE_INSTALL_DATADIR}/bash-completion/completions" RENAME kel)
 install(FILES tools/kel/completions/_kel COMPONENT command

@@ -23,6 +23,9 @@ set(CPACK_DEBIAN_DEVELOPMENT_PACKAGE_DEPENDS "${KEL_LIBRARY_PACKAGE} (= ${PROJEC
 set(CPACK_DEBIAN_COMMAND_PACKAGE_NAME kel)
 set(CPACK_DEBIAN_COMMAND_PACKAGE_SECTION electronics)
 set(CPACK_DEBIAN_COMMAND_PACKAGE_DEPENDS "${KEL_LIBRARY_PACKAGE} (= ${PROJECT_VERSION})")
+# Debian's linker is told of new libraries by a trigger.
+file(WRITE "${PROJECT_BINARY_DIR}/triggers" "activate-noawait ldconfig\n")
+set(CPACK_DEBIAN_LIBRARY_PACKAGE_CONTROL_EXTRA "${PROJECT_BINARY_DIR}/triggers")
 set(CPACK_COMPONENT_LIBRARY_DESCRIPTION "The shared libraries.")
 set(CPACK_COMPONENT_DEVELOPMENT_DESCRIPTION "Headers, and what CMake and pkg-config ask for.")
 set(CPACK_COMPONENT_COMMAND_DESCRIPTION "The command, its manual page and completions.")

@@ -23,10 +23,11 @@ consume_by_cmake() { # NAME CMAKE_ARGUMENT...
   expect_ports "$scratch/$name/program"
 }
 
+# No module but ours is there to be found: who links the shared library needs no other.
 consume_by_pkg_config() { # LIBRARY_DIRECTORY PKG_CONFIG_ARGUMENT...
   local libraries=$1
   shift
-  export PKG_CONFIG_PATH=$libraries/pkgconfig
+  local -x PKG_CONFIG_LIBDIR=$libraries/pkgconfig
   # Words of several flags are to be split.
   # shellcheck disable=SC2046
   g++ -std=c++17 $(pkg-config --cflags tarvo-kel) examples/consumer/program.cpp -o "$scratch/plain" \
@@ -82,7 +83,8 @@ cmake --build build/static
 cmake --install build/static >/dev/null
 libraries=$(dirname "$(find "$scratch/static" -name libtarvo_kel.a)")
 consume_by_cmake static-cmake -DCMAKE_PREFIX_PATH="$scratch/static"
-consume_by_pkg_config "$libraries" --static
+modules=$(pkg-config --variable pc_path pkg-config)
+PKG_CONFIG_PATH=$modules consume_by_pkg_config "$libraries" --static
 
 say "a project that adds this one"
 mkdir "$scratch/parent"
