@@ -57,7 +57,10 @@ g++ -std=c++17 $(pkg-config --cflags tarvo-kel) examples/consumer/program.cpp -o
 files=$(dpkg -L kel libtarvo-kel0 libtarvo-kel-dev | sort -u)
 apt-get purge -qq kel libtarvo-kel0 libtarvo-kel-dev >/dev/null
 for file in $files; do
-  if [ -f "$file" ] || [ -L "$file" ] || [ "${file##*/}" = tarvo ]; then echo "left behind: $file"; exit 1; fi
+  if [ -f "$file" ] || [ -L "$file" ] || [ -d "$file/tarvo" ]; then
+    echo "left behind: $file"
+    exit 1
+  fi
 done
 END
 say "all good"
