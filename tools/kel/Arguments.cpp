@@ -18,11 +18,16 @@ const char* const kFooter =
     "Exit status: 0 all well, 1 something was found or a key is unknown, 2 the words of\n"
     "the call are wrong, 3 the repository path can't be set. 'kel help VERB' shows an example.\n";
 
+const char* const kVerbNames = "list, which, show, sources, netlists, check or help";
+
 // A verb, with an example of its use.
 CLI::App* AddVerb(CLI::App& app, Call& call, const char* name, const char* help,
                   const char* example) {
   CLI::App* const verb = app.add_subcommand(name, help);
-  verb->footer(std::string("Example: kel -L examples/repository ") + example + "\n");
+  verb->group("Verbs");
+  verb->footer(std::string("Every verb takes -L, --json, --trace, --quiet and --color too; see "
+                           "'kel help'.\nExample: kel -L examples/repository ") +
+               example + "\n");
   verb->callback([&call, name] { call.verb = name; });
   return verb;
 }
@@ -63,7 +68,11 @@ void DescribeSources(CLI::App& app, Call& call) {
   sources->add_option("--for", call.purpose, "What the sources are analysed for")
       ->check(CLI::IsMember({"synthesis", "simulation"}))
       ->required();
-  sources->add_option("--format", call.format, "How they are written; 'list' is a path on a line")
+  sources
+      ->add_option("--format", call.format,
+                   "How they are written: list (a path on a line), json, f (file list for Verilog\n"
+                   "tools), ghdl (script for GHDL), edam (for flow generators), vhdl_ls (for the\n"
+                   "VHDL language server) or tcl")
       ->check(CLI::IsMember(FormatNames()))
       ->default_str("list");
   sources->add_option("--relative-to", call.relativeTo, "Write paths relative to this directory")
@@ -97,14 +106,15 @@ void DescribeCheck(CLI::App& app, Call& call) {
 }
 
 void DescribeHelp(CLI::App& app, Call& call) {
-  CLI::App* const help =
-      AddVerb(app, call, "help", "Shows this help, or that of a verb", "help list");
+  CLI::App* const help = AddVerb(app, call, "help", "Shows this help, or that of a verb", "");
+  help->footer("Example: kel help list\n");
   help->add_option("VERB", call.key, "The verb");
 }
 
 void DescribeCall(CLI::App& app, Call& call) {
   app.name("kel");
   app.description("Answers questions about repositories of IP cores.");
+  app.get_formatter()->label("SUBCOMMAND", "VERB");
   app.set_version_flag("--version", std::string("kel ") + Tarvo::GetLibraryVersion());
   app.add_option("-L,--library", call.libraries,
                  "A repository, or several with ';' between; may be repeated, the first wins")
@@ -126,15 +136,18 @@ void DescribeCall(CLI::App& app, Call& call) {
   }
 }
 
+std::string NoVerb(const std::string& word) {
+  return "there is no verb '" + word + "', but " + kVerbNames;
+}
+
 // What is wrong with a call that parsed, or an empty text.
 std::string Fault(const CLI::App& app, const Call& call) {
   const std::vector<std::string> extras = app.remaining(true);
-  const std::string verbs = "list, which, show, sources, netlists or check";
   if (call.verb.empty() && !extras.empty() && extras.front().front() != '-') {
-    return "there is no verb '" + extras.front() + "', but " + verbs;
+    return NoVerb(extras.front());
   }
   if (!extras.empty()) return "'" + extras.front() + "' is not expected here";
-  if (call.verb.empty()) return "a verb is required: " + verbs;
+  if (call.verb.empty()) return std::string("a verb is required: ") + kVerbNames;
   if (call.asJson && !call.format.empty() && call.format != "json") {
     return "--json and --format " + call.format + " exclude each other";
   }
@@ -183,16 +196,15 @@ void Unmark(Call& call) {
 }
 
 Status ShowHelp(const CLI::App& app, const std::string& verb) {
-  const CLI::App* shown = &app;
-  if (!verb.empty()) {
-    try {
-      shown = app.get_subcommand(verb);
-    } catch (const CLI::OptionNotFound&) {
-      return Refuse("there is no verb '" + verb + "'", "");
-    }
+  try {
+    const CLI::App* const shown = verb.empty() ? &app : app.get_subcommand(verb);
+    // The application's own operation would give the help of the verb `help`.
+    std::cout << app.get_formatter()->make_help(shown, verb.empty() ? "kel" : "kel " + verb,
+                                                CLI::AppFormatMode::Normal);
+    return StatusClean;
+  } catch (const CLI::OptionNotFound&) {
+    return Refuse(NoVerb(verb), "");
   }
-  std::cout << shown->help(shown == &app ? "" : "kel");
-  return StatusClean;
 }
 
 }  // namespace

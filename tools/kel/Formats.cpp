@@ -9,6 +9,7 @@
 #include <sstream>
 #include <string_view>
 
+#include "Messages.h"
 #include "Table.h"
 #include "Text.h"
 
@@ -180,10 +181,24 @@ void WriteTcl(const SourceList& list) {
 struct Format {
   const char* name;
   void (*write)(const SourceList&);
+  const char* language;  // the only one that it has room for, if there is one
 };
-const Format kFormats[] = {{"list", WriteList}, {"json", WriteJsonList}, {"f", WriteFileList},
-                           {"ghdl", WriteGhdl}, {"edam", WriteEdam},     {"vhdl_ls", WriteVhdlLs},
-                           {"tcl", WriteTcl}};
+const Format kFormats[] = {{"list", WriteList, nullptr},   {"json", WriteJsonList, nullptr},
+                           {"f", WriteFileList, kVerilog}, {"ghdl", WriteGhdl, kVhdl},
+                           {"edam", WriteEdam, nullptr},   {"vhdl_ls", WriteVhdlLs, kVhdl},
+                           {"tcl", WriteTcl, nullptr}};
+
+// Whoever asks for one language should know that the core has more.
+void NoteWhatIsLeftOut(const Format& format, const SourceList& list) {
+  if (format.language == nullptr) return;
+  const auto left =
+      std::count_if(list.sources.begin(), list.sources.end(),
+                    [&](const Source& source) { return source.language != format.language; });
+  if (left == 0) return;
+  Messages::Note(std::string("the format ") + format.name + " is for " + format.language +
+                 " alone, and leaves out " + std::to_string(left) + " of " +
+                 std::to_string(list.sources.size()) + " sources");
+}
 
 // While one of these lives, what is written to standard output is kept.
 class Keeper {
@@ -219,6 +234,7 @@ void WriteSources(const SourceList& list, const std::string& format) {
       std::find_if(std::begin(kFormats), std::end(kFormats),
                    [&](const Format& candidate) { return candidate.name == format; });
   if (chosen == std::end(kFormats)) return;
+  NoteWhatIsLeftOut(*chosen, list);
   if (::isatty(STDOUT_FILENO) == 0) return chosen->write(list);
   std::istringstream lines(WrittenBy(*chosen, list));
   for (std::string line; std::getline(lines, line);) std::cout << Printable(line) << '\n';

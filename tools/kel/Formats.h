@@ -16,7 +16,8 @@
 //     vhdl_ls    the configuration of the VHDL language server
 //     tcl        a script that sets a list of sources and one of include directories
 //
-// Every format keeps the order, and the libraries where it can say them.
+// Every format keeps the order, and the libraries where it can say them. Those for one language
+// leave out the sources of the other.
 std::vector<std::string> FormatNames();
 
 struct Source {
@@ -37,8 +38,8 @@ struct SourceList {
   std::vector<IncludeDirectory> includeDirectories;
 };
 
-// Writes to standard output, in one of those formats. A terminal is shown control characters as
-// \xNN; a file or pipe gets each byte of a name.
+// Writes to standard output, in one of those formats, and notes what the format leaves out. A
+// terminal is shown control characters as \xNN; a file or pipe gets each byte of a name.
 void WriteSources(const SourceList& list, const std::string& format);
 
 #endif

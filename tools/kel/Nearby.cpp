@@ -1,8 +1,10 @@
 #include "Nearby.h"
 
 #include <algorithm>
+#include <filesystem>
 #include <numeric>
 #include <set>
+#include <utility>
 #include <vector>
 
 #include "Messages.h"
@@ -12,29 +14,48 @@
 
 namespace {
 
+namespace fs = std::filesystem;
 using Tarvo::Kel_Key;
 using Tarvo::StringBase;
 
-// How many letters must be added, left out or changed to make one text of the other.
+// How many letters must be added, left out, changed or exchanged with their neighbour to make one
+// text of the other.
 std::size_t Distance(const std::string& left, const std::string& right) {
-  std::vector<std::size_t> row(right.size() + 1);
-  std::iota(row.begin(), row.end(), 0U);
-  for (const char letter : left) {
-    std::size_t diagonal = row[0]++;
+  using Row = std::vector<std::size_t>;
+  Row before;
+  Row above(right.size() + 1);
+  std::iota(above.begin(), above.end(), 0U);
+  for (std::size_t i = 0; i < left.size(); ++i) {
+    Row row = {i + 1};
     for (std::size_t j = 0; j < right.size(); ++j) {
-      const std::size_t change = diagonal + (letter == right[j] ? 0 : 1);
-      diagonal = row[j + 1];
-      row[j + 1] = std::min({change, row[j] + 1, diagonal + 1});
+      const std::size_t change = above[j] + (left[i] == right[j] ? 0 : 1);
+      row.push_back(std::min({change, above[j + 1] + 1, row[j] + 1}));
+      const bool exchanged = i > 0 && j > 0 && left[i] == right[j - 1] && left[i - 1] == right[j];
+      if (exchanged) row.back() = std::min(row.back(), before[j - 1] + 1);
     }
+    before = std::exchange(above, std::move(row));
   }
-  return row.back();
+  return above.back();
 }
 
-// A third of the letters may be wrong, and a name that goes on behind the text is near as well.
-bool IsNear(const std::string& name, const std::string& text) {
-  if (text.empty()) return false;
-  return name.rfind(text, 0) == 0 ||
-         Distance(name, text) <= std::max<std::size_t>(1, text.size() / 3);
+bool IsRepository(const fs::path& directory) {
+  std::error_code error;
+  return fs::is_directory(directory / "ipmods", error);
+}
+
+// The nearest repository above a directory, and those right in it.
+std::set<std::string> RepositoriesNear(const fs::path& directory) {
+  std::set<std::string> near;
+  for (fs::path above = directory; near.empty() && above != above.root_path();) {
+    above = above.parent_path();
+    if (IsRepository(above)) near.insert(above);
+  }
+  std::error_code error;
+  for (fs::directory_iterator entry(directory, error), end; !error && entry != end;
+       entry.increment(error)) {
+    if (IsRepository(entry->path())) near.insert(entry->path());
+  }
+  return near;
 }
 
 std::string Join(const std::set<std::string>& texts) {
@@ -44,6 +65,12 @@ std::string Join(const std::set<std::string>& texts) {
 }
 
 }  // namespace
+
+bool IsNear(const std::string& word, const std::string& text) {
+  if (text.empty()) return false;
+  return word.rfind(text, 0) == 0 ||
+         Distance(word, text) <= std::max<std::size_t>(1, text.size() / 3);
+}
 
 void SuggestKeys(const Call& call, const std::string& key) {
   const Kel_Key asked{StringBase(key.c_str())};
@@ -64,5 +91,16 @@ void SuggestKeys(const Call& call, const std::string& key) {
     Messages::Note("the versions of this core are " + Join(versions));
   } else if (!names.empty()) {
     Messages::Note("a near name is " + Join(names));
+  }
+}
+
+void SuggestRepositories(const Call& call) {
+  for (const std::string& repository : Repositories(call)) {
+    std::error_code error;
+    if (!fs::is_directory(repository, error) || IsRepository(repository)) continue;
+    const fs::path directory = fs::absolute(repository).lexically_normal();
+    const std::string near = Join(RepositoriesNear(directory));
+    Messages::Note(repository + " has no directory 'ipmods', so it is no repository" +
+                   (near.empty() ? "" : "; near it is " + near));
   }
 }

@@ -9,4 +9,11 @@
 // near to it. None for a core that is there but can't be opened, whose own error tells enough.
 void SuggestKeys(const Call& call, const std::string& key);
 
+// A note for each directory of a call that is no repository, with those that are near to it.
+void SuggestRepositories(const Call& call);
+
+// Whether somebody who wrote the text may well have meant the word: it begins so, or differs in at
+// most a third of its letters. Two neighbours that changed places are one difference.
+bool IsNear(const std::string& word, const std::string& text);
+
 #endif

@@ -11,6 +11,7 @@
 
 #include "Arguments.h"
 #include "Messages.h"
+#include "Nearby.h"
 #include "Tarvo_AppException.h"
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Verbs.h"
@@ -62,8 +63,9 @@ Status Run(const Call& call) {
   Tarvo::KelLibrary library;
   const Tarvo::StringBase path = RepositoryPath(call);
   if (call.verb == "check" && IsPath(path)) return Check(library, call);
-  if (!library.SetRepositoryPath(path) && (!IsPath(path) || IsEmpty(library))) {
-    return StatusUnreadable;
+  if (!library.SetRepositoryPath(path)) {
+    SuggestRepositories(call);
+    if (!IsPath(path) || IsEmpty(library)) return StatusUnreadable;
   }
   const int walkErrors = call.verb == "list" ? 0 : Messages::ErrorCount();
   const Status status = kVerbs.at(call.verb)(library, call);
