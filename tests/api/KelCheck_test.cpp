@@ -68,7 +68,7 @@ TEST(KelCheck, NamesEachFaultOnceAtItsLine) {
       "l4_v1_00_a/data/l4_v2_1_0.ldx:1: error: File a.v declared to be VHDL\n"
       "l5_v1_00_a/data/l5_v2_1_0.ldx: warning: File l5_v1_00_a:a.vhd is listed "
       "already\n"
-      "l6_v1_00_a/data/l6_v2_1_0.ldx: error: Unknown HDL language specified\n"
+      "l6_v1_00_a/data/l6_v2_1_0.ldx:1: error: Unknown HDL language specified: VDHL\n"
       "l7_v1_00_a/data/l7_v2_1_0.ldx:1: error: The include directory nothing for library l7 does "
       "not exist\n"
       "l8_v1_00_a/data/l8_v2_1_0.ldx:2: error: source does not exist: l8_v1_00_a/hdl/vhdl/b.vhd\n"
@@ -98,6 +98,43 @@ TEST(KelCheck, NamesEachFaultOnceAtItsLine) {
             "\"Filea.vdeclaredtobeVHDL\"}]}");
 }
 
+// What the library takes as it stands.
+TEST(KelCheck, WarnsOfWhatNobodyMeant) {
+  RepositoryBuilder repo;
+  Good(repo, "good");
+  repo.File("ipmods/near_v2_0_a/data/near_v2_1_0.qvr", "");
+  repo.File("ipmods/notes/readme", "");
+  Good(repo, "x")
+      .Ldx("")
+      .Tew("P FILES\n1 n.edn n.edn\n1 n.edn m.edn")
+      .Qvr(
+          "// PORT\nPROT a = b\nOPTIONS c = d\nport e = f\nEND e\nOPTION STYLE = mix\n"
+          "OPTION HDL = VDHL, Verilog\nOPTION HDL = none\nOPTION STYLE = none\n"
+          "BUS_INTERFACE BUS = B, TYPE = X Y\nPARAMETER P = 1, DESC = (a, (b) c) , D = [1, 2],\n"
+          "PORT p = '', DIR = I, VEC = [(P - 1):0], BUS = B:C, IO_IF = B\nPARAMETER P = 2\n"
+          "PORT p = P");
+  const auto at = [](const std::string& end) { return "x_v1_00_a/data/x_v2_1_0." + end + ": "; };
+  const std::string ignored = "warning: begins with no keyword, near which is ";
+  const std::string over = "warning: the list is over in front of ";
+  const std::string comma = ", with no comma to go on\n";
+  const std::string undeclared = "which is not declared\n";
+  const std::string again = " is declared already, and the first one counts\n";
+  EXPECT_EQ(Check(repo, "", 1),
+            "near_v2_0_a: warning: is no core, since its name is no key such as abc_v1_00_a\n" +
+                at("ldx") + "warning: lists no source\n" + at("qvr:2") + ignored +
+                "PORT, and is ignored: PROT a = b\n" + at("qvr:3") + ignored +
+                "OPTION, and is ignored: OPTIONS c = d\n" + at("qvr:4") + ignored +
+                "PORT, and is ignored: port e = f\n" + at("qvr:7") +
+                "warning: the HDL 'VDHL' is none of VHDL, Verilog, MIXED, BOTH\n" + at("qvr:10") +
+                over + "'Y'" + comma + at("qvr:11") +
+                "warning: ends in a comma, and no statement goes on in the next line\n" +
+                at("qvr:12") + "warning: PORT p belongs to the interface B, " + undeclared +
+                at("qvr:12") + "warning: PORT p belongs to the interface C, " + undeclared +
+                at("qvr:13") + "warning: PARAMETER P" + again + at("qvr:14") + "warning: PORT p" +
+                again + at("tew:3") + over + "'m.edn'" + comma +
+                "2 cores, 0 errors, 13 warnings\n");
+}
+
 // Which line lists a file, and which file that is.
 TEST(KelCheck, FindsTheLinesOfMissingFiles) {
   RepositoryBuilder repo;
@@ -111,8 +148,8 @@ TEST(KelCheck, FindsTheLinesOfMissingFiles) {
   EXPECT_EQ(Check(repo, "", 1),
             "dir_v1_00_a/data/dir_v2_1_0.ldx: error: include directory is none: "
             "dir_v1_00_a/hdl/vhdl/a.vhd\n"
-            "gone_v1_00_a/data/gone_v2_1_0.qvr: warning: the STYLE 'HLD' is none of HDL, BLACKBOX "
-            "and MIX\n"
+            "gone_v1_00_a/data/gone_v2_1_0.qvr:1: warning: the STYLE 'HLD' is none of HDL, "
+            "BLACKBOX, MIX\n"
             "lib_v1_00_a/data/lib_v2_1_0.ldx:2: error: source does not exist: "
             "lib_v1_00_a/hdl/vhdl/s/m.vhd\n"
             "lib_v1_00_a/data/lib_v2_1_0.ldx:3: error: source does not exist: "

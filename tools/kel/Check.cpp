@@ -8,7 +8,9 @@
 
 #include "Findings.h"
 #include "Json.h"
+#include "Lint.h"
 #include "Messages.h"
+#include "Nearby.h"
 #include "NetlistTable.h"
 #include "Tarvo_AppException.h"
 #include "Tarvo_FileScanner.h"
@@ -71,7 +73,7 @@ class Checker {
     findings.Begin(key);
     const std::unique_ptr<KelIP> ip(library.CreateIP(key.c_str()));
     if (!ip) return;
-    CheckStyle(*ip);
+    LintDescription(*ip, findings);
     CheckSources(*ip);
     CheckNetlists(*ip);
   }
@@ -85,19 +87,6 @@ class Checker {
   }
 
  private:
-  // A style that is none leaves nothing to open.
-  void CheckStyle(const KelIP& ip) {
-    StringBase style;
-    ip.GetIPProperty(KelIP::KEL_STYLE_OPTION_NAME, style);
-    for (const StringBase* known :
-         {&KelIP::KEL_STYLE_OPTION_VALUE_HDL, &KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX,
-          &KelIP::KEL_STYLE_OPTION_VALUE_MIX}) {
-      if (style.Compare(*known, StringBase::CompareIgnoreCase) == 0) return;
-    }
-    findings.Add({Text(DataFile(ip, Kel_Index::KEL_QVR_EXTENSION).GetName()), 0, "warning",
-                  "the STYLE '" + Text(style) + "' is none of HDL, BLACKBOX and MIX", ""});
-  }
-
   void CheckSources(const KelIP& ip) {
     const Port::FileName file = DataFile(ip, Kel_Index::KEL_LDX_EXTENSION);
     const std::string name = Text(file.GetName());
@@ -105,8 +94,12 @@ class Checker {
     StringList paths;
     StringList others;
     if (!ip.ListSynthesisSources(paths) || !ip.ListSimulationSources(others)) return;
+    LintAnalyseOrder(file, findings);
     paths.insert(paths.end(), others.begin(), others.end());
-    CheckIncludeDirectories(ip, name);
+    const bool hasDirectories = CheckIncludeDirectories(ip, name);
+    if (paths.empty() && !hasDirectories) {
+      findings.Add({name, 0, "warning", "lists no source", name});
+    }
     std::map<std::string, unsigned> lines;
     for (const StringBase& path : paths) {
       std::error_code error;
@@ -121,7 +114,8 @@ class Checker {
     }
   }
 
-  void CheckIncludeDirectories(const KelIP& ip, const std::string& name) {
+  // Whether there are any.
+  bool CheckIncludeDirectories(const KelIP& ip, const std::string& name) {
     StringList libraries;
     ip.ListVerilogIncludeLibraries(libraries);
     for (const StringBase& key : libraries) {
@@ -131,6 +125,7 @@ class Checker {
       if (fs::is_directory(directory.GetText(), error)) continue;
       findings.Add({name, 0, "error", "include directory is none: " + Text(directory), ""});
     }
+    return !libraries.empty();
   }
 
   // The lines of an analyse order by what they list, a library, a blank and a file.
@@ -179,6 +174,12 @@ class Checker {
         std::error_code error;
         if (fs::is_regular_file(path, error)) continue;
         findings.Add({name, row.line, "error", "netlist does not exist: " + path, ""});
+      }
+      if (!row.ignored.empty()) {
+        findings.Add(
+            {name, row.line, "warning",
+             "the list is over in front of '" + row.ignored.front() + "', with no comma to go on",
+             ""});
       }
     }
   }
@@ -244,6 +245,7 @@ Status Check(Tarvo::KelLibrary& library, const Call& call) {
     FindingCollector findings;
     for (const Finding& finding : found) findings.Add(finding);
     Checker checker(library, findings);
+    if (call.keys.empty()) LintRepositories(absolute, findings);
     Progress progress(keys.size(), call.quiet);
     for (const std::string& key : keys) {
       checker.CheckCore(key);
@@ -253,6 +255,7 @@ Status Check(Tarvo::KelLibrary& library, const Call& call) {
     found = findings.Take();
   }
   Write(found, keys.size(), call.asJson);
+  SuggestRepositories(call);
   if (keys.empty()) Messages::Note("there is no core to check");
   if (keys.empty() && call.keys.empty()) return StatusUnreadable;
   return found.empty() && !keys.empty() ? StatusClean : StatusFindings;

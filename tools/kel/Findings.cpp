@@ -170,6 +170,15 @@ void FindingCollector::TakeWrapped(const std::string& text, const std::string& r
   }
 }
 
+bool FindingCollector::IsToldBetter(const Finding& finding) const {
+  if (finding.line > 0) return false;
+  auto other = findings.upper_bound(finding);
+  for (; other != findings.end() && other->file == finding.file; ++other) {
+    if (other->line > 0 && BeginsWith(other->text, finding.text)) return true;
+  }
+  return false;
+}
+
 std::vector<Finding> FindingCollector::Take() const {
   std::set<std::string> filesWithFaults;
   for (const Finding& finding : findings) {
@@ -178,7 +187,7 @@ std::vector<Finding> FindingCollector::Take() const {
   std::vector<Finding> taken;
   for (const Finding& finding : findings) {
     const bool follows = !finding.cause.empty() && filesWithFaults.contains(finding.cause);
-    if (!follows) taken.push_back(finding);
+    if (!follows && !IsToldBetter(finding)) taken.push_back(finding);
   }
   return taken;
 }

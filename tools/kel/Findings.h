@@ -34,7 +34,8 @@ class FindingCollector {
 
   void Add(const Finding& finding) { findings.insert(finding); }
 
-  // All of them by file and line, without those that only follow from others.
+  // All of them by file and line, without those that only follow from others, or that stand there
+  // with their line too.
   std::vector<Finding> Take() const;
 
  private:
@@ -42,6 +43,7 @@ class FindingCollector {
   void TakeTrace(const std::string& text);
   void TakeBadLine(const std::string& file, unsigned line, const std::string& text);
   void TakeWrapped(const std::string& text, const std::string& reason);
+  bool IsToldBetter(const Finding& finding) const;
 
   std::string subject;
   std::vector<std::string> reading;  // the files that are open, the innermost last

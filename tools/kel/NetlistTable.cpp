@@ -71,21 +71,26 @@ void SetValues(KelIP& ip, const Values& names, const Values& values) {
   }
 }
 
-// Those of the netlists that the files of a line name, each as NAME or LIBRARY:NAME.
-std::vector<std::string> Choose(const StringList& netlists, const std::vector<std::string>& files) {
-  std::vector<std::string> chosen;
+bool EndsIn(const std::string& text, const std::string& end) {
+  return text.size() >= end.size() && text.compare(text.size() - end.size(), end.size(), end) == 0;
+}
+
+// Puts those of the netlists into a row that its files name, each as NAME or LIBRARY:NAME.
+void Choose(const StringList& netlists, const std::vector<std::string>& files,
+            NetlistTable::Row& row) {
   for (const std::string& file : files) {
     const std::string name = "/netlist/" + file.substr(file.find(':') + 1);
+    bool known = file == "," || netlists.empty();
     for (const StringBase& netlist : netlists) {
       const std::string path = Text(netlist);
-      const bool ends = path.size() >= name.size() &&
-                        path.compare(path.size() - name.size(), name.size(), name) == 0;
-      if (!ends || std::find(chosen.begin(), chosen.end(), path) != chosen.end()) continue;
-      chosen.push_back(path);
+      if (!EndsIn(path, name)) continue;
+      known = true;
+      if (std::find(row.netlists.begin(), row.netlists.end(), path) != row.netlists.end()) continue;
+      row.netlists.push_back(path);
       break;
     }
+    if (!known) row.ignored.push_back(file);
   }
-  return chosen;
 }
 
 }  // namespace
@@ -116,8 +121,9 @@ NetlistTable ReadNetlistTable(KelIP& ip) {
       ip.ListNetlists(answer->second);
     }
     const bool applies = values == current;
-    table.rows.push_back({line->number, std::move(values),
-                          Choose(answer->second, {files, line->fields.end()}), applies});
+    NetlistTable::Row row = {line->number, std::move(values), {}, {}, applies};
+    Choose(answer->second, {files, line->fields.end()}, row);
+    table.rows.push_back(std::move(row));
   }
   SetValues(ip, table.parameters, current);
   return table;

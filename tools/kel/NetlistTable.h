@@ -14,7 +14,8 @@ struct NetlistTable {
     unsigned line;
     std::vector<std::string> values;
     std::vector<std::string> netlists;
-    bool applies;  // at the values that the parameters had
+    std::vector<std::string> ignored;  // words behind the end of the list
+    bool applies;                      // at the values that the parameters had
   };
 
   std::vector<std::string> parameters;
