@@ -12,7 +12,6 @@ file(RELATIVE_PATH KEL_LIBRARIES_FROM_COMMAND
 
 # An installation works wherever it is put.
 set_target_properties(tarvo_kel tarvo_platform PROPERTIES INSTALL_RPATH "$ORIGIN")
-set_target_properties(kel PROPERTIES INSTALL_RPATH "$ORIGIN/${KEL_LIBRARIES_FROM_COMMAND}")
 set_target_properties(tarvo_kel PROPERTIES EXPORT_NAME kel)
 set_target_properties(tarvo_platform PROPERTIES EXPORT_NAME platform)
 
@@ -44,6 +43,10 @@ configure_file(cmake/tarvo-kel.pc.in tarvo-kel.pc @ONLY)
 install(FILES "${PROJECT_BINARY_DIR}/tarvo-kel.pc" DESTINATION "${CMAKE_INSTALL_LIBDIR}/pkgconfig"
   COMPONENT development)
 
+if(NOT TARGET kel)
+  return()
+endif()
+set_target_properties(kel PROPERTIES INSTALL_RPATH "$ORIGIN/${KEL_LIBRARIES_FROM_COMMAND}")
 install(TARGETS kel RUNTIME DESTINATION "${CMAKE_INSTALL_BINDIR}" COMPONENT command)
 set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS docs/kel.1)
 execute_process(COMMAND gzip -9 --no-name --stdout "${PROJECT_SOURCE_DIR}/docs/kel.1"
