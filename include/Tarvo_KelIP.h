@@ -95,6 +95,8 @@ class TARVO_EXPORT KelIP {
   bool ListGenerics(StringList& list) const;
   bool ListGenericProperties(const StringBase& generic, StringList& list) const;
 
+  // DIR is a port's direction, VEC its range of bits, and DESC describes what has it: they are
+  // handed on as the description states them, and so is any other property.
   bool GetPortProperty(const StringBase& port, const StringBase& property, StringBase& value) const;
   bool ListPorts(StringList& list) const;
   bool ListPortProperties(const StringBase& port, StringList& list) const;

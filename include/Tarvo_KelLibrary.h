@@ -57,16 +57,18 @@ class TARVO_EXPORT KelLibrary {
   StringBase GetLocation(const StringBase& key) const;
 
   // The full key of the newest version of the core that the key names, whether the version that it
-  // names exists or not. A base name that is itself a key is looked up as that version.
+  // names exists or not, and whether the newest has options or not. A base name that is itself a
+  // key is looked up as that version.
   StringBase GetLatestIPKey(const StringBase& key) const;
 
   // The base name of a version's core, and its version as dotted text such as "1.00.a".
   StringBase GetName(const StringBase& key) const;
   StringBase GetVersion(const StringBase& key) const;
 
-  // The value of an option of a version. True with an empty value for an option that is not there.
-  // False, with an error and the value untouched, for a key without options: one
-  // that is not in the library, or whose core description is missing or could not be read.
+  // The value of an option of a version. True with an empty value for an option that is not there,
+  // where KelIP::GetIPProperty is false. False, with an error and the value untouched, for a key
+  // without options: one that is not in the library, or whose core description is missing or could
+  // not be read.
   bool GetIPProperty(const StringBase& key, const StringBase& property, StringBase& value) const;
 
   // Replaces the list by the names of a version's options: NAME, VERSION, those of the description

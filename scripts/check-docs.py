@@ -60,24 +60,31 @@ def console_faults(name, text, environment, directory):
                 yield f"{name}: $ {command}\nprints\n{printed}"
 
 
-def call_of(readme):
-    """The plain compiler's call that the README shows."""
-    (call,) = [block for block in blocks(readme, "sh") if "program.cpp" in block]
-    return call
+def calls_of(readme):
+    """The ways in which the README builds a program: with the build tree, and with an installation."""
+    by_hand, installed = [block for block in blocks(readme, "sh") if "program.cpp" in block]
+    return by_hand, installed
 
 
-def program_faults(name, text, call, build, environment):
+def program_faults(name, text, call, build):
     """Each program is built by the call, and prints what the next block of text shows."""
     pairs = re.findall(r"^```cpp\n(.*?)^```$.*?^```text\n(.*?)^```$", text, re.MULTILINE | re.DOTALL)
     if len(pairs) != len(blocks(text, "cpp")):
         yield f"{name}: a program without what it prints"
-    call = call.replace("build/demo", build).replace("-Iinclude", f"-Iinclude -I{build}/include")
     for program, shown in pairs:
         with tempfile.TemporaryDirectory() as scratch:
             source, binary = pathlib.Path(scratch, "program.cpp"), pathlib.Path(scratch, "program")
             source.write_text(program)
-            printed = run(call.replace("program.cpp", str(source)).replace("-o program", f"-o {binary}") +
-                          f"\n{binary}", environment)
+            words = {"build/demo": build, "build/consumer": f"{scratch}/consumer",
+                     "program.cpp": str(source), "-o program": f"-o {binary}"}
+            made = call
+            for word, place in words.items():
+                made = made.replace(word, place)
+            printed = run(f"{{ {made} }} >{scratch}/log || cat {scratch}/log\n{binary}",
+                          dict(os.environ, HOME=scratch))
+            if "consumer" in call:
+                consumer = run(f"{scratch}/consumer/program", os.environ)
+                printed = printed if printed == consumer else f"{printed} and {consumer}"
         if not matches(shown, printed):
             yield f"{name}: a program prints\n{printed}"
 
@@ -91,7 +98,7 @@ def write_files(text, directory):
             path.write_text(block)
 
 
-def document_faults(name, call, build, environment):
+def document_faults(name, calls, build, environment):
     text = (ROOT / name).read_text()
     with tempfile.TemporaryDirectory() as scratch:
         write_files(text, pathlib.Path(scratch))
@@ -103,7 +110,8 @@ def document_faults(name, call, build, environment):
             if bad or not findings:
                 yield f"{name}: its files are not good:\n{bad}"
         yield from console_faults(name, text, environment, scratch if shows_files else ROOT)
-    yield from program_faults(name, text, call, build, environment)
+    for call in calls:
+        yield from program_faults(name, text, call, build)
 
 
 def page_faults(environment):
@@ -119,7 +127,8 @@ def main():
     faults = []
     readme = (ROOT / "README.md").read_text()
     for name in DOCUMENTS:
-        faults += document_faults(name, call_of(readme), build, environment)
+        calls = calls_of(readme)[:2 if name == "README.md" else 1]
+        faults += document_faults(name, calls, build, environment)
     if blocks(readme, "cpp") != [(ROOT / "examples/consumer/program.cpp").read_text()]:
         faults.append("examples/consumer/program.cpp is not the program of README.md")
     faults += page_faults(environment)

@@ -15,7 +15,7 @@ struct Port_Message {
   const char* file;      // path stem of the source file that issued it
   int line;              // line of the issuing statement in that file
   const char* revision;  // revision of that file
-  const char* text;  // with its line ends; that of a wrapped exception may stand before the last
+  const char* text;      // one line or several; each ends, and behind the last may be an empty one
 };
 
 // The message manager: one statement makes a message and issues it.

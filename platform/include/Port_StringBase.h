@@ -26,7 +26,8 @@ class StringBase;
 // content.
 //
 // Where a text is wanted as `const char*`, a string converts by itself, and the pointer is good
-// until the string changes. What reads it by that pointer sees the text end at a NUL byte; View()
+// until the string changes or ends: of a result that no variable keeps, only to the end of the
+// statement. What reads it by that pointer sees the text end at a NUL byte; View()
 // gives all of it. The comparisons below take part in overload resolution ahead of that
 // conversion, so that `a < b` never compares addresses.
 //
