@@ -41,7 +41,7 @@ class Home {
 // Made under another name first, so that what was left half done is not taken for whole.
 fs::path Prepare(const std::string& name, const std::function<void(const fs::path&)>& make) {
   static const Home home;
-  const fs::path path = home.Path() / name;
+  fs::path path = home.Path() / name;
   if (fs::exists(path)) return path;
   const fs::path unfinished = home.Path() / (name + ".unfinished");
   fs::remove_all(unfinished);

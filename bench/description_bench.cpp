@@ -48,7 +48,7 @@ void Sizes(benchmark::internal::Benchmark* benchmark) {
 void CutLines(benchmark::State& state) {
   const Port::FileName description = Description(state.range(0));
   const boost::char_separator<char> separator("", " ,=()[]\"'", boost::drop_empty_tokens);
-  for (auto _ : state) {
+  for ([[maybe_unused]] const auto _ : state) {
     Tarvo::FileScanner lines(description);
     StringBase line;
     std::size_t tokens = 0;
@@ -63,14 +63,14 @@ BENCHMARK(CutLines)->Apply(Sizes)->Unit(benchmark::kMillisecond);
 
 void Open(benchmark::State& state) {
   const Port::FileName description = Description(state.range(0));
-  for (auto _ : state) benchmark::DoNotOptimize(QVRParser(description));
+  for ([[maybe_unused]] const auto _ : state) benchmark::DoNotOptimize(QVRParser(description));
 }
 BENCHMARK(Open)->Apply(Sizes)->Unit(benchmark::kMillisecond);
 
 void AskEverything(benchmark::State& state) {
   const Port::FileName description = Description(state.range(0));
   const QVRParser parser(description);
-  for (auto _ : state) {
+  for ([[maybe_unused]] const auto _ : state) {
     for (const StringBase& port : parser.ListPorts()) {
       for (const StringBase& property : parser.ListPortProperties(port)) {
         benchmark::DoNotOptimize(parser.GetPortProperty(port, property));

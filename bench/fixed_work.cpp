@@ -27,8 +27,9 @@ std::string Description() {
   std::string text = "# a generated core\nOPTION DESC = Generated core\nOPTION HDL = VHDL\n";
   for (int i = 0; i < kPorts; ++i) {
     const std::string number = std::to_string(i);
-    text += "PARAMETER WIDTH_" + number + " = 8, DT = integer, RANGE = (2:32)\n";
-    text += "PORT data_" + number + " = DATA_" + number + ", DIR = I, VEC = [31:0] # a lane\n";
+    text.append("PARAMETER WIDTH_").append(number).append(" = 8, DT = integer, RANGE = (2:32)\n");
+    text.append("PORT data_").append(number).append(" = DATA_").append(number);
+    text += ", DIR = I, VEC = [31:0] # a lane\n";
   }
   return text;
 }

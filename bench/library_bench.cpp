@@ -40,8 +40,8 @@ std::string Description() {
   }
   for (int i = 0; i < 100; ++i) {
     const std::string number = std::to_string(i);
-    text += "PORT data_" + number + " = DATA_" + number +
-            ",\tDIR = I, VEC = [31:0], BUS = REGS, DESC = \"Data\" # port\n";
+    text.append("PORT data_").append(number).append(" = DATA_").append(number);
+    text += ",\tDIR = I, VEC = [31:0], BUS = REGS, DESC = \"Data\" # port\n";
   }
   return text;
 }
@@ -74,7 +74,7 @@ void CountVersions(benchmark::State& state) {
 
 void MakeKey(benchmark::State& state) {
   const StringBase text = "pulse_counter_v1_00_a";
-  for (auto _ : state) benchmark::DoNotOptimize(Kel_Key(text));
+  for ([[maybe_unused]] const auto _ : state) benchmark::DoNotOptimize(Kel_Key(text));
 }
 BENCHMARK(MakeKey);
 
@@ -82,7 +82,7 @@ BENCHMARK(MakeKey);
 void MeasureWalk(benchmark::State& state, const fs::path& repository) {
   const StringBase path = repository.c_str();
   std::optional<KelLibrary> library;
-  for (auto _ : state) {
+  for ([[maybe_unused]] const auto _ : state) {
     library.emplace();
     benchmark::DoNotOptimize(library->SetRepositoryPath(path));
     state.PauseTiming();
@@ -113,7 +113,7 @@ std::ptrdiff_t CountLines(const std::string& name) {
 
 void ReadPlainly(benchmark::State& state) {
   const fs::path versions = Described(state.range(0)) / "ipmods";
-  for (auto _ : state) {
+  for ([[maybe_unused]] const auto _ : state) {
     std::ptrdiff_t lines = 0;
     for (const fs::directory_entry& entry : fs::directory_iterator(versions)) {
       const std::string key = entry.path().filename();
@@ -144,7 +144,7 @@ void Memory(benchmark::State& state) {
   const StringBase path = Described(state.range(0)).c_str();
   KelLibrary library;
   const double before = ResidentNow();
-  for (auto _ : state) library.SetRepositoryPath(path);
+  for ([[maybe_unused]] const auto _ : state) library.SetRepositoryPath(path);
   const double after = ResidentNow();
   state.counters["KiB/version"] = (after - before) / static_cast<double>(state.range(0));
   state.counters["MiB above the end"] = (ResidentMost() - after) / 1024;
@@ -154,10 +154,11 @@ BENCHMARK(Memory)->Arg(50000)->Iterations(1)->Unit(benchmark::kMillisecond);
 // The index alone: `shape` gives the text of the i-th key.
 void Add(benchmark::State& state, std::string (*shape)(int)) {
   std::vector<Kel_Key> keys;
+  keys.reserve(static_cast<std::size_t>(state.range(0)));
   for (int i = 0; i < state.range(0); ++i) keys.emplace_back(StringBase(shape(i).c_str()));
   Port::FileName location;
   location.SetHead("/");
-  for (auto _ : state) {
+  for ([[maybe_unused]] const auto _ : state) {
     Tarvo::Kel_Index index;
     for (const Kel_Key& key : keys) index.AddIP(key, location);
   }

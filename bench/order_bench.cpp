@@ -82,7 +82,8 @@ void Analyse(benchmark::State& state, const fs::path& repository) {
   Kel_Index index;
   Fill(index, repository);
   const Kel_Key root("core0_v1_00_a");
-  for (auto _ : state) benchmark::DoNotOptimize(LDXParser(index, root, Kel_Key(), "VHDL"));
+  for ([[maybe_unused]] const auto _ : state)
+    benchmark::DoNotOptimize(LDXParser(index, root, Kel_Key(), "VHDL"));
 }
 
 void AnalyseTree(benchmark::State& state) { Analyse(state, Tree(state.range(0), 13)); }
@@ -104,7 +105,7 @@ void ScanTree(benchmark::State& state) {
     files.push_back(
         Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION));
   }
-  for (auto _ : state) {
+  for ([[maybe_unused]] const auto _ : state) {
     std::size_t length = 0;
     for (const Port::FileName& file : files) {
       Tarvo::FileScanner lines(file);

@@ -69,14 +69,14 @@ struct Re2 {
 template <class Engine>
 void MakeAndMatchKey(benchmark::State& state) {
   const std::string text = Key();
-  for (auto _ : state) benchmark::DoNotOptimize(Engine().Match(text));
+  for ([[maybe_unused]] const auto _ : state) benchmark::DoNotOptimize(Engine().Match(text));
 }
 
 template <class Engine>
 void Match(benchmark::State& state, const std::string& text) {
   const Engine engine;
   try {
-    for (auto _ : state) benchmark::DoNotOptimize(engine.Match(text));
+    for ([[maybe_unused]] const auto _ : state) benchmark::DoNotOptimize(engine.Match(text));
   } catch (const std::exception& error) {
     state.SkipWithError(error.what());
   }
