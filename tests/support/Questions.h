@@ -53,17 +53,12 @@ struct Members {
   const char* name;
   List interfaces;
   ListOf list;
-  ParserListOf parserList;
 };
 inline const Members kMembers[] = {
-    {"bus parameters", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceParameters,
-     &QVRParser::ListBusInterfaceParameters},
-    {"bus ports", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfacePorts,
-     &QVRParser::ListBusInterfacePorts},
-    {"io parameters", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceParameters,
-     &QVRParser::ListIoInterfaceParameters},
-    {"io ports", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfacePorts,
-     &QVRParser::ListIoInterfacePorts}};
+    {"bus parameters", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceParameters},
+    {"bus ports", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfacePorts},
+    {"io parameters", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceParameters},
+    {"io ports", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfacePorts}};
 
 }  // namespace Questions
 
