@@ -67,9 +67,9 @@ std::string Join(const std::set<std::string>& texts) {
 }  // namespace
 
 bool IsNear(const std::string& word, const std::string& text) {
-  if (text.empty()) return false;
-  return word.rfind(text, 0) == 0 ||
-         Distance(word, text) <= std::max<std::size_t>(1, text.size() / 3);
+  const std::size_t most = std::max<std::size_t>(1, text.size() / 3);
+  if (text.empty() || text.size() > word.size() + most) return false;  // of any length
+  return word.rfind(text, 0) == 0 || Distance(word, text) <= most;
 }
 
 void SuggestKeys(const Call& call, const std::string& key) {
