@@ -151,6 +151,10 @@ TEST(KelSources, ListsThemInOrder) {
       own + "vhdl/phase_acc.vhd\n" + own + "vhdl/tone_gen.vhd\n" + own + "vhdl/tone_gen_tb.vhd\n");
   EXPECT_EQ(Paths("sources crc_unit --for synthesis"),
             "kel: note: crc_unit_v1_00_a has no sources, its STYLE is 'BLACKBOX'\n");
+  EXPECT_NE(
+      Paths("sources tone_gen --for synthesis --format ghdl")
+          .find("kel: note: the format ghdl is for VHDL alone, and leaves out 1 of 2 sources\n"),
+      std::string::npos);
   Paths("sources tone_gen", 2);
   Paths("sources tone_gen --for layout", 2);
   Paths("sources nope --for synthesis", 1);
@@ -212,11 +216,22 @@ TEST(Kel, SuggestsWhatThereIs) {
   EXPECT_NE(
       place.output.find(hidden + "other_versions\tpulse_counter_v1_00_a,pulse_counter_v1_01_b"),
       std::string::npos);
-  EXPECT_EQ(Kel("-L .. list").status, 3);
+  const CommandResult above = Kel("-L .. list");
+  EXPECT_EQ(above.status, 3);
+  EXPECT_EQ(above.errors,
+            "kel: warning: Unable to add directory .. to library\n"
+            "kel: note: .. has no directory 'ipmods', so it is no repository\n");
+  EXPECT_NE(
+      Kel("-L repository/ipmods list").errors.find("; near it is " + kExamples + "/repository\n"),
+      std::string::npos);
+  EXPECT_NE(Kel("-L . list").errors.find("/overlay, " + kExamples + "/repository\n"),
+            std::string::npos);
 }
 
 TEST(Kel, ShowsHelpAndVersion) {
   EXPECT_EQ(Kel("--help").status, 0);
+  EXPECT_EQ(Kel("help").output, Kel("--help").output);
+  EXPECT_EQ(Kel("help which").output, Kel("which --help").output);
   EXPECT_NE(Kel("which --help").output.find("KEY"), std::string::npos);
   EXPECT_EQ(Kel("--version").output.substr(0, 4), "kel ");
 }

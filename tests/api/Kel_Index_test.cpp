@@ -2,9 +2,11 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <new>
 #include <string>
 #include <vector>
 
+#include "AllocationFault.h"
 #include "MessageRecorder.h"
 #include "RepositoryBuilder.h"
 #include "Tarvo_AppException.h"
@@ -77,6 +79,23 @@ TEST_F(Index, AnswersTheSameInAnyOrderOfAdding) {
     ASSERT_EQ(index.GetIPKey(Key("abc")).GetKey(), "abc_v10_00_a");
     for (const std::string& key : keys) ASSERT_EQ(Look(index, key), key + " " + At(key));
   } while (std::next_permutation(keys.begin(), keys.end()));
+}
+
+TEST_F(Index, KeepsWhatItHasWhenMemoryIsShort) {
+  ASSERT_TRUE(Add("abc_v1_00_a"));
+  const Kel_Key key = Key("abc_v2_00_a");
+  const FileName location = Directory(repo.Core("abc_v2_00_a").Location());
+  bool isShort = true;
+  for (int count = 0; isShort; ++count) {
+    try {
+      const AllocationFault fault(count, AllocationFault::BadAlloc);
+      index.AddIP(key, location);
+    } catch (const std::bad_alloc&) {  // some are turned into messages
+    }
+    isShort = AllocationFault::Fired();
+    ASSERT_EQ(Look(index, "abc_v1_00_a"), "abc_v1_00_a " + At("abc_v1_00_a")) << count;
+  }
+  EXPECT_EQ(Look(index, "abc"), "abc_v2_00_a " + At("abc_v2_00_a"));
 }
 
 // Of equal versions, the one added later stands in front, and each is found by its own text.
