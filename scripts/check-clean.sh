@@ -2,7 +2,7 @@
 # Does on a clean Debian 12, below a scratch directory, what a newcomer does: the README's two commands
 # and scripts/package.sh on a fresh clone of HEAD, without anything that is installed here; then apt
 # installs the packages on another clean one, both kinds of consumer are built against them, and apt
-# takes all away again. Wants root and debootstrap, and about half an hour.
+# takes all away again. Wants root and debootstrap, and a quarter of an hour.
 # Usage: check-clean.sh
 set -euo pipefail
 cd "$(dirname "$0")/.."
