@@ -125,8 +125,8 @@ TEST(KelCheck, WarnsOfWhatNobodyMeant) {
                 "PORT, and is ignored: PROT a = b\n" + at("qvr:3") + ignored +
                 "OPTION, and is ignored: OPTIONS c = d\n" + at("qvr:4") + ignored +
                 "PORT, and is ignored: port e = f\n" + at("qvr:7") +
-                "warning: the HDL 'VDHL' is none of VHDL, Verilog, MIXED, BOTH\n" + at("qvr:10") +
-                over + "'Y'" + comma + at("qvr:11") +
+                "warning: the HDL 'VDHL, Verilog' is none of VHDL, Verilog, MIXED, BOTH\n" +
+                at("qvr:10") + over + "'Y'" + comma + at("qvr:11") +
                 "warning: ends in a comma, and no statement goes on in the next line\n" +
                 at("qvr:12") + "warning: PORT p belongs to the interface B, " + undeclared +
                 at("qvr:12") + "warning: PORT p belongs to the interface C, " + undeclared +

@@ -73,9 +73,13 @@ class Checker {
     findings.Begin(key);
     const std::unique_ptr<KelIP> ip(library.CreateIP(key.c_str()));
     if (!ip) return;
-    LintDescription(*ip, findings);
-    CheckSources(*ip);
-    CheckNetlists(*ip);
+    try {
+      LintDescription(*ip, findings);
+      CheckSources(*ip);
+      CheckNetlists(*ip);
+    } catch (const Tarvo::AppException&) {  // of a file that went while the core was looked at
+      findings.Add({Text(ip->GetLocation()), 0, "error", "changed while it was read", ""});
+    }
   }
 
   // Sources that are missing, and that no core's own file was found to list.
@@ -176,10 +180,7 @@ class Checker {
         findings.Add({name, row.line, "error", "netlist does not exist: " + path, ""});
       }
       if (!row.ignored.empty()) {
-        findings.Add(
-            {name, row.line, "warning",
-             "the list is over in front of '" + row.ignored.front() + "', with no comma to go on",
-             ""});
+        findings.Add({name, row.line, "warning", ListEndsBefore(row.ignored.front()), ""});
       }
     }
   }

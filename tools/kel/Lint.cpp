@@ -80,8 +80,9 @@ Words BehindList(const Words& words) {
 // One description, statement by statement.
 class Description {
  public:
-  Description(const KelIP& ip, FindingCollector& collector)
-      : findings(collector),
+  Description(const KelIP& core, FindingCollector& collector)
+      : ip(core),
+        findings(collector),
         file(DataFile(ip, Tarvo::Kel_Index::KEL_QVR_EXTENSION)),
         name(Text(file.GetName())) {
     ip.ListBusInterfaces(busInterfaces);
@@ -120,14 +121,15 @@ class Description {
     }
   }
 
-  // The first of several values is the one that counts.
+  // The first of several values is the one that counts, and that the core answers.
   void LintOption(const Words& words) {
-    if (words.size() < 4 || words[2] != "=" || !seen.insert(kOption + words[1]).second) return;
+    if (words.size() < 2 || !seen.insert(kOption + words[1]).second) return;
     for (const Choice& choice : kChoices) {
-      if (words[1] != choice.option || Contains(choice.values, words[3])) continue;
-      std::string values;
-      for (const std::string& value : choice.values) values += (values.empty() ? "" : ", ") + value;
-      Warn("the " + words[1] + " '" + words[3] + "' is none of " + values);
+      if (words[1] != choice.option) continue;
+      StringBase value;
+      ip.GetIPProperty(choice.option, value);
+      if (Contains(choice.values, Text(value))) continue;
+      Warn("the " + words[1] + " '" + Text(value) + "' is none of " + Join(choice.values));
     }
   }
 
@@ -144,7 +146,7 @@ class Description {
     if (rest.empty()) return;
     const bool isOpen = rest.size() == 1 && rest[0] == ",";
     Warn(isOpen ? "ends in a comma, and no statement goes on in the next line"
-                : "the list is over in front of '" + rest[0] + "', with no comma to go on");
+                : ListEndsBefore(rest[0]));
   }
 
   void LintInterfaces(const Words& words, const StringBase& property, const StringList& declared) {
@@ -160,6 +162,7 @@ class Description {
     }
   }
 
+  const KelIP& ip;
   FindingCollector& findings;
   Port::FileName file;
   std::string name;
@@ -170,6 +173,10 @@ class Description {
 };
 
 }  // namespace
+
+std::string ListEndsBefore(const std::string& word) {
+  return "the list is over in front of '" + word + "', with no comma to go on";
+}
 
 void LintDescription(const KelIP& ip, FindingCollector& findings) {
   Description(ip, findings).Lint();

@@ -1,6 +1,8 @@
 #ifndef KEL_LINT_H
 #define KEL_LINT_H
 
+#include <string>
+
 #include "Call.h"
 #include "Findings.h"
 #include "Port_FileName.h"
@@ -15,6 +17,9 @@ void LintDescription(const Tarvo::KelIP& ip, FindingCollector& findings);
 
 // In an analyse order that could be read: words in the place of a language.
 void LintAnalyseOrder(const Port::FileName& file, FindingCollector& findings);
+
+// What is said of a list that ends in front of a word.
+std::string ListEndsBefore(const std::string& word);
 
 // Directories of the repositories that look like a core, but for their name.
 void LintRepositories(const Call& call, FindingCollector& findings);

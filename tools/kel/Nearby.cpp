@@ -58,12 +58,6 @@ std::set<std::string> RepositoriesNear(const fs::path& directory) {
   return near;
 }
 
-std::string Join(const std::set<std::string>& texts) {
-  std::string joined;
-  for (const std::string& text : texts) joined += (joined.empty() ? "" : ", ") + text;
-  return joined;
-}
-
 }  // namespace
 
 bool IsNear(const std::string& word, const std::string& text) {

@@ -14,6 +14,14 @@ inline std::string Text(const Tarvo::StringBase& text) { return std::string(text
 // obeys nothing that a file held.
 std::string Printable(std::string_view text);
 
+// All texts of a list or set, with the same between each two.
+template <class Texts>
+std::string Join(const Texts& texts, const char* between = ", ") {
+  std::string joined;
+  for (const auto& text : texts) joined.append(joined.empty() ? "" : between).append(text);
+  return joined;
+}
+
 // The fields of a line of a data file: words between blanks, each of the marks being a field of its
 // own, and what stands between quotes.
 std::vector<std::string> Fields(std::string_view line, const std::string& marks = "");

@@ -14,6 +14,7 @@
 #include "Nearby.h"
 #include "Tarvo_AppException.h"
 #include "Tarvo_KelLibrary_Utils.h"
+#include "Text.h"
 #include "Verbs.h"
 
 std::vector<std::string> Repositories(const Call& call) {
@@ -27,13 +28,7 @@ std::vector<std::string> Repositories(const Call& call) {
   return repositories;
 }
 
-Tarvo::StringBase RepositoryPath(const Call& call) {
-  std::string path;
-  for (const std::string& repository : Repositories(call)) {
-    path += (path.empty() ? "" : ";") + repository;
-  }
-  return path.c_str();
-}
+Tarvo::StringBase RepositoryPath(const Call& call) { return Join(Repositories(call), ";").c_str(); }
 
 namespace {
 
