@@ -3,6 +3,7 @@
 
 #include <cstddef>
 #include <string>
+#include <string_view>
 
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
@@ -32,6 +33,10 @@ class TARVO_EXPORT FileScanner {
   // The same without a copy. The view is good while the scanner lives and is not moved.
   bool GetNextLine(std::string_view& line, unsigned int& lineNumber);
 
+  // The column at which a part of the last view begins, in its line as it stands in the file:
+  // counted from 1, in bytes, tabs as one. An empty part may stand right behind the line.
+  unsigned int GetColumn(std::string_view part) const noexcept;
+
   // Makes the first line the next one, without touching the file.
   void GoToStart();
 
@@ -43,6 +48,7 @@ class TARVO_EXPORT FileScanner {
   StringBase fileName;
   std::string text;  // with a blank for each tab that was handed out
   std::size_t position = 0;
+  std::size_t lastPosition = 0;  // of the last line that was handed out
 };
 
 }  // namespace Tarvo

@@ -2,8 +2,10 @@
 #define TARVO_KELIP_H
 
 #include <memory>
+#include <vector>
 
 #include "Tarvo_Export.h"
+#include "Tarvo_KelRecords.h"
 
 namespace Tarvo {
 
@@ -152,6 +154,22 @@ class TARVO_EXPORT KelIP {
   bool GetNetlistProperty(const StringBase& netlist, const StringBase& property,
                           StringBase& value) const;
   bool ListNetlistProperties(const StringBase& netlist, StringList& list) const;
+
+  // The statements, sources, includes and netlists themselves, each with the file and line that
+  // states it. They answer, fail and are cleared as the operations above do, with the same
+  // messages: those for sources as ListSynthesisSources, ListSimulationSources and
+  // ListVerilogIncludeLibraries, that for the table as ListNetlists.
+  //
+  // All statements of the description, in the order of the file.
+  bool GetStatements(std::vector<KelStatement>& statements) const;
+  // The sources in analyse order.
+  bool GetSynthesisSources(std::vector<KelSource>& sources) const;
+  bool GetSimulationSources(std::vector<KelSource>& sources) const;
+  bool GetVerilogIncludeDirectories(std::vector<KelIncludeDirectory>& directories) const;
+  // The cores whose whole order the core's own file takes over, in the order of its lines.
+  bool GetIncludes(std::vector<KelInclude>& includes) const;
+  // The whole table, with the rows that apply at the present values marked.
+  bool GetNetlistTable(KelNetlistTable& table) const;
 
   // Replace the list by the names of all properties that have a meaning for a kind of element, the
   // same for every core. Always true; may throw std::bad_alloc.

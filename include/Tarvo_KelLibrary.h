@@ -9,6 +9,7 @@ namespace Tarvo {
 
 class KelIP;
 class KelLibraryImpl;
+class Kel_Index;
 
 // The front door: finds the IP cores in a list of repositories and answers questions about them.
 //
@@ -88,6 +89,11 @@ class TARVO_EXPORT KelLibrary {
   // Null, with an error, for a key that is not in the library, and if the core description is
   // missing or bad. The message is fatal for an AppException of that level.
   KelIP* CreateIP(const StringBase& key) const;
+
+  // The index that the library answers from, and the repositories as the path gave them, in their
+  // order. Both change with the next walk.
+  const Kel_Index& GetIndex() const;
+  const StringList& GetRepositories() const;
 
  private:
   std::unique_ptr<KelLibraryImpl> impl;

@@ -5,11 +5,12 @@
 
 namespace Tarvo {
 
-// The two list splitters. A piece is a longest run without the delimiter, so delimiters at the
+// What others than the library need too: the two list splitters, and what a misspelt word may have
+// meant. A piece of a list is a longest run without the delimiter, so delimiters at the
 // ends or in a row give no empty pieces. Nothing else happens to a piece: no trimming, no quoting,
 // no change of case, and equal pieces all stay. Results come in the order of the text.
 //
-// Both may throw std::bad_alloc and may be called from several threads.
+// All may throw std::bad_alloc and may be called from several threads.
 class TARVO_EXPORT KelLibrary_Utils {
  public:
   // Splits a repository path at ";" and tests each piece: the first that is no directory ends the
@@ -18,6 +19,10 @@ class TARVO_EXPORT KelLibrary_Utils {
 
   // Splits the names of interfaces at ":". Nothing is tested.
   static StringList GetInterfaceVector(const StringBase& interfaces);
+
+  // Those of the words that a text may have been meant for, in their order: they differ from it in
+  // letter case or in few letters, or it is how they begin.
+  static StringList ListNear(const StringBase& text, const StringList& words);
 
   KelLibrary_Utils() = delete;
 };

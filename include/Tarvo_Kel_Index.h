@@ -3,6 +3,8 @@
 
 #include <map>
 #include <unordered_map>
+#include <utility>
+#include <vector>
 
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
@@ -85,6 +87,14 @@ class TARVO_EXPORT Kel_Index {
   Port::FileName GetIPLocation(const Kel_Key& key) const;
   Kel_Key GetIPKey(const Kel_Key& key) const;
 
+  // The keys of all versions that have a location, those without options too, in the order of their
+  // bytes.
+  StringList GetAllVersionKeys() const;
+
+  // The directories of a version that were added after its first one, which hides them, in the
+  // order in which they came. Empty for a key that is not in the index.
+  std::vector<Port::FileName> GetHiddenLocations(const Kel_Key& key) const;
+
  private:
   struct NewestFirst {
     bool operator()(const Kel_Key& left, const Kel_Key& right) const { return right < left; }
@@ -93,15 +103,10 @@ class TARVO_EXPORT Kel_Index {
   template <class Value>
   using Table = std::unordered_map<StringBase, std::multimap<Kel_Key, Value, NewestFirst>>;
 
-  friend class KelLibraryImpl;
-
-  // A version that is there, to be added.
-  struct Candidate;
-
-  TARVO_LOCAL void Add(const Candidate& candidate);
-  TARVO_LOCAL bool AddIPOptions(const Candidate& candidate);
+  TARVO_LOCAL void AddIPOptions(const Kel_Key& key, const Port::FileName& description);
 
   Table<Port::FileName> locations;
+  std::vector<std::pair<Kel_Key, Port::FileName>> hidden;  // in the order in which they came
   Table<PropertyList> options;
 };
 

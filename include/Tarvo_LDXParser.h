@@ -1,23 +1,20 @@
 #ifndef TARVO_LDXPARSER_H
 #define TARVO_LDXPARSER_H
 
-#include <cstddef>
-#include <memory>
-#include <string_view>
-#include <unordered_map>
-#include <utility>
 #include <vector>
 
 #include "Port_FileName.h"
+#include "Tarvo_AnalyseOrder.h"
 #include "Tarvo_Export.h"
+#include "Tarvo_KelRecords.h"
 #include "Tarvo_Kel_Key.h"
 
 namespace Tarvo {
 
 class Kel_Index;
 
-// The analyse order of a core: which HDL sources make it up, its own and those of other cores, in
-// which order a compiler takes them, for synthesis and for simulation.
+// The analyse order of a core, or compile order: which HDL sources make it up, its own and those of
+// other cores, in which order a compiler takes them, for synthesis and for simulation.
 //
 //     const Tarvo::LDXParser order(index, key, Tarvo::Kel_Key(), "VHDL");
 //     for (const auto& source : order.ListSynthesisAnalyseOrder()) std::cout << source << '\n';
@@ -114,97 +111,17 @@ class TARVO_EXPORT LDXParser {
   // stays bare.
   StringList ListVerilogIncludeLibraryKeys() const;
 
+  // The same sources, in the same order, each with its library, its language and the place of its
+  // entry; the include directories, and the cores whose whole order the core's own file takes in,
+  // in the order of their entries.
+  std::vector<KelSource> GetSynthesisSources() const;
+  std::vector<KelSource> GetSimulationSources() const;
+  std::vector<KelIncludeDirectory> GetVerilogIncludeDirectories() const;
+  std::vector<KelInclude> GetIncludes() const;
+
  private:
-  using KeyPointer = std::shared_ptr<const Kel_Key>;
-
-  // A source, and its file key: its library, a blank, and its name below the language's directory,
-  // as its location gives them, and as its entry does if that is another text.
-  struct Source {
-    KeyPointer library;
-    Port::FileName location;
-    StringBase fileKey;
-    StringBase entryKey;
-  };
-  // Made once, and then handed from parser to parser.
-  using SourcePointer = std::shared_ptr<const Source>;
-  using SourcePointers = std::vector<SourcePointer>;
-
-  struct Library {
-    KeyPointer key;
-    SourcePointers sources;
-  };
-  // Where an entry's source lies, which the next one mostly shares: its library, as the entry
-  // writes it and as the index knows it, and the directory of its language there.
-  struct Place {
-    StringBase text;
-    KeyPointer key;
-    Port::FileName location;
-    StringBase subdirectory;
-    StringBase directory;
-    StringBase fileKeyStart;
-  };
-
-  // The lists for one purpose. No library is without sources.
-  class TARVO_LOCAL Side {
-   public:
-    // Adds a source under the key of its entry. False, with nothing changed, if that is there.
-    bool Add(const SourcePointer& source);
-    // Adds the sources of another side, which is of no use afterwards, under the keys of their
-    // locations. Gives those whose keys were there.
-    SourcePointers Merge(Side& other);
-    // The library of the source with that file key, or null.
-    const Kel_Key* FindLibrary(const StringBase& fileKey) const;
-    StringList ListSources() const;
-
-    std::vector<Library> libraries;
-
-   private:
-    void Append(const SourcePointer& source);
-
-    // Views of the texts in keys and sources that the libraries hold.
-    std::unordered_map<std::string_view, std::size_t> positions;  // by the library's key text
-    std::unordered_map<std::string_view, const Source*> owners;   // by file key
-    bool byLocation = true;  // whether all keys of owners are those of locations
-  };
-
-  TARVO_LOCAL LDXParser(const Port::FileName& ldxFile, const Kel_Index& theIndex,
-                        const Kel_Key& version, const Kel_Key& root, StringBase language,
-                        const LDXParser* outer);
-
-  TARVO_LOCAL void CheckNesting() const;
-  TARVO_LOCAL void Parse(const Port::FileName& ldxFile);
-  TARVO_LOCAL bool ParseLibraryEntry(std::string_view line);
-  TARVO_LOCAL bool ParsePathEntry(std::string_view line);
-  TARVO_LOCAL bool AddFile(std::string_view keyword, std::string_view library,
-                           const StringBase& file, const StringBase& language);
-  TARVO_LOCAL void AddSource(std::string_view keyword, const SourcePointer& source);
-  TARVO_LOCAL void WarnOfSecond(const Source& source, const char* side) const;
-  TARVO_LOCAL void PartSides();
-  TARVO_LOCAL const Side& Simulation() const;
-  TARVO_LOCAL void LocateLibrary(std::string_view library);
-  TARVO_LOCAL void EnterDirectory(const StringBase& subdirectory);
-  TARVO_LOCAL Source MakeSource(const Port::FileName& name,
-                                const StringBase& missingExtension) const;
-  TARVO_LOCAL bool AnalyseLibrary(const StringBase& library);
-  TARVO_LOCAL StringBase LanguageOf(const Kel_Key& library) const;
-  TARVO_LOCAL void MergeSides(LDXParser& nested);
-  TARVO_LOCAL void TraceKnown(const SourcePointers& sources, const char* side,
-                              const LDXParser& nested) const;
-  TARVO_LOCAL void MergeIncludeDirectories(const LDXParser& nested);
-  TARVO_LOCAL const Port::FileName* FindIncludeDirectory(const Kel_Key& library) const;
-  TARVO_LOCAL StringList ListDirectories(const Side& side) const;
-
   const Kel_Index& index;
-  Kel_Key key;   // as given
-  Kel_Key core;  // the version that it stands for
-  Kel_Key rootKey;
-  StringBase hdl;
-  const LDXParser* enclosing;  // the parser that includes this one; null at the top
-  unsigned level;              // 1 at the top
-  Side synthesis;
-  std::unique_ptr<Side> simulation;  // null while it is the same as for synthesis
-  std::vector<std::pair<Kel_Key, Port::FileName>> includeDirectories;
-  Place latest;  // of the entry before; without a key at first
+  AnalyseOrder order;
 };
 
 }  // namespace Tarvo

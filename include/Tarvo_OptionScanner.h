@@ -36,13 +36,13 @@ class TARVO_EXPORT OptionScanner {
   // NAME and VERSION, then the options of the file in its order, duplicates included, then the
   // defaults of IMP_NETLIST, RUN_TRAMFOLD, STYLE and USAGE_LEVEL that are missing.
   PropertyList GetOptions() const;
+  // The same, handed over without a copy. Afterwards the scanner has none.
+  PropertyList TakeOptions();
 
   // The value of the first entry with exactly that name; empty if there is none.
   static StringBase GetOptionValue(const PropertyList& options, const StringBase& name);
 
  private:
-  friend class Kel_Index;  // keeps the options without a copy
-
   PropertyList options;
 };
 

@@ -6,17 +6,22 @@
 
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
+#include "Tarvo_KelRecords.h"
 
 namespace Tarvo {
 
 class Kel_Index;
-class Kel_Key;
+struct LineFault;
+namespace QVRStatement {
+struct List;
+}
 
 // One statement of a core description: its name, and its properties in the order of the line, with
-// the fixed ones that its kind adds.
+// the fixed ones that its kind adds, and its line.
 struct QVRRecord {
   StringBase name;
   PropertyList properties;
+  unsigned line = 0;
 };
 
 // A core description, read as a whole: options, parameters, generics, ports, bus interfaces and I/O
@@ -143,6 +148,10 @@ class TARVO_EXPORT QVRParser {
   StringList ListIoInterfaceParameters(const StringBase& interface) const;
   StringList ListIoInterfacePorts(const StringBase& interface) const;
 
+  // All statements as the file has them, options, parameters, ports and interfaces, in the order of
+  // its lines. Setting a property changes none of them.
+  std::vector<KelStatement> GetStatements() const;
+
   // Set the first property of exactly that name, or append it to the stated ones. Neither touches
   // the record of the other kind, nor moves one in or out of the generics; setting VALUE leaves
   // DEFAULT_VALUE as the file gave it. Throw AppException; then nothing has changed.
@@ -154,14 +163,16 @@ class TARVO_EXPORT QVRParser {
  private:
   using Records = std::vector<QVRRecord>;
 
-  TARVO_LOCAL bool ReadStatement(std::string_view keyword, std::string_view line);
-  TARVO_LOCAL bool ReadOption(std::string_view line);
-  TARVO_LOCAL bool ReadParameter(std::string_view line);
-  TARVO_LOCAL bool ReadPort(std::string_view line);
-  TARVO_LOCAL static bool ReadInterface(std::string_view line, const StringBase& key,
-                                        Records& interfaces);
+  TARVO_LOCAL bool ReadStatement(std::string_view line, unsigned number, LineFault& fault);
+  TARVO_LOCAL bool ReadOption(std::string_view line, unsigned number, LineFault& fault);
+  TARVO_LOCAL void AddParameter(const QVRStatement::List& list, unsigned number);
+  TARVO_LOCAL static bool AddInterface(const QVRStatement::List& list, unsigned number,
+                                       const StringBase& key, Records& interfaces,
+                                       LineFault& fault);
 
+  StringBase fileName;
   PropertyList options;
+  std::vector<unsigned> optionLines;
   Records generics;
   Records parameters;
   Records ports;

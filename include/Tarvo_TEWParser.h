@@ -7,10 +7,12 @@
 
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
+#include "Tarvo_KelRecords.h"
 #include "Tarvo_Kel_Key.h"
 
 namespace Tarvo {
 
+class FileScanner;
 class Kel_Index;
 class QVRParser;
 
@@ -52,7 +54,7 @@ class TARVO_EXPORT TEWParser {
   // header or a bad row.
   TEWParser(const Kel_Index& theIndex, const Kel_Key& key, const QVRParser* description);
   // The same for a file of any name, taken for that of the version.
-  TEWParser(const Port::FileName& tewFile, const Kel_Index& theIndex, const Kel_Key& key,
+  TEWParser(const Port::FileName& file, const Kel_Index& theIndex, const Kel_Key& key,
             const QVRParser* description);
   ~TEWParser();
   TEWParser(const TEWParser&) = delete;
@@ -71,6 +73,10 @@ class TARVO_EXPORT TEWParser {
   // Throws AppException with level Failure for any other file, and as ListLibraries does.
   Kel_Key GetFileLibrary(const Port::FileName& file) const;
 
+  // The whole table, a row for each of the file's, in its order; those that are selected now are
+  // marked. Throws what ListFiles throws.
+  KelNetlistTable GetTable() const;
+
  private:
   struct Netlist {
     Kel_Key library;
@@ -79,22 +85,26 @@ class TARVO_EXPORT TEWParser {
   struct Row {
     StringList values;
     std::vector<Netlist> netlists;
+    StringBase ignored;
+    unsigned line;
   };
-
-  // What became of a line. One that states nothing has no value at its start.
-  enum Result { Read, StatesNothing, Unparsable };
 
   using NameSet = std::unordered_set<StringBase>;
 
-  TARVO_LOCAL void Parse(const Port::FileName& tewFile, const Kel_Key& key);
-  TARVO_LOCAL Result ParseHeader(std::string_view line, const NameSet& parameterNames);
-  TARVO_LOCAL Result ParseFileEntry(std::string_view line, const Kel_Key& key);
-  TARVO_LOCAL Netlist MakeNetlist(std::string_view name, const Kel_Key& key) const;
+  TARVO_LOCAL void Parse(const Port::FileName& file, const Kel_Key& key);
+  TARVO_LOCAL void TellMissingHeader() const;
+  TARVO_LOCAL bool ParseHeader(const FileScanner& lines, std::string_view line,
+                               const NameSet& parameters);
+  TARVO_LOCAL bool ParseRow(const FileScanner& lines, std::string_view line, const Kel_Key& key);
+  TARVO_LOCAL Netlist MakeNetlist(const FileScanner& lines, std::string_view text,
+                                  const Kel_Key& key) const;
+  TARVO_LOCAL StringList ListParameters() const;
   TARVO_LOCAL StringList GetParameterValues() const;
   TARVO_LOCAL std::vector<const Netlist*> Select() const;
 
   const Kel_Index& index;
   const QVRParser* qvrParser;
+  StringBase tewFile;
   StringList headerNames;
   std::vector<Row> rows;
 };

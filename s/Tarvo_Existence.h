@@ -9,22 +9,34 @@ namespace Tarvo {
 
 // What a look at the disk tells of a name. Unknown is what can't be asked for, as behind a
 // directory without permission; a name that is too long for a file is known to be missing.
-enum class Existence { Missing, Unknown, Known };
+enum class Existence { No, Unknown, Yes };
 
 inline Existence LookFor(const Port::FileName& name) {
   boost::system::error_code error;
   const auto status = boost::filesystem::status(name.GetName().GetText(), error);
-  if (boost::filesystem::exists(status)) return Existence::Known;
+  if (boost::filesystem::exists(status)) return Existence::Yes;
   const bool missing = status.type() == boost::filesystem::file_not_found ||
                        error == boost::system::errc::filename_too_long;
-  return missing ? Existence::Missing : Existence::Unknown;
+  return missing ? Existence::No : Existence::Unknown;
 }
 
 // Whether something of that name is known to exist.
-inline bool Exists(const Port::FileName& name) { return LookFor(name) == Existence::Known; }
+inline bool Exists(const Port::FileName& name) { return LookFor(name) == Existence::Yes; }
 
 // Whether it is not known to be missing: reading it then tells what is wrong.
-inline bool MayExist(const Port::FileName& name) { return LookFor(name) != Existence::Missing; }
+inline bool MayExist(const Port::FileName& name) { return LookFor(name) != Existence::No; }
+
+// Whether it is known to be a plain file, or a link to one.
+inline bool IsFile(const Port::FileName& name) {
+  boost::system::error_code error;
+  return boost::filesystem::is_regular_file(name.GetName().GetText(), error);
+}
+
+// The same for a directory.
+inline bool IsDirectory(const Port::FileName& name) {
+  boost::system::error_code error;
+  return boost::filesystem::is_directory(name.GetName().GetText(), error);
+}
 
 }  // namespace Tarvo
 

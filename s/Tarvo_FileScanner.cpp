@@ -2,6 +2,7 @@
 
 #include <memory>
 #include <string_view>
+#include <utility>
 
 #include "Port_File.h"
 #include "Tarvo_Report.h"
@@ -38,14 +39,22 @@ bool HasTabs(std::string_view text) noexcept {
   return false;
 }
 
+// The exception for a file, which is told as it stands.
+template <class Format>
+AppException Refuse(const Format& format, const StringBase& name, const char* text) {
+  Diagnosis::Add([&] { return Diagnosis::Of(Codes::kUnreadable, name, text); });
+  return Report::Told(Report::Exception(AppException::Failure, format, name));
+}
+
 // Whether it can be read is asked only where it could not be opened.
 OpenStream Open(const StringBase& name) {
+  using Name = Report::FormatFor<StringBase>;
   OpenStream stream(Port::File::open(name, Port::File::Read));
   if (stream) return stream;
   if (!Port::File::canread(name)) {
-    throw Report::Exception(AppException::Failure, "Cannot read file %s\n", name);
+    throw Refuse(Name("Cannot read file %s\n"), name, "can't be read, or is no plain file");
   }
-  throw Report::Exception(AppException::Failure, "Cannot open file %s\n", name);
+  throw Refuse(Name("Cannot open file %s\n"), name, "can't be opened");
 }
 
 }  // namespace
@@ -56,7 +65,8 @@ FileScanner::FileScanner(const Port::FileName& file) : fileName(file.GetName()) 
   text = stream->TakeRest();
   if (Report::IsTracing() && HasTabs(text)) TARVO_TRACE("  Tabs found in file %s\n", fileName);
   if (!Port::File::close(stream.release())) {
-    throw Report::Exception(AppException::Failure, "Cannot close file %s\n", fileName);
+    throw Refuse(Report::FormatFor<StringBase>("Cannot close file %s\n"), fileName,
+                 "can't be read to its end");
   }
   TARVO_TRACE("Closed File %s\n", fileName);
 }
@@ -81,7 +91,7 @@ std::string_view FileScanner::FindLine(std::size_t& next) {
 bool FileScanner::StepTo(std::size_t next, unsigned int& lineNumber) {
   lineNumber = current + 1;
   if (next == position) return false;
-  position = next;
+  lastPosition = std::exchange(position, next);
   ++current;
   return true;
 }
@@ -102,6 +112,11 @@ bool FileScanner::GetNextLine(std::string_view& line, unsigned int& lineNumber) 
   std::size_t next = position;
   line = FindLine(next);
   return StepTo(next, lineNumber);
+}
+
+unsigned int FileScanner::GetColumn(std::string_view part) const noexcept {
+  const auto offset = static_cast<std::size_t>(part.data() - text.data());
+  return static_cast<unsigned>(offset - lastPosition + 1);
 }
 
 void FileScanner::GoToStart() {

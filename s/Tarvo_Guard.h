@@ -7,7 +7,9 @@
 #include <string_view>
 #include <tuple>
 #include <type_traits>
+#include <vector>
 
+#include "Tarvo_KelRecords.h"
 #include "Tarvo_Report.h"
 
 // The boundary of the exported operations: nothing thrown behind it reaches a caller. Each guarded
@@ -34,11 +36,10 @@ enum class Severity {
   ErrorOrFatal  // fatal for an AppException of that level
 };
 
-inline Port_Message::Severity SeverityFor(const std::exception& exception, Severity severity) {
+inline Port_Message::Severity SeverityFor(const AppException* exception, Severity severity) {
   if (severity == Severity::Warning) return Port_Message::Warning;
-  const auto* const own = dynamic_cast<const AppException*>(&exception);
-  const bool fatal =
-      severity == Severity::ErrorOrFatal && own != nullptr && own->level == AppException::Fatal;
+  const bool fatal = severity == Severity::ErrorOrFatal && exception != nullptr &&
+                     exception->level == AppException::Fatal;
   return fatal ? Port_Message::Fatal : Port_Message::Error;
 }
 
@@ -79,26 +80,37 @@ class Failure {
   }
 
   void Issue(const std::exception& exception) const noexcept {
-    IssueText(SeverityFor(exception, severity), format.text, exception.what());
+    const auto* const own = dynamic_cast<const AppException*>(&exception);
+    IssueText(SeverityFor(own, severity), own != nullptr && own->told, format.text,
+              exception.what());
   }
 
   void IssueUnknown() const noexcept {
-    if (forUnknown == ForUnknown::EmptyText) return IssueText(Port_Message::Error, format.text, "");
+    if (forUnknown == ForUnknown::EmptyText) {
+      return IssueText(Port_Message::Error, false, format.text, "");
+    }
     constexpr std::string_view unknown = ", unknown exception\n";
     const std::string_view tail = forUnknown == ForUnknown::CutOff ? "\n" : unknown;
     const std::string_view whole = format.text;
     const std::string_view head = whole.substr(0, whole.size() - kFailureTail.size());
     std::array<char, FailureFormat<Arguments...>::kLongest + unknown.size()> companion{};
     tail.copy(companion.data() + head.copy(companion.data(), head.size()), tail.size());
-    IssueText(Port_Message::Error, companion.data());
+    IssueText(Port_Message::Error, false, companion.data());
   }
 
  private:
+  // What was not told where it was found is told as a failure of this operation.
   template <class... Last>
-  void IssueText(Port_Message::Severity issued, const char* text,
+  void IssueText(Port_Message::Severity issued, bool told, const char* text,
                  const Last&... last) const noexcept {
     std::apply(
         [&](const auto&... values) {
+          if (!told) {
+            Diagnosis::Add([&] {
+              return Diagnosis::Failed(issued == Port_Message::Warning,
+                                       Report::TextOf(text, values..., last...));
+            });
+          }
           module.IssueAt(issued, format.line, text, values..., last...);
         },
         arguments);
@@ -115,7 +127,14 @@ class Failure {
 struct NoOutput {};
 inline void Clear(NoOutput /*none*/) noexcept {}
 inline void Clear(StringBase& text) noexcept { text.Empty(); }
-inline void Clear(StringList& list) noexcept { list.clear(); }
+template <class Element>
+void Clear(std::vector<Element>& list) noexcept {
+  list.clear();
+}
+inline void Clear(KelNetlistTable& table) noexcept {
+  table.parameters.clear();
+  table.rows.clear();
+}
 
 // Does the work, which sets the output as its last step. If it throws, issues the failure. True
 // when the work came to its end, or what it returned if it returns a bool; else the output is

@@ -31,12 +31,18 @@ namespace {
 
 constexpr Report::Module kModule{"s/Tarvo_KelIP", "1.0"};
 
-// Replaces the list by a parser's answer. False without a parser.
-template <class Parser>
-bool Answer(StringList& list, const Parser* parser, StringList (Parser::*question)() const) {
-  if (parser) list = (parser->*question)();
+// Replaces the output by a parser's answer. False without a parser.
+template <class Output, class Parser>
+bool Answer(Output& output, const Parser* parser, Output (Parser::*question)() const) {
+  if (parser) output = (parser->*question)();
   return parser != nullptr;
 }
+
+// Failures that two operations share: one lists texts, the other also the places.
+constexpr char kNoSynthesisOrder[] = "Unable to list synthesis analyse order for IP %s\n%s\n";
+constexpr char kNoSimulationOrder[] = "Unable to list simulation analyse order for IP %s\n%s\n";
+constexpr char kNoIncludeLibraries[] = "Unable to list Verilog include libraries for IP %s\n%s\n";
+constexpr char kNoNetlists[] = "Unable to list netlists for IP %s\n%s\n";
 
 // Empty for a source that is not listed, if that is needed, and for an unknown property.
 StringBase SourceProperty(const LDXParser& order, const StringBase& source,
@@ -304,19 +310,15 @@ bool KelIP::ListIOInterfacePorts(const StringBase& interface, StringList& list) 
 }
 
 bool KelIP::ListSynthesisSources(StringList& list) const {
-  return Guard(
-      list,
-      Failure(kModule, "Unable to list synthesis analyse order for IP %s\n%s\n",
-              impl->key.GetKey()),
-      [&] { return Answer(list, impl->GetLDXParser(), &LDXParser::ListSynthesisAnalyseOrder); });
+  return Guard(list, Failure(kModule, kNoSynthesisOrder, impl->key.GetKey()), [&] {
+    return Answer(list, impl->GetLDXParser(), &LDXParser::ListSynthesisAnalyseOrder);
+  });
 }
 
 bool KelIP::ListSimulationSources(StringList& list) const {
-  return Guard(
-      list,
-      Failure(kModule, "Unable to list simulation analyse order for IP %s\n%s\n",
-              impl->key.GetKey()),
-      [&] { return Answer(list, impl->GetLDXParser(), &LDXParser::ListSimulationAnalyseOrder); });
+  return Guard(list, Failure(kModule, kNoSimulationOrder, impl->key.GetKey()), [&] {
+    return Answer(list, impl->GetLDXParser(), &LDXParser::ListSimulationAnalyseOrder);
+  });
 }
 
 bool KelIP::ListSynthesisLibraries(StringList& list) const {
@@ -334,13 +336,9 @@ bool KelIP::ListSimulationLibraries(StringList& list) const {
 }
 
 bool KelIP::ListVerilogIncludeLibraries(StringList& list) const {
-  return Guard(list,
-               Failure(kModule, "Unable to list Verilog include libraries for IP %s\n%s\n",
-                       impl->key.GetKey()),
-               [&] {
-                 return Answer(list, impl->GetLDXParser(),
-                               &LDXParser::ListVerilogIncludeLibraryKeys);
-               });
+  return Guard(list, Failure(kModule, kNoIncludeLibraries, impl->key.GetKey()), [&] {
+    return Answer(list, impl->GetLDXParser(), &LDXParser::ListVerilogIncludeLibraryKeys);
+  });
 }
 
 bool KelIP::GetVerilogIncludeLocation(const StringBase& library, StringBase& value) const {
@@ -379,8 +377,7 @@ bool KelIP::ListSourceProperties(const StringBase& source, StringList& list) con
 }
 
 bool KelIP::ListNetlists(StringList& list) const {
-  return Guard(list,
-               Failure(kModule, "Unable to list netlists for IP %s\n%s\n", impl->key.GetKey()),
+  return Guard(list, Failure(kModule, kNoNetlists, impl->key.GetKey()),
                [&] { return Answer(list, impl->GetTEWParser(), &TEWParser::ListFiles); });
 }
 
@@ -415,6 +412,40 @@ bool KelIP::ListNetlistProperties(const StringBase& netlist, StringList& list) c
                    return false;
                  return ListAllNetlistProperties(list);
                });
+}
+
+bool KelIP::GetStatements(std::vector<KelStatement>& statements) const {
+  return Guard(statements,
+               Failure(kModule, "Unable to list statements for IP %s\n%s\n", impl->key.GetKey()),
+               [&] { statements = impl->qvrParser->GetStatements(); });
+}
+
+bool KelIP::GetSynthesisSources(std::vector<KelSource>& sources) const {
+  return Guard(sources, Failure(kModule, kNoSynthesisOrder, impl->key.GetKey()), [&] {
+    return Answer(sources, impl->GetLDXParser(), &LDXParser::GetSynthesisSources);
+  });
+}
+
+bool KelIP::GetSimulationSources(std::vector<KelSource>& sources) const {
+  return Guard(sources, Failure(kModule, kNoSimulationOrder, impl->key.GetKey()), [&] {
+    return Answer(sources, impl->GetLDXParser(), &LDXParser::GetSimulationSources);
+  });
+}
+
+bool KelIP::GetVerilogIncludeDirectories(std::vector<KelIncludeDirectory>& directories) const {
+  return Guard(directories, Failure(kModule, kNoIncludeLibraries, impl->key.GetKey()), [&] {
+    return Answer(directories, impl->GetLDXParser(), &LDXParser::GetVerilogIncludeDirectories);
+  });
+}
+
+bool KelIP::GetIncludes(std::vector<KelInclude>& includes) const {
+  return Guard(includes, Failure(kModule, kNoIncludeLibraries, impl->key.GetKey()),
+               [&] { return Answer(includes, impl->GetLDXParser(), &LDXParser::GetIncludes); });
+}
+
+bool KelIP::GetNetlistTable(KelNetlistTable& table) const {
+  return Guard(table, Failure(kModule, kNoNetlists, impl->key.GetKey()),
+               [&] { return Answer(table, impl->GetTEWParser(), &TEWParser::GetTable); });
 }
 
 }  // namespace Tarvo

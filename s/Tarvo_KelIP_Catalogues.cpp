@@ -1,9 +1,11 @@
 // The catalogues of property names that KelIP exports. They are the vocabulary of the core
-// description, and nothing in the library reads them.
+// description; no reader asks them, only the checker.
 
 #include <iterator>
+#include <utility>
 
 #include "Tarvo_KelIP.h"
+#include "Tarvo_PropertyNames.h"
 #include "Tarvo_QVRParser.h"
 
 namespace Tarvo {
@@ -23,6 +25,31 @@ class Name {
   const StringBase* constant = nullptr;
   const char* literal = nullptr;
 };
+
+const Name kCoreProperties[] = {"NAME",
+                                "VERSION",
+                                "ALERT",
+                                "ARCH_SUPPORT",
+                                "ARCH_SUPPORT_MAP",
+                                "BUS_STD",
+                                "CORE_STATE",
+                                "DESC",
+                                "EARLY_ACCESS_ARCH_SUPPORT",
+                                "HDL",
+                                "IMP_NETLIST",
+                                "IP_GROUP",
+                                "IPLEVEL_DRC_PROC",
+                                "IPTYPE",
+                                "LAST_UPDATED",
+                                "LONG_DESC",
+                                "MAX_MASTERS",
+                                "MAX_SLAVES",
+                                "RUN_TRAMFOLD",
+                                "SPECIAL",
+                                "STYLE",
+                                "SYSLEVEL_DRC_PROC",
+                                "TCL_FILE",
+                                "USAGE_LEVEL"};
 
 const Name kParameterProperties[] = {Q::QVR_PROPERTY_NAME,
                                      Q::QVR_PROPERTY_VALUE,
@@ -92,40 +119,56 @@ const Name kSourceProperties[] = {KelIP::KEL_HDL_LIBRARY_PROPERTY, KelIP::KEL_HD
 const Name kNetlistProperties[] = {KelIP::KEL_NETLIST_LIBRARY_PROPERTY};
 
 template <class Catalogue>
-bool Give(const Catalogue& catalogue, StringList& list) {
-  list.assign(std::begin(catalogue), std::end(catalogue));
+StringList ListOf(const Catalogue& catalogue) {
+  return StringList(std::begin(catalogue), std::end(catalogue));
+}
+
+bool Give(StringList&& names, StringList& list) {
+  list = std::move(names);
   return true;
 }
 
 }  // namespace
 
+StringList PropertyNames::OfCores() { return ListOf(kCoreProperties); }
+
+StringList PropertyNames::OfParameters() { return ListOf(kParameterProperties); }
+
+StringList PropertyNames::OfPorts() { return ListOf(kPortProperties); }
+
+StringList PropertyNames::OfBusInterfaces() { return ListOf(kBusInterfaceProperties); }
+
+StringList PropertyNames::OfIoInterfaces() { return ListOf(kIOInterfaceProperties); }
+
 // Questions to an instance like the others, though their answers need none of it.
 // NOLINTBEGIN(readability-convert-member-functions-to-static)
 
 bool KelIP::ListAllParameterProperties(StringList& list) const {
-  return Give(kParameterProperties, list);
+  return Give(PropertyNames::OfParameters(), list);
 }
 
 bool KelIP::ListAllGenericProperties(StringList& list) const {
-  return Give(kParameterProperties, list);
+  return Give(PropertyNames::OfParameters(), list);
 }
 
-bool KelIP::ListAllPortProperties(StringList& list) const { return Give(kPortProperties, list); }
+bool KelIP::ListAllPortProperties(StringList& list) const {
+  return Give(PropertyNames::OfPorts(), list);
+}
 
 bool KelIP::ListAllBusInterfaceProperties(StringList& list) const {
-  return Give(kBusInterfaceProperties, list);
+  return Give(PropertyNames::OfBusInterfaces(), list);
 }
 
 bool KelIP::ListAllIOInterfaceProperties(StringList& list) const {
-  return Give(kIOInterfaceProperties, list);
+  return Give(PropertyNames::OfIoInterfaces(), list);
 }
 
 bool KelIP::ListAllSourceProperties(StringList& list) const {
-  return Give(kSourceProperties, list);
+  return Give(ListOf(kSourceProperties), list);
 }
 
 bool KelIP::ListAllNetlistProperties(StringList& list) const {
-  return Give(kNetlistProperties, list);
+  return Give(ListOf(kNetlistProperties), list);
 }
 
 // NOLINTEND(readability-convert-member-functions-to-static)

@@ -1,18 +1,16 @@
 #include "Tarvo_KelLibrary.h"
 
 #include <boost/filesystem.hpp>
-#include <iterator>
 
 #include "Port_FileName.h"
-#include "Tarvo_Existence.h"
 #include "Tarvo_Guard.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
-#include "Tarvo_Kel_Index_Candidate.h"
 #include "Tarvo_Kel_Key.h"
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_PropertyList.h"
+#include "Tarvo_PropertyNames.h"
 #include "Tarvo_Report.h"
 
 namespace Tarvo {
@@ -25,36 +23,14 @@ constexpr Report::Module kModule{"s/Tarvo_KelLibrary", "1.0"};
 
 const char* const kVersionsSubdirectory = "ipmods";
 
-const char* const kIPProperties[] = {"NAME",
-                                     "VERSION",
-                                     "ALERT",
-                                     "ARCH_SUPPORT",
-                                     "ARCH_SUPPORT_MAP",
-                                     "BUS_STD",
-                                     "CORE_STATE",
-                                     "DESC",
-                                     "EARLY_ACCESS_ARCH_SUPPORT",
-                                     "HDL",
-                                     "IMP_NETLIST",
-                                     "IP_GROUP",
-                                     "IPLEVEL_DRC_PROC",
-                                     "IPTYPE",
-                                     "LAST_UPDATED",
-                                     "LONG_DESC",
-                                     "MAX_MASTERS",
-                                     "MAX_SLAVES",
-                                     "RUN_TRAMFOLD",
-                                     "SPECIAL",
-                                     "STYLE",
-                                     "SYSLEVEL_DRC_PROC",
-                                     "TCL_FILE",
-                                     "USAGE_LEVEL"};
-
-// True for a directory, and for what may not be looked at, which the index then reports. False for
-// all else, as a file or a link to nowhere.
+// True for a directory, and for what can't be looked at, which the index then reports. False for
+// all else, as a file or a link that leads nowhere or back to itself.
 bool MayBeVersion(const fs::directory_entry& entry) {
+  namespace errc = boost::system::errc;
   boost::system::error_code error;
-  return fs::is_directory(entry.status(error)) || error == boost::system::errc::permission_denied;
+  const fs::file_status status = entry.status(error);
+  if (status.type() != fs::status_error) return fs::is_directory(status);
+  return error != errc::too_many_symbolic_link_levels;
 }
 
 }  // namespace
@@ -98,6 +74,9 @@ bool KelLibraryImpl::AddRepository(const StringBase& repository) {
   TARVO_TRACE("KEL Library: Analysing repository %s\n", repository);
   const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
   if (!fs::is_directory(versions)) {
+    Diagnosis::Add([&] {
+      return Diagnosis::Of(Codes::kNotARepository, repository, "has no directory ipmods");
+    });
     kModule.Warning("Unable to add directory %s to library\n", repository);
     return false;
   }
@@ -112,16 +91,11 @@ bool KelLibraryImpl::AddRepository(const StringBase& repository) {
 // and nobody else anything.
 bool KelLibraryImpl::AddVersion(const fs::directory_entry& entry) {
   const Kel_Key key(StringBase(entry.path().filename().c_str()));
-  if (!key.IsValid()) return true;
+  if (!key.IsValid() || !MayBeVersion(entry)) return true;
   Port::FileName location;
   location.SetHead(entry.path().c_str());
-  const Kel_Index::Candidate candidate(key, location);
-  const bool known = candidate.described == Existence::Known;
-  if (!known && !MayBeVersion(entry)) return true;
   try {
-    if (!known) return index.AddIP(key, location);
-    index.Add(candidate);
-    return true;
+    return index.AddIP(key, location);
   } catch (const AppException& exception) {
     kModule.Error("Invalid IP index entry %s at %s\n%s\n", key.GetKey(), location.GetName(),
                   exception.what());
@@ -196,7 +170,7 @@ bool KelLibrary::ListAllIPKeys(StringList& list) const {
 // A question to the library like the others, though its answer needs none of it.
 // NOLINTNEXTLINE(readability-convert-member-functions-to-static)
 bool KelLibrary::ListAllIPProperties(StringList& list) const {
-  list.assign(std::begin(kIPProperties), std::end(kIPProperties));
+  list = PropertyNames::OfCores();
   return true;
 }
 
@@ -207,5 +181,9 @@ KelIP* KelLibrary::CreateIP(const StringBase& key) const {
         [&] { instance = std::make_unique<KelIP>(impl->index, key); });
   return instance.release();
 }
+
+const Kel_Index& KelLibrary::GetIndex() const { return impl->index; }
+
+const StringList& KelLibrary::GetRepositories() const { return impl->repositories; }
 
 }  // namespace Tarvo

@@ -5,7 +5,6 @@
 #include <utility>
 
 #include "Tarvo_Existence.h"
-#include "Tarvo_Kel_Index_Candidate.h"
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_Report.h"
 
@@ -38,6 +37,10 @@ StringList SortedKeys(const Table& table, const Gather& gather) {
   keys.erase(std::unique(keys.begin(), keys.end()), keys.end());
   return keys;
 }
+
+constexpr auto AppendAll = [](const auto& versions, StringList& keys) {
+  for (const auto& version : versions) keys.push_back(version.first.GetKey());
+};
 
 // The entry of this very key: entries of equal versions stand together.
 template <class Versions>
@@ -88,6 +91,14 @@ Insertion<typename Table::mapped_type> Insert(Table& table, const Kel_Key& key, 
   }
 }
 
+void TellRefused(const Kel_Key& key, const FileName& location) {
+  Diagnosis::Add([&] {
+    return key.IsValid()
+               ? Diagnosis::Of(Codes::kUnreadable, location.GetName(), "can't be looked at")
+               : Diagnosis::Of(Codes::kNotAKey, location.GetName(), "its key is no version's");
+  });
+}
+
 }  // namespace
 
 FileName Kel_Index::GetDataFile(const FileName& location, const Kel_Key& key,
@@ -108,46 +119,42 @@ Kel_Index::Kel_Index() : locations(kBucketHint), options(kBucketHint) {
 
 Kel_Index::~Kel_Index() = default;
 
+// A description that is there shows that its location is there too: the disk is asked once for most
+// versions.
 bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
-  if (!key.IsValid() || !Exists(location)) {
+  const FileName description = GetDataFile(location, key, KEL_QVR_EXTENSION);
+  const Existence described = key.IsValid() ? LookFor(description) : Existence::No;
+  if (!key.IsValid() || (described != Existence::Yes && !Exists(location))) {
+    TellRefused(key, location);
     kModule.Error("Invalid IP index entry %s at %s\n", key.GetKey(), location.GetName());
     return false;
   }
-  Add(Candidate(key, location));
-  return true;
-}
-
-void Kel_Index::Add(const Candidate& candidate) {
-  const Kel_Key& key = candidate.key;
-  const FileName& location = candidate.location;
   const auto inserted = Insert(locations, key, location);
   if (!inserted.isNew) {
     TARVO_TRACE("Duplicate IP index entry %s at %s\nPrecedence given to %s\n", key.GetKey(),
                 location.GetName(), inserted.entry->second.GetName());
+    hidden.emplace_back(key, location);
+  } else if (described == Existence::No) {
+    TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
+  } else {
+    AddIPOptions(key, description);
+    return true;
   }
-  const bool withOptions = inserted.isNew && AddIPOptions(candidate);
-  if (!withOptions) {
-    TARVO_TRACE("Library IP %s found at %s\n", key.GetKey(), location.GetName());
-  }
+  TARVO_TRACE("Library IP %s found at %s\n", key.GetKey(), location.GetName());
+  return true;
 }
 
-bool Kel_Index::AddIPOptions(const Candidate& candidate) {
-  const Kel_Key& key = candidate.key;
-  const FileName& location = candidate.location;
-  if (candidate.described == Existence::Missing) {
-    TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
-    return false;
-  }
-  OptionScanner scanner(key, candidate.description);
-  const auto first = std::make_move_iterator(scanner.options.begin());
-  const auto last = std::make_move_iterator(scanner.options.end());
+void Kel_Index::AddIPOptions(const Kel_Key& key, const FileName& description) {
+  PropertyList taken = OptionScanner(key, description).TakeOptions();
+  const auto first = std::make_move_iterator(taken.begin());
+  const auto last = std::make_move_iterator(taken.end());
   Insert(options, key, PropertyList(first, last));  // without the room for more
-  return true;
 }
 
 void Kel_Index::ClearIP() {
   locations.clear();
   options.clear();
+  hidden.clear();
 }
 
 unsigned int Kel_Index::GetBaseIPCount() const { return static_cast<unsigned>(options.size()); }
@@ -165,10 +172,18 @@ const PropertyList& Kel_Index::GetIPOptions(const Kel_Key& key) const {
                           key.GetKey());
 }
 
-StringList Kel_Index::GetAllIPKeys() const {
-  return SortedKeys(options, [](const auto& versions, StringList& keys) {
-    for (const auto& version : versions) keys.push_back(version.first.GetKey());
-  });
+StringList Kel_Index::GetAllIPKeys() const { return SortedKeys(options, AppendAll); }
+
+StringList Kel_Index::GetAllVersionKeys() const { return SortedKeys(locations, AppendAll); }
+
+std::vector<FileName> Kel_Index::GetHiddenLocations(const Kel_Key& key) const {
+  std::vector<FileName> found;
+  const auto* const entry = Find(locations, key);
+  if (!entry) return found;
+  for (const auto& [hiddenKey, location] : hidden) {
+    if (hiddenKey == entry->first) found.push_back(location);
+  }
+  return found;
 }
 
 StringList Kel_Index::GetLatestIPKeys() const {

@@ -1,50 +1,75 @@
 #include "Tarvo_LDXParser.h"
 
 #include <algorithm>
+#include <iterator>
 #include <memory>
+#include <string>
 #include <string_view>
+#include <tuple>
 #include <utility>
+#include <vector>
 
+#include "Port_Input.h"
+#include "Tarvo_AnalyseOrderReader.h"
 #include "Tarvo_Existence.h"
+#include "Tarvo_FileKey.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_Guard.h"
 #include "Tarvo_Kel_Index.h"
+#include "Tarvo_LDXEntry.h"
 #include "Tarvo_LDXParser_Hdl.h"
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_Report.h"
-#include "Tarvo_TokenReader.h"
-#include "Tarvo_Word.h"
+#include "Tarvo_SourceMaker.h"
+#include "Tarvo_TellFault.h"
+#include "Tarvo_TellUnknown.h"
 
 namespace Tarvo {
 
 using Port::FileName;
 
-// A file has one entry on a line, and quotes or brackets make one field of several words:
-//
-//     lib LIBRARY FILE [LANGUAGE]        a source for both lists; synlib and simlib for one of them
-//     lib LIBRARY all                    all that the library's own file lists
-//     vlgincdir LIBRARY DIRECTORY        the library's Verilog include directory
 namespace {
+
+using Diagnosis::Say;
+using Mark = AnalyseOrder::Mark;
+using Source = AnalyseOrder::Source;
+using SourcePointer = AnalyseOrder::SourcePointer;
 
 constexpr Report::Module kModule{"s/Tarvo_LDXParser", "1.0"};
 
-const char* const kDelimiters = " \"'";
-const char* const kBoth = "lib";
-const char* const kSynthesisOnly = "synlib";
-const char* const kSimulationOnly = "simlib";
-const char* const kWholeLibrary = "all";
 const char* const kSynthesis = "synthesis";
 const char* const kSimulation = "simulation";
-const char* const kIncludeDirectory = "vlgincdir";
 const char* const kLanguageOption = "HDL";
-const char* const kBetweenLibraryAndFile = " ";
 
 constexpr unsigned kDeepestLevel = 1000;
+
+KelPlace PlaceOf(const StringBase& file, const Mark& mark) {
+  return {file, mark.line, mark.column, mark.length};
+}
+
+// A file that is being read, and the entry that it has come to.
+struct OpenOrder {
+  std::shared_ptr<const StringBase> file;
+  Kel_Key core;
+  Mark entry;
+};
+// The outermost first.
+using OpenOrders = std::vector<OpenOrder>;
+
+KelPlace PlaceOf(const OpenOrder& open) { return PlaceOf(*open.file, open.entry); }
+
+bool IsBefore(const OpenOrder& left, const OpenOrder& right) {
+  return std::tie(*left.file, left.entry.line) < std::tie(*right.file, right.entry.line);
+}
+
+AppException Circular(const Kel_Key& key) {
+  return Report::Exception(AppException::Failure, "Circular LDX definition for %s\n", key.GetKey());
+}
 
 // The key, which must not be that of the root of its own analysis.
 const Kel_Key& CheckRoot(const Kel_Key& key, const Kel_Key& root) {
   if (!root.IsValid() || key != root) return key;
-  throw Report::Exception(AppException::Failure, "Circular LDX definition for %s\n", root.GetKey());
+  throw Circular(root);
 }
 
 // The analyse-order file of a version, which must be there.
@@ -52,53 +77,9 @@ FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   FileName file =
       Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION);
   if (MayExist(file)) return file;
-  throw Report::Exception(AppException::Failure, "Invalid LDX %s\n", file.GetName());
-}
-
-// Takes the last level off a path; empty if there is none.
-std::string_view PopLevel(std::string_view& path) {
-  while (!path.empty() && path.back() == '/') path.remove_suffix(1);
-  const std::size_t slash = path.rfind('/');
-  const std::size_t start = slash == std::string_view::npos ? 0 : slash + 1;
-  const std::string_view level = path.substr(start);
-  path = path.substr(0, start);
-  return level;
-}
-
-bool IsLanguageDirectory(std::string_view level) {
-  return level == Kel_Index::KEL_VHDL_SUBDIRECTORY.View() ||
-         level == Kel_Index::KEL_VERILOG_SUBDIRECTORY.View();
-}
-
-// Appends the levels of a path, each with one separator behind it.
-void AppendLevels(StringBase& text, std::string_view path) {
-  while (!path.empty()) {
-    const std::size_t end = std::min(path.find('/'), path.size());
-    text.Append(path.data(), static_cast<unsigned>(end));
-    if (end > 0) text.Append("/");
-    path.remove_prefix(std::min(end + 1, path.size()));
-  }
-}
-
-// What a location says of a source: version directory, blank, name below the language's directory,
-// which is the nearest one of such a name. The relative path alone if there is none.
-StringBase GetFileKey(const FileName& location) {
-  const StringBase directory = location.GetPath();
-  std::string_view rest = directory.View();
-  std::size_t behindLanguage = rest.size();
-  std::string_view level = PopLevel(rest);
-  for (; !level.empty() && !IsLanguageDirectory(level); level = PopLevel(rest)) {
-    behindLanguage = rest.size();
-  }
-  StringBase fileKey;
-  if (!level.empty()) {
-    PopLevel(rest);
-    fileKey = StringBase(PopLevel(rest));
-    fileKey.Append(kBetweenLibraryAndFile);
-  }
-  AppendLevels(fileKey, directory.View().substr(behindLanguage));
-  fileKey.Append(location.GetTail());
-  return fileKey;
+  Diagnosis::Add(
+      [&] { return Diagnosis::Of(Codes::kMissingOrder, file.GetName(), "does not exist"); });
+  throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", file.GetName()));
 }
 
 // The key as the index stores it, or as it is if the index does not know it.
@@ -110,108 +91,381 @@ Kel_Key Resolve(const Kel_Index& index, const Kel_Key& key) {
   }
 }
 
+// Reads one file. An include makes a further reader, and both work on one list of open files.
+class OrderReader {
+ public:
+  OrderReader(const Kel_Index& theIndex, OpenOrders& openOrders, const Kel_Key& version,
+              const Kel_Key& theRoot, StringBase language, const FileName& theFile)
+      : index(theIndex),
+        open(openOrders),
+        key(version),
+        core(Resolve(theIndex, version)),
+        root(theRoot.IsValid() ? theRoot : version),
+        hdl(std::move(language)),
+        ldxFile(theFile),
+        fileName(std::make_shared<const StringBase>(ldxFile.GetName())),
+        maker(index, fileName) {}
+
+  AnalyseOrder Read();
+
+ private:
+  void CheckNesting() const;
+  void TellCircle(OpenOrders::const_iterator first) const;
+  void Parse();
+  void ReadLine(std::string_view line);
+  bool AddEntry(const LDXEntry& entry);
+  bool AddFile(const LDXEntry& entry);
+  bool AddDirectory(const LDXEntry& entry);
+  bool AddLibrary(const LDXEntry& entry);
+  void AddSource(const LDXEntry& entry, const SourcePointer& source);
+
+  StringBase LanguageOf(const Kel_Key& library) const;
+
+  FileName FindOrder(const Kel_Key& library, std::string_view text) const;
+  bool ReportMisplaced(const LDXEntry& entry, const HdlPlacement& placement) const;
+  void WarnOfSecond(const Source& source, const char* purpose) const;
+  void TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const;
+  void TellUnknown(std::string_view library) const;
+  void TellIgnored(const LDXEntry& entry) const;
+  void TraceKnown(const AnalyseOrder::SourcePointers& sources, const char* purpose,
+                  const Kel_Key& from) const;
+
+  Diagnosis::Span SpanOf(std::string_view part) const { return Tarvo::SpanOf(*lines, part); }
+  Mark MarkOf(std::string_view part) const {
+    const Diagnosis::Span span = SpanOf(part);
+    return {open.back().entry.line, span.column, span.length};
+  }
+  // A fault at a part of the present line.
+  template <class Text>
+  void Tell(const KelDiagnosticCode& code, std::string_view part, const Text& makeText) const {
+    Diagnosis::Add([&] { return Diagnosis::At(code, SpanOf(part), makeText()); });
+  }
+
+  const Kel_Index& index;
+  OpenOrders& open;
+  Kel_Key key;   // as given
+  Kel_Key core;  // the version that it stands for
+  Kel_Key root;
+  StringBase hdl;
+  FileName ldxFile;
+  std::shared_ptr<const StringBase> fileName;
+  const FileScanner* lines = nullptr;
+  AnalyseOrder order;
+  SourceMaker maker;
+};
+
+AnalyseOrder OrderReader::Read() {
+  CheckNesting();
+  open.push_back({fileName, core, {}});
+  try {
+    Parse();
+  } catch (...) {
+    open.pop_back();
+    throw;
+  }
+  open.pop_back();
+  return std::move(order);
+}
+
+// Refuses the root, a file that is being read already, which only an endless circle comes back to,
+// and what is too deep for the stack. A core whose own file is another one than that which is read
+// in its name is no circle.
+void OrderReader::CheckNesting() const {
+  const bool isRoot = !open.empty() && root.IsValid() && key == root;
+  const auto same = std::find_if(open.begin(), open.end(), [&](const OpenOrder& outer) {
+    return outer.core == core && (isRoot || *outer.file == *fileName);
+  });
+  if (isRoot || same != open.end()) {
+    TellCircle(same == open.end() ? open.begin() : same);
+    throw Report::Told(Circular(core));
+  }
+  if (open.size() < kDeepestLevel) return;
+  Diagnosis::Add([&] {
+    KelDiagnostic told = Diagnosis::At(Codes::kIncludeTooDeep, {}, "includes nest too deep");
+    told.place = PlaceOf(open.back());
+    return told;
+  });
+  throw Report::Told(Report::Exception(AppException::Failure,
+                                       "LDX definition for %s nested below %d others\n",
+                                       core.GetKey(), kDeepestLevel));
+}
+
+// Tells the circle at the include that closes it, with the others behind it. A checker comes into
+// it at any of its cores, so it tells it at the first of its places.
+void OrderReader::TellCircle(OpenOrders::const_iterator first) const {
+  Diagnosis::Add([&] {
+    OpenOrders circle(first, open.cend());
+    const auto start = Diagnosis::GoesOn()
+                           ? std::min_element(circle.begin(), circle.end(), IsBefore)
+                           : std::prev(circle.end());
+    std::rotate(circle.begin(), start, circle.end());
+    std::string cores;
+    for (const OpenOrder& step : circle) cores += std::string(step.core.GetKey()) + ", ";
+    KelDiagnostic told =
+        Diagnosis::At(Codes::kIncludeCircle, {},
+                      Say({"circle of includes: ", cores, circle[0].core.GetKey().View()}),
+                      "take one of the includes out");
+    told.place = PlaceOf(circle[0]);
+    for (std::size_t i = 1; i < circle.size(); ++i) {
+      const Kel_Key& next = circle[(i + 1) % circle.size()].core;
+      told.related.push_back({PlaceOf(circle[i]), Say({"includes ", next.GetKey().View()})});
+    }
+    return told;
+  });
+}
+
+// The first bad line ends all reading, unless a checker reads.
+void OrderReader::Parse() {
+  TARVO_TRACE("  Parsing LDX File %s\n", *fileName);
+  Port_Input input(*fileName);
+  FileScanner scanner(ldxFile);
+  lines = &scanner;
+  std::string_view line;
+  for (unsigned lineNumber = 0; scanner.GetNextLine(line, lineNumber);) {
+    if (line.empty()) continue;
+    input.AtLine(lineNumber);
+    open.back().entry = {lineNumber, 0, 0};
+    ReadLine(line);
+  }
+  TARVO_TRACE("  Parse successful\n");
+}
+
+void OrderReader::ReadLine(std::string_view line) {
+  LDXEntry entry;
+  LineFault fault;
+  const bool isRead = ReadLDXEntry(line, entry, fault);
+  if (!isRead) Tell(Codes::kBadEntry, fault.where, [&] { return StringBase(fault.text); });
+  if (isRead && AddEntry(entry)) return;
+  const char* const kind = entry.kind == LDXEntry::IncludeDirectory ? "path" : "library";
+  kModule.Error("LDX unparsable %s entry: %s line %d, %s\n", kind, *fileName,
+                open.back().entry.line, StringBase(line));
+  if (Diagnosis::GoesOn()) return;
+  throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", *fileName));
+}
+
+bool OrderReader::AddEntry(const LDXEntry& entry) {
+  switch (entry.kind) {
+    case LDXEntry::File:
+      return AddFile(entry);
+    case LDXEntry::WholeLibrary:
+      return AddLibrary(entry);
+    case LDXEntry::IncludeDirectory:
+      return AddDirectory(entry);
+    case LDXEntry::Ignored:
+      TellIgnored(entry);
+  }
+  return true;
+}
+
+bool OrderReader::AddFile(const LDXEntry& entry) {
+  const StringBase file(entry.name);
+  try {
+    maker.EnterLibrary(entry.library);
+  } catch (const AppException& exception) {
+    TellUnknown(entry.library);
+    kModule.Error("Unable to determine location for library %s, file %s\n%s\n",
+                  StringBase(entry.library), file, exception.what());
+    return false;
+  }
+  const FileName name(file);
+  const HdlPlacement placement = PlaceSource(hdl, StringBase(entry.language), name);
+  if (placement.assumed) {
+    TARVO_TRACE("HDL language not specified for file %s:%s when IP core is MIXED\n",
+                StringBase(entry.library), file);
+  }
+  if (placement.verdict != HdlPlacement::Placed) return ReportMisplaced(entry, placement);
+  AddSource(entry,
+            std::make_shared<const Source>(maker.Make(file, name, placement, MarkOf(entry.name))));
+  return true;
+}
+
 // Says what is wrong with a file entry. True if that costs the entry alone.
-bool ReportMisplaced(const HdlPlacement& placement, const StringBase& file) {
+bool OrderReader::ReportMisplaced(const LDXEntry& entry, const HdlPlacement& placement) const {
+  const StringBase file(entry.name);
+  const std::string_view language = entry.language;
   switch (placement.verdict) {
     case HdlPlacement::Placed:
       return true;
     case HdlPlacement::UnknownLanguage:
+      Tell(Codes::kUnknownLanguage, language, [&] {
+        return Say({"no such language: ", language, "; the source is left out"});
+      });
       kModule.Error("Unknown HDL language specified\n");
       return true;
     case HdlPlacement::LanguageOnBoth:
+      Tell(Codes::kLanguageNotAllowed, language,
+           [] { return "in a core of HDL BOTH no source has a language; it is left out"; });
       kModule.Error("HDL language specified when IP core is BOTH\n");
       return true;
     case HdlPlacement::AgainstExtension:
+      Tell(Codes::kLanguageMismatch, language.empty() ? entry.name : language, [&] {
+        return Say({entry.name, " is listed as ", placement.language.View()});
+      });
       kModule.Error("File %s declared to be %s\n", file, placement.language);
       return false;
     case HdlPlacement::NeitherLanguageNorExtension:
+      Tell(Codes::kNoLanguage, entry.name, [&] {
+        return Say({entry.name, " has neither a language nor an extension"});
+      });
       kModule.Error("Unable to add file extension to %s\n", file);
       return false;
   }
   return false;
 }
 
-void AppendExtension(StringBase& name, const StringBase& extension) {
-  if (extension.GetLength() == 0) return;
-  name.Append(".");
-  name.Append(extension);
+void OrderReader::AddSource(const LDXEntry& entry, const SourcePointer& source) {
+  const AnalyseOrder::Earlier earlier = order.Add(source, entry.forSynthesis, entry.forSimulation);
+  if (!earlier.synthesis && !earlier.simulation) return;
+  TellSecond(entry, earlier);
+  if (earlier.synthesis) WarnOfSecond(*source, kSynthesis);
+  if (earlier.simulation) WarnOfSecond(*source, kSimulation);
 }
 
-// The file key that an entry gives: the file's name as written, but for a missing extension.
-StringBase GetEntryKey(const Kel_Key& library, const StringBase& file,
-                       const StringBase& missingExtension) {
-  StringBase fileKey = library.GetKey();
-  fileKey.Append(kBetweenLibraryAndFile);
-  fileKey.Append(file.GetText());  // up to a NUL byte, where its name on disk ends too
-  AppendExtension(fileKey, missingExtension);
-  return fileKey;
+void OrderReader::TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const {
+  Diagnosis::Add([&] {
+    const bool both = earlier.synthesis && earlier.simulation;
+    const char* const purpose = earlier.synthesis ? kSynthesis : kSimulation;
+    const Source& first = *(earlier.synthesis ? earlier.synthesis : earlier.simulation);
+    return Diagnosis::With(
+        Diagnosis::At(Codes::kDuplicateSource, SpanOf(entry.name),
+                      Say({entry.name, " of ", first.origin->library->GetKey().View(),
+                           " is listed already", both ? "" : " for ", both ? "" : purpose})),
+        PlaceOf(*first.origin->file, first.mark), "first listed here");
+  });
 }
 
-}  // namespace
+void OrderReader::WarnOfSecond(const Source& source, const char* purpose) const {
+  kModule.Warning("%s - File %s:%s already exists in %s library\n", key.GetKey(),
+                  source.origin->library->GetKey(), source.location.GetTail(), purpose);
+}
 
-bool LDXParser::Side::Add(const SourcePointer& source) {
-  const bool sameKey = source->entryKey.GetLength() == 0;
-  const StringBase& fileKey = sameKey ? source->fileKey : source->entryKey;
-  if (!owners.try_emplace(fileKey.View(), source.get()).second) return false;
-  Append(source);
-  byLocation = byLocation && sameKey;
+void OrderReader::TellUnknown(std::string_view library) const {
+  Diagnosis::Add([&] { return TellUnknownLibrary(*lines, index, library); });
+}
+
+// Only a checker tells what the order takes as it stands.
+void OrderReader::TellIgnored(const LDXEntry& entry) const {
+  if (!Diagnosis::GoesOn()) return;
+  Tell(Codes::kIgnoredEntry, entry.rest, [&] {
+    const bool isPath = entry.kind == LDXEntry::IncludeDirectory;
+    return Say({isPath ? "the entry is ignored, since it goes on behind its directory"
+                       : "the entry is ignored; write vlgincdir in small letters"});
+  });
+}
+
+bool OrderReader::AddDirectory(const LDXEntry& entry) {
+  const StringBase library(entry.library);
+  const StringBase directory(entry.name);
+  const Kel_Key libKey(library);
+  FileName location = index.GetIPLocation(key);
+  location.PushPathEnd(directory);
+  if (!Exists(FileName(location.Normalize()))) {
+    Tell(Codes::kMissingIncludeDirectory, entry.name, [&] {
+      return Say({"include directory does not exist: ", entry.name});
+    });
+    kModule.Warning("The include directory %s for library %s does not exist\n", directory, library);
+    return false;
+  }
+  if (!entry.rest.empty()) {
+    TellIgnored(entry);
+    return true;
+  }
+  if (const auto* const known = order.FindIncludeDirectory(libKey)) {
+    Diagnosis::Add([&] {
+      return Diagnosis::With(
+          Diagnosis::At(Codes::kDuplicateIncludeDirectory, SpanOf(entry.library),
+                        Say({entry.library, " has an include directory already"})),
+          PlaceOf(*known->file, known->mark), "first given here");
+    });
+    kModule.Warning("Library %s already has path %s defined\n", library, known->location.GetName());
+    return false;
+  }
+  order.includeDirectories.push_back({libKey, location, fileName, MarkOf(entry.name)});
   return true;
 }
 
-// Most sources follow one of the same library.
-void LDXParser::Side::Append(const SourcePointer& source) {
-  const KeyPointer& library = source->library;
-  std::size_t position = libraries.size() - 1;
-  if (libraries.empty() || libraries.back().key != library) {
-    const auto [known, isNew] = positions.try_emplace(library->GetKey().View(), libraries.size());
-    if (isNew) libraries.push_back({library, {}});
-    position = known->second;
-  }
-  libraries[position].sources.push_back(source);
+bool OrderReader::AddLibrary(const LDXEntry& entry) {
+  const StringBase library(entry.library);
+  return Guard(NoOutput(), Failure(kModule, "Unable to analyse library %s\n%s\n", library), [&] {
+    const Kel_Key libKey(library);
+    open.back().entry = MarkOf(entry.library);
+    const StringBase language = LanguageOf(libKey);
+    const FileName libFile = FindOrder(libKey, entry.library);
+    order.includes.push_back({library, Resolve(index, libKey), fileName, open.back().entry});
+    // Not on the stack, of which each level of a deep chain needs some.
+    const auto nested = std::make_unique<OrderReader>(index, open, libKey, root, language, libFile);
+    const AnalyseOrder::Known known = order.Append(nested->Read());
+    TraceKnown(known.synthesis, kSynthesis, libKey);
+    TraceKnown(known.ForSimulation(), kSimulation, libKey);
+  });
 }
 
-// With the same kind of keys, those that are new here come over without being made again, and those
-// that are known stay behind.
-LDXParser::SourcePointers LDXParser::Side::Merge(Side& other) {
-  SourcePointers known;
-  if (libraries.empty() && other.byLocation) {
-    *this = std::move(other);
-    return known;
+FileName OrderReader::FindOrder(const Kel_Key& library, std::string_view text) const {
+  try {
+    return GetLdxFile(index, library);
+  } catch (AppException& exception) {
+    if (!exception.told) TellUnknown(text);
+    throw Report::Told(exception);
   }
-  if (other.byLocation) owners.merge(other.owners);
-  const bool allNew = other.byLocation && other.owners.empty();
-  for (Library& library : other.libraries) {
-    if (allNew && positions.try_emplace(library.key->GetKey().View(), libraries.size()).second) {
-      libraries.push_back(std::move(library));
-      continue;
-    }
+}
+
+// The language of an included core; this one's own if the index has no options of it.
+StringBase OrderReader::LanguageOf(const Kel_Key& library) const {
+  StringBase language;
+  try {
+    language = OptionScanner::GetOptionValue(index.GetIPOptions(library), kLanguageOption);
+  } catch (const AppException& exception) {
+    if (exception.level == AppException::NotFound) language = hdl;
+  }
+  return language.GetLength() > 0 ? language : LDXParser::LDX_HDL_VHDL;
+}
+
+void OrderReader::TraceKnown(const AnalyseOrder::SourcePointers& sources, const char* purpose,
+                             const Kel_Key& from) const {
+  for (const SourcePointer& source : sources) {
+    TARVO_TRACE("%s - File %s:%s included from %s already exists in %s library\n", key.GetKey(),
+                source->origin->library->GetKey(), source->location.GetTail(), from.GetKey(),
+                purpose);
+  }
+}
+
+std::vector<KelSource> DescribeSources(const AnalyseOrder::SourceList& list) {
+  std::vector<KelSource> sources;
+  for (const AnalyseOrder::Library& library : list.libraries) {
     for (const SourcePointer& source : library.sources) {
-      const std::string_view fileKey = source->fileKey.View();
-      const bool isNew = other.byLocation ? !other.owners.contains(fileKey)
-                                          : owners.try_emplace(fileKey, source.get()).second;
-      if (isNew) {
-        Append(source);
-      } else {
-        known.push_back(source);
-      }
+      const AnalyseOrder::Origin& origin = *source->origin;
+      sources.push_back({source->location.GetAbsolutePath(), *origin.library, origin.language,
+                         PlaceOf(*origin.file, source->mark)});
     }
   }
-  return known;
+  return sources;
 }
 
-const Kel_Key* LDXParser::Side::FindLibrary(const StringBase& fileKey) const {
-  const auto owner = owners.find(fileKey.View());
-  return owner == owners.end() ? nullptr : owner->second->library.get();
-}
-
-StringList LDXParser::Side::ListSources() const {
+StringList ListPaths(const AnalyseOrder::SourceList& list) {
   StringList paths;
-  for (const Library& library : libraries) {
+  for (const AnalyseOrder::Library& library : list.libraries) {
     for (const SourcePointer& source : library.sources) {
       paths.push_back(source->location.GetAbsolutePath());
     }
   }
   return paths;
+}
+
+StringList ListDirectories(const Kel_Index& index, const AnalyseOrder::SourceList& list) {
+  StringList directories;
+  for (const AnalyseOrder::Library& library : list.libraries) {
+    directories.push_back(index.GetIPLocation(*library.key).GetAbsolutePath());
+  }
+  return directories;
+}
+
+}  // namespace
+
+AnalyseOrder ReadAnalyseOrder(const FileName& file, const Kel_Index& index, const Kel_Key& version,
+                              const Kel_Key& root, const StringBase& language) {
+  CheckRoot(version, root);
+  OpenOrders open;
+  return OrderReader(index, open, version, root, language, file).Read();
 }
 
 LDXParser::LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,
@@ -221,239 +475,9 @@ LDXParser::LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Ke
 
 LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
                      const Kel_Key& root, const StringBase& language)
-    : LDXParser(ldxFile, theIndex, version, root, language, nullptr) {}
-
-LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
-                     const Kel_Key& root, StringBase language, const LDXParser* outer)
-    : index(theIndex),
-      key(CheckRoot(version, root)),
-      core(Resolve(theIndex, version)),
-      rootKey(root.IsValid() ? root : version),
-      hdl(std::move(language)),
-      enclosing(outer),
-      level(outer ? outer->level + 1 : 1) {
-  CheckNesting();
-  Parse(ldxFile);
-}
+    : index(theIndex), order(ReadAnalyseOrder(ldxFile, theIndex, version, root, language)) {}
 
 LDXParser::~LDXParser() = default;
-
-// Finds the circles that don't lead through the root, or reach it by its bare name.
-void LDXParser::CheckNesting() const {
-  for (const LDXParser* outer = enclosing; outer; outer = outer->enclosing) {
-    if (outer->core == core) {
-      throw Report::Exception(AppException::Failure, "Circular LDX definition for %s\n",
-                              core.GetKey());
-    }
-  }
-  if (level > kDeepestLevel) {
-    throw Report::Exception(AppException::Failure, "LDX definition for %s nested below %d others\n",
-                            core.GetKey(), kDeepestLevel);
-  }
-}
-
-// The first bad line ends all reading.
-void LDXParser::Parse(const FileName& ldxFile) {
-  const StringBase name = ldxFile.GetName();
-  TARVO_TRACE("  Parsing LDX File %s\n", name);
-  FileScanner lines(ldxFile);
-  std::string_view line;
-  for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
-    if (line.empty()) continue;
-    const bool isPath = Matches(StringBase(FirstWord(line)), kIncludeDirectory);
-    if (isPath ? ParsePathEntry(line) : ParseLibraryEntry(line)) continue;
-    const char* const kind = isPath ? "path" : "library";
-    kModule.Error("LDX unparsable %s entry: %s line %d, %s\n", kind, name, lineNumber,
-                  StringBase(line));
-    throw Report::Exception(AppException::Failure, "Invalid LDX %s\n", name);
-  }
-  TARVO_TRACE("  Parse successful\n");
-}
-
-bool LDXParser::ParseLibraryEntry(std::string_view line) {
-  TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);
-  std::string_view keyword;
-  std::string_view library;
-  std::string_view name;
-  if (!tokens.ReadField(keyword)) return false;
-  if (keyword != kBoth && keyword != kSynthesisOnly && keyword != kSimulationOnly) return false;
-  if (!tokens.ReadField(library) || !tokens.ReadField(name)) return false;
-  const StringBase file(name);
-  if (Matches(file, kWholeLibrary)) {
-    return !tokens.MoreTokens() && AnalyseLibrary(StringBase(library));
-  }
-  // A language that is not closed is judged by what there is of it.
-  const TokenReader::Value language = tokens.ReadValue();
-  tokens.Step();
-  if (tokens.MoreTokens()) return false;
-  return AddFile(keyword, library, file, StringBase(language.text));
-}
-
-// A keyword in other letter case, and a line that goes on behind the directory, are ignored.
-bool LDXParser::ParsePathEntry(std::string_view line) {
-  TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);
-  std::string_view keyword;
-  std::string_view libraryText;
-  std::string_view directoryText;
-  if (!tokens.ReadField(keyword)) return false;
-  if (keyword != kIncludeDirectory) return true;
-  if (!tokens.ReadField(libraryText) || !tokens.ReadField(directoryText)) return false;
-  const StringBase library(libraryText);
-  const StringBase directory(directoryText);
-  const Kel_Key libKey(library);
-  FileName location = index.GetIPLocation(key);
-  location.PushPathEnd(directory);
-  if (!Exists(FileName(location.Normalize()))) {
-    kModule.Warning("The include directory %s for library %s does not exist\n", directory, library);
-    return false;
-  }
-  if (tokens.MoreTokens()) return true;
-  if (const FileName* const known = FindIncludeDirectory(libKey)) {
-    kModule.Warning("Library %s already has path %s defined\n", library, known->GetName());
-    return false;
-  }
-  includeDirectories.emplace_back(libKey, location);
-  return true;
-}
-
-bool LDXParser::AddFile(std::string_view keyword, std::string_view library, const StringBase& file,
-                        const StringBase& language) {
-  try {
-    LocateLibrary(library);
-  } catch (const AppException& exception) {
-    kModule.Error("Unable to determine location for library %s, file %s\n%s\n", StringBase(library),
-                  file, exception.what());
-    return false;
-  }
-  const FileName name(file);
-  const HdlPlacement placement = PlaceSource(hdl, language, name);
-  if (placement.assumed) {
-    TARVO_TRACE("HDL language not specified for file %s:%s when IP core is MIXED\n",
-                StringBase(library), file);
-  }
-  if (placement.verdict != HdlPlacement::Placed) return ReportMisplaced(placement, file);
-  EnterDirectory(placement.subdirectory);
-  Source source = MakeSource(name, placement.missingExtension);
-  source.entryKey = GetEntryKey(*latest.key, file, placement.missingExtension);
-  if (source.entryKey == source.fileKey) source.entryKey.Empty();
-  AddSource(keyword, std::make_shared<const Source>(std::move(source)));
-  return true;
-}
-
-void LDXParser::LocateLibrary(std::string_view library) {
-  if (latest.key && latest.text.View() == library) return;
-  Place place;
-  place.text = StringBase(library);
-  place.key = std::make_shared<const Kel_Key>(index.GetIPKey(Kel_Key(place.text)));
-  place.location = index.GetIPLocation(*place.key);
-  latest = std::move(place);
-}
-
-void LDXParser::EnterDirectory(const StringBase& subdirectory) {
-  if (latest.subdirectory == subdirectory) return;
-  FileName directory = latest.location;
-  directory.SetBase("");
-  directory.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
-  directory.PushPathEnd(subdirectory);
-  latest.subdirectory = subdirectory;
-  latest.directory = directory.GetHead();
-  latest.fileKeyStart = GetFileKey(directory);
-}
-
-// The source of that name at the latest place. A name with levels may lead to another directory of
-// a language, so its file key is read off the whole location.
-LDXParser::Source LDXParser::MakeSource(const FileName& name,
-                                        const StringBase& missingExtension) const {
-  Source source{latest.key, name, latest.fileKeyStart, {}};
-  source.location.SetHead(latest.directory);
-  if (missingExtension.GetLength() > 0) source.location.SetExtension(missingExtension);
-  const StringBase levels = name.GetPath();
-  if (levels.GetLength() > 0) {
-    source.location.PushPathEnd(levels);
-    source.fileKey = GetFileKey(source.location);
-  } else {
-    source.fileKey.Append(source.location.GetTail());
-  }
-  return source;
-}
-
-void LDXParser::AddSource(std::string_view keyword, const SourcePointer& source) {
-  if (keyword != kBoth) PartSides();
-  const bool inSynthesis = keyword != kSimulationOnly && !synthesis.Add(source);
-  const bool inSimulation =
-      simulation ? keyword != kSynthesisOnly && !simulation->Add(source) : inSynthesis;
-  if (inSynthesis) WarnOfSecond(*source, kSynthesis);
-  if (inSimulation) WarnOfSecond(*source, kSimulation);
-}
-
-void LDXParser::WarnOfSecond(const Source& source, const char* side) const {
-  kModule.Warning("%s - File %s:%s already exists in %s library\n", key.GetKey(),
-                  source.library->GetKey(), source.location.GetTail(), side);
-}
-
-// From here on the lists for simulation are their own.
-void LDXParser::PartSides() {
-  if (!simulation) simulation = std::make_unique<Side>(synthesis);
-}
-
-const LDXParser::Side& LDXParser::Simulation() const {
-  return simulation ? *simulation : synthesis;
-}
-
-bool LDXParser::AnalyseLibrary(const StringBase& library) {
-  return Guard(NoOutput(), Failure(kModule, "Unable to analyse library %s\n%s\n", library), [&] {
-    const Kel_Key libKey(library);
-    const StringBase language = LanguageOf(libKey);
-    // Not on the stack, of which each level of a deep chain needs some.
-    const std::unique_ptr<LDXParser> nested(
-        new LDXParser(GetLdxFile(index, libKey), index, libKey, rootKey, language, this));
-    MergeSides(*nested);
-    MergeIncludeDirectories(*nested);
-  });
-}
-
-// The language of an included core; this one's own if the index has no options of it.
-StringBase LDXParser::LanguageOf(const Kel_Key& library) const {
-  StringBase language;
-  try {
-    language = OptionScanner::GetOptionValue(index.GetIPOptions(library), kLanguageOption);
-  } catch (const AppException& exception) {
-    if (exception.level == AppException::NotFound) language = hdl;
-  }
-  return language.GetLength() > 0 ? language : LDX_HDL_VHDL;
-}
-
-// The nested parser is of no use afterwards.
-void LDXParser::MergeSides(LDXParser& nested) {
-  if (simulation || nested.simulation) {
-    PartSides();
-    nested.PartSides();
-  }
-  const SourcePointers known = synthesis.Merge(nested.synthesis);
-  TraceKnown(known, kSynthesis, nested);
-  TraceKnown(simulation ? simulation->Merge(*nested.simulation) : known, kSimulation, nested);
-}
-
-void LDXParser::TraceKnown(const SourcePointers& sources, const char* side,
-                           const LDXParser& nested) const {
-  for (const SourcePointer& source : sources) {
-    TARVO_TRACE("%s - File %s:%s included from %s already exists in %s library\n", key.GetKey(),
-                source->library->GetKey(), source->location.GetTail(), nested.key.GetKey(), side);
-  }
-}
-
-// A library keeps the directory that it was given first.
-void LDXParser::MergeIncludeDirectories(const LDXParser& nested) {
-  for (const auto& entry : nested.includeDirectories) {
-    if (!FindIncludeDirectory(entry.first)) includeDirectories.push_back(entry);
-  }
-}
-
-const FileName* LDXParser::FindIncludeDirectory(const Kel_Key& library) const {
-  const auto found = std::find_if(includeDirectories.begin(), includeDirectories.end(),
-                                  [&](const auto& entry) { return entry.first == library; });
-  return found == includeDirectories.end() ? nullptr : &found->second;
-}
 
 // A question to the parser like the others, though its answer needs none of it.
 // NOLINTNEXTLINE(readability-convert-member-functions-to-static)
@@ -462,38 +486,61 @@ StringBase LDXParser::GetFileLanguage(const FileName& file) const {
 }
 
 Kel_Key LDXParser::GetFileLibrary(const FileName& file) const {
-  const StringBase fileKey = GetFileKey(file);
-  const Kel_Key* library = synthesis.FindLibrary(fileKey);
-  if (!library && simulation) library = simulation->FindLibrary(fileKey);
-  return library ? *library : Kel_Key();
+  const StringBase fileKey = FileKey::OfLocation(file);
+  const Source* source = order.GetSynthesis().Find(fileKey);
+  if (!source) source = order.GetSimulation().Find(fileKey);
+  return source ? *source->origin->library : Kel_Key();
 }
 
 StringBase LDXParser::GetVerilogIncludeLocation(const StringBase& library) const {
   const Kel_Key libKey(library);
-  const FileName* const directory = FindIncludeDirectory(libKey);
-  return directory ? directory->GetAbsolutePath() : index.GetIPLocation(libKey).GetAbsolutePath();
+  const auto* const known = order.FindIncludeDirectory(libKey);
+  return (known ? known->location : index.GetIPLocation(libKey)).GetAbsolutePath();
 }
 
-StringList LDXParser::ListDirectories(const Side& side) const {
-  StringList directories;
-  for (const Library& library : side.libraries) {
-    directories.push_back(index.GetIPLocation(*library.key).GetAbsolutePath());
+StringList LDXParser::ListSynthesisLibraries() const {
+  return ListDirectories(index, order.GetSynthesis());
+}
+
+StringList LDXParser::ListSimulationLibraries() const {
+  return ListDirectories(index, order.GetSimulation());
+}
+
+StringList LDXParser::ListSynthesisAnalyseOrder() const { return ListPaths(order.GetSynthesis()); }
+
+StringList LDXParser::ListSimulationAnalyseOrder() const {
+  return ListPaths(order.GetSimulation());
+}
+
+StringList LDXParser::ListVerilogIncludeLibraryKeys() const {
+  StringList keys;
+  for (const auto& entry : order.includeDirectories) keys.push_back(entry.library.GetKey());
+  return keys;
+}
+
+std::vector<KelSource> LDXParser::GetSynthesisSources() const {
+  return DescribeSources(order.GetSynthesis());
+}
+
+std::vector<KelSource> LDXParser::GetSimulationSources() const {
+  return DescribeSources(order.GetSimulation());
+}
+
+std::vector<KelIncludeDirectory> LDXParser::GetVerilogIncludeDirectories() const {
+  std::vector<KelIncludeDirectory> directories;
+  for (const auto& entry : order.includeDirectories) {
+    directories.push_back({entry.library.GetKey(), entry.location.GetAbsolutePath(),
+                           PlaceOf(*entry.file, entry.mark)});
   }
   return directories;
 }
 
-StringList LDXParser::ListSynthesisLibraries() const { return ListDirectories(synthesis); }
-
-StringList LDXParser::ListSimulationLibraries() const { return ListDirectories(Simulation()); }
-
-StringList LDXParser::ListSynthesisAnalyseOrder() const { return synthesis.ListSources(); }
-
-StringList LDXParser::ListSimulationAnalyseOrder() const { return Simulation().ListSources(); }
-
-StringList LDXParser::ListVerilogIncludeLibraryKeys() const {
-  StringList keys;
-  for (const auto& entry : includeDirectories) keys.push_back(entry.first.GetKey());
-  return keys;
+std::vector<KelInclude> LDXParser::GetIncludes() const {
+  std::vector<KelInclude> includes;
+  for (const auto& entry : order.includes) {
+    includes.push_back({entry.library, entry.core, PlaceOf(*entry.file, entry.mark)});
+  }
+  return includes;
 }
 
 }  // namespace Tarvo

@@ -3,11 +3,13 @@
 #include <string_view>
 #include <utility>
 
+#include "Port_Input.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_OptionDefaults.h"
 #include "Tarvo_PropertyList.h"
 #include "Tarvo_QVRStatement.h"
 #include "Tarvo_Report.h"
+#include "Tarvo_TellFault.h"
 
 namespace Tarvo {
 
@@ -34,12 +36,12 @@ namespace {
 constexpr Report::Module kModule{"s/Tarvo_OptionScanner", "1.0"};
 
 // Appends the option of a line that states one. False for a bad statement.
-bool ReadLine(std::string_view line, PropertyList& options) {
+bool ReadLine(std::string_view line, PropertyList& options, LineFault& fault) {
   using namespace QVRStatement;
   if (!BeginsWith(line, OptionScanner::QVR_OPTION, kScannerDelimiters)) return true;
-  Property option;
-  const Result result = ReadOption(line, kScannerDelimiters, option);
-  if (result == Read) options.push_back(std::move(option));
+  OptionText option;
+  const Result result = ReadOption(line, kScannerDelimiters, option, fault);
+  if (result == Read) options.push_back(MakeOption(option));
   return result != Unparsable;
 }
 
@@ -59,23 +61,30 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
                             name);
   }
   TARVO_TRACE("  Parsing QVR File %s\n", name);
+  Port_Input input(name);
   FileScanner lines(file);
   options = {{QVR_OPTION_NAME, key.GetName()}, {QVR_OPTION_VERSION, key.GetVersion()}};
   bool ok = true;
   std::string_view line;
   for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
-    if (ReadLine(line, options)) continue;
+    input.AtLine(lineNumber);
+    LineFault fault;
+    if (ReadLine(line, options, fault)) continue;
+    Diagnosis::Add([&] { return TellFault(Codes::kBadStatement, lines, fault); });
     kModule.Error("QVR unparsable OPTION: %s line %d, %s\n", name, lineNumber, StringBase(line));
     ok = false;
   }
   ForEachMissing(options, kOptionDefaults,
                  [&](const DefaultRow& row) { options.emplace_back(*row.name, *row.value); });
-  if (!ok) throw Report::Exception(AppException::Failure, "Unable to parse QVR %s\n", name);
+  if (ok) return;
+  throw Report::Told(Report::Exception(AppException::Failure, "Unable to parse QVR %s\n", name));
 }
 
 OptionScanner::~OptionScanner() = default;
 
 PropertyList OptionScanner::GetOptions() const { return options; }
+
+PropertyList OptionScanner::TakeOptions() { return std::exchange(options, {}); }
 
 StringBase OptionScanner::GetOptionValue(const PropertyList& options, const StringBase& name) {
   if (const StringBase* const value = FindValue(options, name)) return *value;

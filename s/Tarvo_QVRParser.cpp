@@ -2,10 +2,10 @@
 
 #include <algorithm>
 #include <initializer_list>
-#include <iterator>
 #include <string_view>
 #include <utility>
 
+#include "Port_Input.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
@@ -14,6 +14,7 @@
 #include "Tarvo_PropertyList.h"
 #include "Tarvo_QVRStatement.h"
 #include "Tarvo_Report.h"
+#include "Tarvo_TellFault.h"
 #include "Tarvo_TokenReader.h"
 #include "Tarvo_Word.h"
 
@@ -106,38 +107,34 @@ const Kind kBusInterface{"Bus Interface", kBusInterfaceDefaults, &Q::QVR_BUS_IF_
 const Kind kIoInterface{"I/O Interface", kIoInterfaceDefaults, &Q::QVR_IO_IF_NAME};
 const Kind kPort{"Port", kPortDefaults};
 
-// Reads a record that its first pair names. That pair's value stands under each of the value keys,
-// behind the name and in front of the other pairs.
-bool ReadNamedByFirst(std::string_view line, std::initializer_list<const StringBase*> valueKeys,
-                      QVRRecord& record) {
-  PropertyList pairs;
-  if (!QVRStatement::ReadPairs(line, pairs)) return false;
-  const auto& [name, value] = pairs.front();
-  record.name = name;
-  record.properties.reserve(valueKeys.size() + pairs.size());
-  record.properties.emplace_back(Q::QVR_PROPERTY_NAME, name);
-  for (const StringBase* const key : valueKeys) record.properties.emplace_back(*key, value);
-  std::move(pairs.begin() + 1, pairs.end(), std::back_inserter(record.properties));
-  return true;
+// A record that its first pair names. That pair's value stands under each of the value keys, behind
+// the name and in front of the other pairs.
+QVRRecord MakeNamedByFirst(const QVRStatement::List& list,
+                           std::initializer_list<const StringBase*> valueKeys) {
+  const QVRStatement::Pair& first = list.pairs.front();
+  QVRRecord record{StringBase(first.key), {}, 0};
+  record.properties.reserve(valueKeys.size() + list.pairs.size());
+  record.properties.emplace_back(Q::QVR_PROPERTY_NAME, record.name);
+  for (const StringBase* const key : valueKeys) record.properties.emplace_back(*key, first.value);
+  for (std::size_t i = 1; i < list.pairs.size(); ++i) {
+    record.properties.emplace_back(list.pairs[i].key, list.pairs[i].value);
+  }
+  return record;
 }
 
-// Reads a record that the pair with that key names; the name stands in front of the pair. False
-// without such a pair, and for a second one behind a name that is not empty.
-bool ReadNamedByKey(std::string_view line, const StringBase& key, QVRRecord& record) {
-  PropertyList pairs;
-  if (!QVRStatement::ReadPairs(line, pairs)) return false;
-  bool found = false;
-  record.properties.reserve(pairs.size() + 1);
-  for (Property& pair : pairs) {
-    if (Matches(pair.first, key)) {
-      if (record.name.GetLength() > 0) return false;
-      found = true;
-      record.name = pair.second;
-      record.properties.emplace_back(Q::QVR_PROPERTY_NAME, pair.second);
+// A record that the pair with that key names; the name stands in front of the pair.
+QVRRecord MakeNamedByKey(const QVRStatement::List& list, const StringBase& key) {
+  QVRRecord record;
+  record.properties.reserve(list.pairs.size() + 1);
+  for (const QVRStatement::Pair& pair : list.pairs) {
+    Property property{StringBase(pair.key), StringBase(pair.value)};
+    if (Matches(property.first, key)) {
+      record.name = property.second;
+      record.properties.emplace_back(Q::QVR_PROPERTY_NAME, property.second);
     }
-    record.properties.push_back(std::move(pair));
+    record.properties.push_back(std::move(property));
   }
-  return found;
+  return record;
 }
 
 bool IsGeneric(const QVRRecord& parameter) {
@@ -215,11 +212,12 @@ StringList ListMembers(const Records& interfaces, const Kind& kind, const String
                        const Records& records) {
   Find(interfaces, kind, interface);
   StringList names;
-  for (const auto& [name, properties] : records) {
+  for (const QVRRecord& record : records) {
     const auto ties = [&](const Property& property) {
       return Ties(property, *kind.key, interface);
     };
-    if (std::any_of(properties.begin(), properties.end(), ties)) names.push_back(name);
+    const PropertyList& properties = record.properties;
+    if (std::any_of(properties.begin(), properties.end(), ties)) names.push_back(record.name);
   }
   return names;
 }
@@ -230,17 +228,19 @@ QVRParser::QVRParser(const Kel_Index& index, const Kel_Key& key)
     : QVRParser(
           Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_QVR_EXTENSION)) {}
 
-QVRParser::QVRParser(const Port::FileName& file) {
-  const StringBase name = file.GetName();
-  TARVO_TRACE("  Parsing QVR File %s\n", name);
+QVRParser::QVRParser(const Port::FileName& file) : fileName(file.GetName()) {
+  TARVO_TRACE("  Parsing QVR File %s\n", fileName);
+  Port_Input input(fileName);
   FileScanner lines(file);
   std::string_view line;
   for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
-    const std::string_view keyword = FirstWord(line);
-    if (ReadStatement(keyword, line)) continue;
-    kModule.Error("QVR unparsable %s: %s line %d, %s\n", StringBase(keyword), name, lineNumber,
-                  StringBase(line));
-    throw Report::Exception(AppException::Failure, "Invalid QVR %s\n", name);
+    input.AtLine(lineNumber);
+    LineFault fault;
+    if (ReadStatement(line, lineNumber, fault)) continue;
+    Diagnosis::Add([&] { return TellFault(Codes::kBadStatement, lines, fault); });
+    kModule.Error("QVR unparsable %s: %s line %d, %s\n", StringBase(FirstWord(line)), fileName,
+                  lineNumber, StringBase(line));
+    throw Report::Told(Report::Exception(AppException::Failure, "Invalid QVR %s\n", fileName));
   }
   TARVO_TRACE("  Parse successful\n");
 }
@@ -248,42 +248,50 @@ QVRParser::QVRParser(const Port::FileName& file) {
 QVRParser::~QVRParser() = default;
 
 // Any other line is no statement, and ignored.
-bool QVRParser::ReadStatement(std::string_view keyword, std::string_view line) {
-  if (keyword == "OPTION") return ReadOption(line);
-  if (keyword == "PARAMETER") return ReadParameter(line);
-  if (keyword == "BUS_INTERFACE") return ReadInterface(line, QVR_BUS_IF_NAME, busInterfaces);
-  if (keyword == "IO_INTERFACE") return ReadInterface(line, QVR_IO_IF_NAME, ioInterfaces);
-  if (keyword == "PORT") return ReadPort(line);
+bool QVRParser::ReadStatement(std::string_view line, unsigned number, LineFault& fault) {
+  const QVRStatement::Keyword keyword = QVRStatement::KeywordOf(line);
+  if (keyword == QVRStatement::None) return true;
+  if (keyword == QVRStatement::Option) return ReadOption(line, number, fault);
+  QVRStatement::List list;
+  if (!QVRStatement::ReadList(line, list, fault)) return false;
+  switch (keyword) {
+    case QVRStatement::BusInterface:
+      return AddInterface(list, number, QVR_BUS_IF_NAME, busInterfaces, fault);
+    case QVRStatement::IoInterface:
+      return AddInterface(list, number, QVR_IO_IF_NAME, ioInterfaces, fault);
+    case QVRStatement::Port:
+      ports.push_back(MakeNamedByFirst(list, {&QVR_BUS_IF_ROLE_NAME}));
+      ports.back().line = number;
+      return true;
+    default:
+      AddParameter(list, number);
+      return true;
+  }
+}
+
+bool QVRParser::ReadOption(std::string_view line, unsigned number, LineFault& fault) {
+  QVRStatement::OptionText option;
+  const auto result =
+      QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option, fault);
+  if (result != QVRStatement::Read) return false;
+  options.push_back(QVRStatement::MakeOption(option));
+  optionLines.push_back(number);
   return true;
 }
 
-bool QVRParser::ReadOption(std::string_view line) {
-  Property option;
-  const bool read =
-      QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option) == QVRStatement::Read;
-  if (read) options.push_back(std::move(option));
-  return read;
-}
-
-bool QVRParser::ReadParameter(std::string_view line) {
-  QVRRecord record;
-  if (!ReadNamedByFirst(line, {&QVR_PROPERTY_VALUE, &QVR_PROPERTY_DEFAULT}, record)) return false;
+void QVRParser::AddParameter(const QVRStatement::List& list, unsigned number) {
+  QVRRecord record = MakeNamedByFirst(list, {&QVR_PROPERTY_VALUE, &QVR_PROPERTY_DEFAULT});
+  record.line = number;
   if (IsGeneric(record)) generics.push_back(record);
   parameters.push_back(std::move(record));
-  return true;
 }
 
-bool QVRParser::ReadPort(std::string_view line) {
-  QVRRecord record;
-  if (!ReadNamedByFirst(line, {&QVR_BUS_IF_ROLE_NAME}, record)) return false;
-  ports.push_back(std::move(record));
-  return true;
-}
-
-bool QVRParser::ReadInterface(std::string_view line, const StringBase& key, Records& interfaces) {
-  QVRRecord record;
-  if (!ReadNamedByKey(line, key, record)) return false;
-  interfaces.push_back(std::move(record));
+bool QVRParser::AddInterface(const QVRStatement::List& list, unsigned number, const StringBase& key,
+                             Records& interfaces, LineFault& fault) {
+  std::size_t position = 0;
+  if (!QVRStatement::FindName(list, key, position, fault)) return false;
+  interfaces.push_back(MakeNamedByKey(list, key));
+  interfaces.back().line = number;
   return true;
 }
 
@@ -363,6 +371,29 @@ StringList QVRParser::ListIoInterfaceParameters(const StringBase& interface) con
 
 StringList QVRParser::ListIoInterfacePorts(const StringBase& interface) const {
   return ListMembers(ioInterfaces, kIoInterface, interface, ports);
+}
+
+std::vector<KelStatement> QVRParser::GetStatements() const {
+  std::vector<KelStatement> statements;
+  const auto add = [&](KelStatement::Kind kind, const StringBase& name, unsigned line) {
+    statements.push_back({kind, name, {fileName, line, 0, 0}});
+  };
+  for (std::size_t i = 0; i < options.size(); ++i) {
+    add(KelStatement::Option, options[i].first, optionLines[i]);
+  }
+  const std::pair<KelStatement::Kind, const Records*> kinds[] = {
+      {KelStatement::Parameter, &parameters},
+      {KelStatement::Port, &ports},
+      {KelStatement::BusInterface, &busInterfaces},
+      {KelStatement::IoInterface, &ioInterfaces}};
+  for (const auto& [kind, records] : kinds) {
+    for (const QVRRecord& record : *records) add(kind, record.name, record.line);
+  }
+  std::sort(statements.begin(), statements.end(),
+            [](const KelStatement& left, const KelStatement& right) {
+              return left.place.line < right.place.line;
+            });
+  return statements;
 }
 
 void QVRParser::SetParameterProperty(const StringBase& parameter, const StringBase& property,

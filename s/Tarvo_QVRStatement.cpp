@@ -1,9 +1,11 @@
 #include "Tarvo_QVRStatement.h"
 
-#include <string_view>
+#include <algorithm>
+#include <iterator>
 #include <utility>
 
 #include "Tarvo_TokenReader.h"
+#include "Tarvo_Word.h"
 
 namespace Tarvo::QVRStatement {
 
@@ -13,25 +15,30 @@ const char* const kScannerDelimiters = " =:()[]\"'";
 
 namespace {
 
-// key "=" value, from the current token on; the current token is then the value's last one.
-bool ReadPair(TokenReader& tokens, Property& pair) {
-  if (!tokens.MoreTokens()) return false;
-  const std::string_view key = tokens.GetToken();
-  tokens.Step();
-  if (!tokens.MoreTokens() || tokens.GetToken() != "=") return false;
-  tokens.Step();
-  const TokenReader::Value value = tokens.ReadValue();
-  if (!value.whole) return false;
-  pair = Property(StringBase(key), StringBase(value.text));
-  return true;
+constexpr std::string_view kKeywords[] = {"OPTION", "PARAMETER", "BUS_INTERFACE", "IO_INTERFACE",
+                                          "PORT"};
+
+bool Refuse(TokenReader& tokens, const char* text, LineFault& fault) {
+  const bool isEnd = !tokens.MoreTokens();
+  if (isEnd) tokens.ReadValue();  // for the place alone
+  fault = {isEnd ? tokens.GetTried() : tokens.GetToken(), text};
+  return false;
 }
 
-// Goes to the next pair of the list, if one follows.
-bool NextPair(TokenReader& tokens) {
+// key "=" value, from the current token on; the current token is then the value's last one.
+bool ReadPair(TokenReader& tokens, Pair& pair, LineFault& fault) {
+  if (!tokens.MoreTokens()) return Refuse(tokens, "missing name", fault);
+  pair.key = tokens.GetToken();
   tokens.Step();
-  if (!tokens.MoreTokens() || tokens.GetToken() != ",") return false;
+  if (!tokens.MoreTokens() || tokens.GetToken() != "=") {
+    return Refuse(tokens, "missing '=' behind the name", fault);
+  }
   tokens.Step();
-  return tokens.MoreTokens();
+  if (!tokens.MoreTokens()) return Refuse(tokens, "missing value behind '='", fault);
+  const TokenReader::Value value = tokens.ReadValue();
+  pair.value = value.text;
+  if (!value.whole) fault = {tokens.GetTried(), "quote or bracket is not closed"};
+  return value.whole;
 }
 
 void PassKeyword(TokenReader& tokens) {
@@ -41,37 +48,75 @@ void PassKeyword(TokenReader& tokens) {
 
 }  // namespace
 
+StringList ListKeywords() {
+  StringList keywords;
+  for (const std::string_view keyword : kKeywords) keywords.emplace_back(keyword);
+  return keywords;
+}
+
+Keyword KeywordOf(std::string_view line) {
+  const auto* const found = std::find(std::begin(kKeywords), std::end(kKeywords), FirstWord(line));
+  if (found == std::end(kKeywords)) return None;
+  return static_cast<Keyword>(found - std::begin(kKeywords) + 1);
+}
+
 bool BeginsWith(std::string_view line, const StringBase& keyword, const char* delimiters) {
   if (!line.starts_with(keyword.View())) return false;
   const std::string_view behind = line.substr(keyword.GetLength(), 1);
   return behind.empty() || std::string_view(delimiters).find(behind) != std::string_view::npos;
 }
 
-Result ReadOption(std::string_view line, const char* delimiters, Property& option) {
+Result ReadOption(std::string_view line, const char* delimiters, OptionText& option,
+                  LineFault& fault) {
   TokenReader tokens(line, delimiters, TokenReader::WithGroups);
   PassKeyword(tokens);
   if (!tokens.MoreTokens()) return NamesNothing;
-  Property read;
-  if (!ReadPair(tokens, read)) return Unparsable;
+  if (!ReadPair(tokens, option.pair, fault)) return Unparsable;
   tokens.Step();
-  const std::string_view tail = tokens.GetRest();
-  read.second.Append(tail.data(), static_cast<unsigned>(tail.size()));
-  read.second.Trim(" \t", StringBase::TrimBoth);
-  option = std::move(read);
+  option.tail = tokens.GetRest();
   return Read;
 }
 
-bool ReadPairs(std::string_view line, PropertyList& pairs) {
+Property MakeOption(const OptionText& option) {
+  StringBase value(option.pair.value);
+  value.Append(option.tail.data(), static_cast<unsigned>(option.tail.size()));
+  value.Trim(" \t", StringBase::TrimBoth);
+  return Property(StringBase(option.pair.key), std::move(value));
+}
+
+bool ReadList(std::string_view line, List& list, LineFault& fault) {
   TokenReader tokens(line, kListDelimiters, TokenReader::WithGroups);
   PassKeyword(tokens);
-  PropertyList read;
-  do {
-    Property pair;
-    if (!ReadPair(tokens, pair)) return false;
-    read.push_back(std::move(pair));
-  } while (NextPair(tokens));
-  pairs = std::move(read);
-  return true;
+  list = List();
+  while (true) {
+    Pair pair;
+    if (!ReadPair(tokens, pair, fault)) return false;
+    list.pairs.push_back(pair);
+    tokens.Step();
+    if (!tokens.MoreTokens()) return true;
+    list.rest = tokens.GetRest();
+    if (tokens.GetToken() != ",") return true;
+    tokens.Step();
+    if (!tokens.MoreTokens()) return true;
+    list.rest = {};
+  }
+}
+
+bool FindName(const List& list, const StringBase& key, std::size_t& position, LineFault& fault) {
+  bool isNamed = false;
+  bool isFound = false;
+  for (std::size_t i = 0; i < list.pairs.size(); ++i) {
+    if (!Matches(StringBase(list.pairs[i].key), key)) continue;
+    if (isNamed) {
+      fault = {list.pairs[i].key, "the interface is named a second time"};
+      return false;
+    }
+    isFound = true;
+    isNamed = !list.pairs[i].value.empty();
+    position = i;
+  }
+  if (!isFound) fault = {list.pairs.front().key, "no pair names the interface"};
+  return isFound;
 }
 
 }  // namespace Tarvo::QVRStatement

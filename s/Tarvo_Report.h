@@ -8,6 +8,7 @@
 #include "Port_MsgManData.h"
 #include "Tarvo_AppException.h"
 #include "Tarvo_DebugMessenger.h"
+#include "Tarvo_Diagnosis.h"
 #include "Tarvo_Export.h"
 
 // Messages, exceptions and traces in one line each.
@@ -79,10 +80,11 @@ struct Module {
     IssueAt(Port_Message::Error, format.line, format.text, arguments...);
   }
 
-  // For a text that was made from a checked format.
+  // For a text that was made from a checked format. While a checker reads, nothing is issued.
   template <class... Arguments>
   void IssueAt(Port_Message::Severity severity, int line, const char* text,
                const Arguments&... arguments) const noexcept {
+    if (Diagnosis::GoesOn()) return;
     Port_MsgManData& message = Port_MsgManData::createObject("tarvomsg", file, line, revision);
     switch (severity) {
       case Port_Message::Warning:
@@ -98,17 +100,29 @@ struct Module {
   const char* revision;
 };
 
+// The same for a text.
 template <class... Arguments>
-StringBase Text(FormatFor<Arguments...> format, const Arguments&... arguments) {
-  return StringBase::doFormat(format.text, Raw(arguments)...);
+StringBase TextOf(const char* text, const Arguments&... arguments) {
+  return StringBase::doFormat(text, Raw(arguments)...);
 }
 
 #pragma GCC diagnostic pop
 
 template <class... Arguments>
+StringBase Text(FormatFor<Arguments...> format, const Arguments&... arguments) {
+  return TextOf(format.text, arguments...);
+}
+
+template <class... Arguments>
 AppException Exception(AppException::Level level, FormatFor<Arguments...> format,
                        const Arguments&... arguments) {
   return {level, Text<Arguments...>(format, arguments...)};
+}
+
+// The same for what was told already where it was found: by a message, a diagnostic, or both.
+inline AppException Told(AppException exception) {
+  exception.told = true;
+  return exception;
 }
 
 inline DebugMessenger& Logger() {

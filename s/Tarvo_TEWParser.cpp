@@ -4,40 +4,30 @@
 #include <string_view>
 #include <utility>
 
+#include "Port_Input.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_QVRParser.h"
 #include "Tarvo_Report.h"
-#include "Tarvo_TokenReader.h"
-#include "Tarvo_Word.h"
+#include "Tarvo_TEWLine.h"
+#include "Tarvo_TellFault.h"
+#include "Tarvo_TellUnknown.h"
 
 namespace Tarvo {
 
 using Port::FileName;
 
-// A table: a header that names parameters, and rows with a value for each of them and netlists.
-//
-//     MODE WIDTH FILES
-//     fast 32    a.edn, b.edn
-//     fast 64    OTHER_CORE:c.edn
-//
-// Values may be quoted. What stands behind FILES, and behind the last netlist, is ignored.
 namespace {
 
 constexpr Report::Module kModule{"s/Tarvo_TEWParser", "1.0"};
 
-const char* const kDelimiters = " ,\"'";
-const char* const kEndOfHeader = "FILES";
-
-TokenReader Cut(std::string_view line) {
-  return TokenReader(line, kDelimiters, TokenReader::WithoutGroups);
-}
-
-// Goes behind a comma that something follows. False at the end of a row's netlists.
-bool NextFile(TokenReader& tokens) {
-  if (!tokens.MoreTokens() || tokens.GetToken() != ",") return false;
-  tokens.Step();
-  return tokens.MoreTokens();
+// The first name that is no parameter, or null.
+const std::string_view* FindUnknown(const TEWLine::Header& header,
+                                    const std::unordered_set<StringBase>& parameters) {
+  for (const std::string_view& name : header.names) {
+    if (parameters.find(StringBase(name)) == parameters.end()) return &name;
+  }
+  return nullptr;
 }
 
 }  // namespace
@@ -47,85 +37,106 @@ TEWParser::TEWParser(const Kel_Index& theIndex, const Kel_Key& key, const QVRPar
           Kel_Index::GetDataFile(theIndex.GetIPLocation(key), key, Kel_Index::KEL_TEW_EXTENSION),
           theIndex, key, description) {}
 
-TEWParser::TEWParser(const FileName& tewFile, const Kel_Index& theIndex, const Kel_Key& key,
+TEWParser::TEWParser(const FileName& file, const Kel_Index& theIndex, const Kel_Key& key,
                      const QVRParser* description)
-    : index(theIndex), qvrParser(description) {
-  Parse(tewFile, key);
+    : index(theIndex), qvrParser(description), tewFile(file.GetName()) {
+  Parse(file, key);
 }
 
 TEWParser::~TEWParser() = default;
 
 // A line that fails as the header leaves its turn to the next one; a bad row ends all reading.
-void TEWParser::Parse(const FileName& tewFile, const Kel_Key& key) {
-  const StringBase name = tewFile.GetName();
+void TEWParser::Parse(const FileName& file, const Kel_Key& key) {
   TARVO_TRACE("  Parsing TEW File for %s\n", key.GetKey());
-  FileScanner lines(tewFile);
-  const StringList names = qvrParser ? qvrParser->ListParameters() : StringList();
-  const NameSet parameterNames(names.begin(), names.end());
+  Port_Input input(tewFile);
+  FileScanner lines(file);
+  const StringList names = ListParameters();
+  const NameSet parameters(names.begin(), names.end());
   std::string_view line;
   unsigned lineNumber = 0;
-  Result result = StatesNothing;
-  while (result != Read && lines.GetNextLine(line, lineNumber)) {
-    result = ParseHeader(line, parameterNames);
-    if (result != Unparsable) continue;
-    kModule.Error("TEW unparsable header: %s line %d, %s\n", name, lineNumber, StringBase(line));
+  bool ok = false;
+  while (!ok && lines.GetNextLine(line, lineNumber)) {
+    input.AtLine(lineNumber);
+    ok = ParseHeader(lines, line, parameters);
   }
-  while (result == Read && lines.GetNextLine(line, lineNumber)) {
-    if (!line.empty()) result = ParseFileEntry(line, key);
-    if (result != Unparsable) continue;
-    throw Report::Exception(AppException::Failure, "TEW unparsable file entry: %s line %d, %s\n",
-                            name, lineNumber, StringBase(line));
+  const bool hasHeader = ok;
+  while (ok && lines.GetNextLine(line, lineNumber)) {
+    input.AtLine(lineNumber);
+    if (!line.empty()) ok = ParseRow(lines, line, key);
   }
-  if (result != Read) throw Report::Exception(AppException::Failure, "Invalid TEW %s\n", name);
+  if (!ok) {
+    if (!hasHeader) TellMissingHeader();
+    throw Report::Told(Report::Exception(AppException::Failure, "Invalid TEW %s\n", tewFile));
+  }
   TARVO_TRACE("  Parse successful\n");
 }
 
-// The names of a line that turns out to be no header stay.
-TEWParser::Result TEWParser::ParseHeader(std::string_view line, const NameSet& parameterNames) {
-  TokenReader tokens = Cut(line);
-  std::string_view field;
-  if (!tokens.ReadField(field)) return StatesNothing;
-  for (StringBase name(field); !Matches(name, kEndOfHeader); name = StringBase(field)) {
-    if (parameterNames.find(name) == parameterNames.end()) return Unparsable;
-    headerNames.push_back(std::move(name));
-    if (!tokens.ReadField(field)) return Unparsable;
-  }
-  return Read;
+void TEWParser::TellMissingHeader() const {
+  Diagnosis::Add([&] {
+    return Diagnosis::Of(Codes::kBadHeader, tewFile, "no line is a header that ends in FILES");
+  });
 }
 
-// A comma between values is a value itself.
-TEWParser::Result TEWParser::ParseFileEntry(std::string_view line, const Kel_Key& key) {
-  TokenReader tokens = Cut(line);
-  std::string_view field;
-  if (!tokens.ReadField(field)) return StatesNothing;
-  Row row;
-  while (row.values.size() < headerNames.size()) {
-    row.values.emplace_back(field);
-    if (!tokens.ReadField(field)) return Unparsable;
+// The names of a line that turns out to be no header stay.
+bool TEWParser::ParseHeader(const FileScanner& lines, std::string_view line,
+                            const NameSet& parameters) {
+  TEWLine::Header header;
+  LineFault fault;
+  if (!TEWLine::ReadHeader(line, header, fault)) return false;
+  const std::string_view* const unknown = FindUnknown(header, parameters);
+  for (const std::string_view& name : header.names) {
+    if (&name == unknown) break;
+    headerNames.emplace_back(name);
   }
-  row.netlists.push_back(MakeNetlist(field, key));
-  while (NextFile(tokens)) {
-    if (!tokens.ReadField(field)) return Unparsable;
-    row.netlists.push_back(MakeNetlist(field, key));
+  if (header.isEnded && !unknown) return true;
+  Diagnosis::Add([&] {
+    return unknown ? TellUnknownParameter(lines, *unknown, ListParameters())
+                   : TellFault(Codes::kBadHeader, lines, fault);
+  });
+  kModule.Error("TEW unparsable header: %s line %d, %s\n", tewFile,
+                Port_Input::GetCurrent()->GetLine(), StringBase(line));
+  return false;
+}
+
+// False for a line that states nothing, which ends all reading as well.
+bool TEWParser::ParseRow(const FileScanner& lines, std::string_view line, const Kel_Key& key) {
+  TEWLine::Row text;
+  LineFault fault;
+  const TEWLine::Result result = TEWLine::ReadRow(line, headerNames.size(), text, fault);
+  const unsigned number = Port_Input::GetCurrent()->GetLine();
+  Row row{{}, {}, StringBase(text.rest), number};
+  for (const std::string_view value : text.values) row.values.emplace_back(value);
+  for (const std::string_view netlist : text.netlists) {
+    row.netlists.push_back(MakeNetlist(lines, netlist, key));
   }
   rows.push_back(std::move(row));
-  return Read;
+  if (result == TEWLine::Read) return true;
+  Diagnosis::Add([&] { return TellFault(Codes::kBadRow, lines, fault); });
+  if (result == TEWLine::StatesNothing) return false;
+  throw Report::Told(Report::Exception(AppException::Failure,
+                                       "TEW unparsable file entry: %s line %d, %s\n", tewFile,
+                                       number, StringBase(line)));
 }
 
-// Reads NAME, or LIBRARY:NAME, cut at the first colon.
-TEWParser::Netlist TEWParser::MakeNetlist(std::string_view name, const Kel_Key& key) const {
-  std::string_view library = key.GetKey().View();
-  const std::size_t colon = name.find(':');
-  if (colon != std::string_view::npos) {
-    library = name.substr(0, colon);
-    name.remove_prefix(colon + 1);
+TEWParser::Netlist TEWParser::MakeNetlist(const FileScanner& lines, std::string_view text,
+                                          const Kel_Key& key) const {
+  const TEWLine::Netlist split = TEWLine::SplitNetlist(text);
+  const std::string_view library = split.hasLibrary ? split.library : key.GetKey().View();
+  try {
+    Netlist netlist{index.GetIPKey(Kel_Key(StringBase(library))), {}};
+    netlist.location = index.GetIPLocation(netlist.library);
+    netlist.location.PushPathEnd(Kel_Index::KEL_NETLIST_SUBDIRECTORY);
+    netlist.location.SetTail(StringBase(split.name));
+    return netlist;
+  } catch (AppException& exception) {
+    Diagnosis::Add(
+        [&] { return TellUnknownLibrary(lines, index, split.hasLibrary ? split.library : text); });
+    throw Report::Told(exception);
   }
-  Netlist netlist;
-  netlist.library = index.GetIPKey(Kel_Key(StringBase(library)));
-  netlist.location = index.GetIPLocation(netlist.library);
-  netlist.location.PushPathEnd(Kel_Index::KEL_NETLIST_SUBDIRECTORY);
-  netlist.location.SetTail(StringBase(name));
-  return netlist;
+}
+
+StringList TEWParser::ListParameters() const {
+  return qvrParser ? qvrParser->ListParameters() : StringList();
 }
 
 StringList TEWParser::GetParameterValues() const {
@@ -145,6 +156,20 @@ std::vector<const TEWParser::Netlist*> TEWParser::Select() const {
     for (const Netlist& netlist : row.netlists) selected.push_back(&netlist);
   }
   return selected;
+}
+
+KelNetlistTable TEWParser::GetTable() const {
+  const StringList current = GetParameterValues();
+  KelNetlistTable table{headerNames, {}};
+  for (const Row& row : rows) {
+    const bool applies = row.values == current;
+    KelNetlistRow described{row.values, {}, row.ignored, applies, {tewFile, row.line, 0, 0}};
+    for (const Netlist& netlist : row.netlists) {
+      described.netlists.push_back({netlist.location.GetAbsolutePath(), netlist.library});
+    }
+    table.rows.push_back(std::move(described));
+  }
+  return table;
 }
 
 StringList TEWParser::ListFiles() const {

@@ -28,8 +28,10 @@ void TokenReader::Step() {
 }
 
 TokenReader::Value TokenReader::ReadValue() {
+  tried = line.size();
   if (!MoreTokens()) return {{}, false};
   const std::string_view first = GetToken();
+  tried = PositionOf(first);
   if (first == "\"" || first == "'") return ReadQuoted();
   if (groups == WithGroups && first == "(") return ReadGroup(")");
   if (groups == WithGroups && first == "[") return ReadGroup("]");

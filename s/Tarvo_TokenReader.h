@@ -45,6 +45,10 @@ class TokenReader {
   // The line from the current token on; empty at its end.
   std::string_view GetRest() const;
 
+  // The line from the value on that was tried last: what is not closed, or, where there was none,
+  // the empty text at the line's end.
+  std::string_view GetTried() const { return line.substr(tried); }
+
   // Goes to the next token; at the end of the line it does nothing.
   void Step();
 
@@ -75,6 +79,7 @@ class TokenReader {
   Groups groups;
   Tokenizer tokenizer;
   Tokenizer::iterator token;
+  std::size_t tried = 0;
 };
 
 }  // namespace Tarvo

@@ -1,6 +1,8 @@
 #ifndef TARVO_WORD_H
 #define TARVO_WORD_H
 
+#include <string_view>
+
 #include "Tarvo_Export.h"
 
 namespace Tarvo {
@@ -8,7 +10,13 @@ namespace Tarvo {
 // How a word from a file is tested against a fixed word of its format: in either letter case. Names
 // that a file gives are compared exactly instead.
 inline bool Matches(const StringBase& text, const StringBase& word) noexcept {
-  return text.Compare(word, StringBase::CompareIgnoreCase) == 0;
+  return text.GetLength() == word.GetLength() &&
+         text.Compare(word, StringBase::CompareIgnoreCase) == 0;
+}
+
+// The same for a part of a line, of which no text is made unless it is as long as the word.
+inline bool Matches(std::string_view text, std::string_view word) {
+  return text.size() == word.size() && Matches(StringBase(text), StringBase(word));
 }
 
 }  // namespace Tarvo

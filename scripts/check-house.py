@@ -18,21 +18,29 @@ LONGEST_SOURCE = 600
 # path counts.
 RANKS = [
     (0, r"platform/.*"),
-    (0.5, r"include/Tarvo_Export\.h"),
-    (0.7, r"s/Tarvo_(Word|Existence)\.h"),
-    (1, r"s/Tarvo_(Report|PropertyList|TokenReader)\..*"),
-    (2, r"(include|s)/Tarvo_(Guard|Kel_Key|KelLibrary_Utils|FileScanner)\..*"),
-    (3, r"(include|s)/Tarvo_QVRStatement\..*"),
-    (3.5, r"s/Tarvo_OptionDefaults\.h"),
-    (4, r"(include|s)/Tarvo_OptionScanner\..*"),
-    (5, r"(include|s)/Tarvo_Kel_Index(_Candidate)?\..*"),
-    (6, r"(include|s)/Tarvo_QVRParser\..*"),
-    (7, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
-    (8, r"(include|s)/Tarvo_KelIP(_Catalogues)?\..*"),
-    (9, r"(include|s)/Tarvo_KelLibrary\..*"),
-    (9.5, r"s/Tarvo_Version\.cpp"),
-    (10, r"(tools|tests|bench|examples)/.*"),
-    (11, r"fuzz/.*"),
+    (1, r"include/Tarvo_Export\.h"),
+    (2, r"include/Tarvo_KelDiagnostic\.h"),
+    (2, r"s/Tarvo_(Word|Existence|LineFault|RangeText)\..*"),
+    (3, r"s/Tarvo_(DiagnosticCodes|PropertyNames)\.h"),
+    (4, r"s/Tarvo_Diagnosis\..*"),
+    (5, r"s/Tarvo_(Report|PropertyList|TokenReader)\..*"),
+    (6, r"(include|s)/Tarvo_(Kel_Key|KelLibrary_Utils|FileScanner)\..*"),
+    (7, r"(include|s)/Tarvo_(KelRecords|TellFault)\..*"),
+    (8, r"s/Tarvo_(Guard|QVRStatement|LDXEntry|TEWLine|OptionDefaults)\..*"),
+    (9, r"(include|s)/Tarvo_OptionScanner\..*"),
+    (10, r"(include|s)/Tarvo_Kel_Index\..*"),
+    (11, r"(include|s)/Tarvo_(QVRParser|AnalyseOrder|FileKey|TellUnknown)\..*"),
+    (12, r"s/Tarvo_(AnalyseOrderReader|LDXParser_Hdl)\.h"),
+    (13, r"s/Tarvo_SourceMaker\..*"),
+    (14, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
+    (15, r"(include|s)/Tarvo_KelIP(_Catalogues)?\..*"),
+    (16, r"(include|s)/Tarvo_KelLibrary\..*"),
+    (17, r"s/Tarvo_(DescriptionChecker|OrderChecker)\..*"),
+    (18, r"s/Tarvo_TableChecker\..*"),
+    (19, r"(include|s)/Tarvo_KelChecker\..*"),
+    (20, r"s/Tarvo_Version\.cpp"),
+    (21, r"(tools|tests|bench|examples)/.*"),
+    (22, r"fuzz/.*"),
 ]
 # What one of these may not include, whatever its rank.
 FORBIDDEN = [
@@ -50,8 +58,8 @@ def rank_of(path):
     """The rank and the module of a file, or None for one that the table does not know."""
     for rank, pattern in RANKS:
         if re.fullmatch(pattern, path):
-            stem = re.sub("_(Hdl|Catalogues|Candidate)$", "", pathlib.Path(path).stem)  # second sources
-            module = path.split("/")[0] if rank in (0, 10, 11) else stem
+            stem = re.sub("_(Hdl|Catalogues)$", "", pathlib.Path(path).stem)  # second sources
+            module = path.split("/")[0] if rank in (0, 21, 22) else stem
             return rank, module
     return None
 

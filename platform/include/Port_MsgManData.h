@@ -16,6 +16,11 @@ struct Port_Message {
   int line;              // line of the issuing statement in that file
   const char* revision;  // revision of that file
   const char* text;      // one line or several; each ends, and behind the last may be an empty one
+
+  // The file that was being read, and its line (see Port_Input). Empty and 0 if none was; the line
+  // alone is 0 if the file was not read line by line.
+  const char* inputFile;
+  unsigned inputLine;
 };
 
 // The message manager: one statement makes a message and issues it.

@@ -26,6 +26,9 @@ class PORT_EXPORT AppException : public std::runtime_error {
   const char* what() const noexcept override;
 
   Level level;
+  // Whether what went wrong has been told already, at the place where it was found: whoever catches
+  // this then only tells what follows from it.
+  bool told = false;
 };
 
 }  // namespace Tarvo

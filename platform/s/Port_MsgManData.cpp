@@ -11,6 +11,7 @@
 #include <utility>
 
 #include "Port_Channel.h"
+#include "Port_Input.h"
 
 namespace {
 
@@ -84,7 +85,10 @@ class Text {
 Port_MsgManData& Port_MsgManData::createObject(const char* domain, const char* file, int line,
                                                const char* revision) noexcept {
   thread_local Port_MsgManData object;
-  object.message = {Port_Message::Error, domain, file, line, revision, ""};
+  const Port_Input* const input = Port_Input::GetCurrent();
+  object.message = {
+      Port_Message::Error,         domain, file, line, revision, "", input ? input->GetFile() : "",
+      input ? input->GetLine() : 0};
   return object;
 }
 

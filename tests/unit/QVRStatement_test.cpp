@@ -21,9 +21,11 @@ std::string Dump(const PropertyList& properties) {
 
 std::string Option(const char* line, const char* delimiters) {
   if (!BeginsWith(line, "OPTION", delimiters)) return "ignored";
-  Property option;
-  const Result result = ReadOption(line, delimiters, option);
-  return result == Read ? Dump({option}) : result == NamesNothing ? "ignored" : "unparsable";
+  OptionText option;
+  LineFault fault;
+  const Result result = ReadOption(line, delimiters, option, fault);
+  if (result == Read) return Dump({MakeOption(option)});
+  return result == NamesNothing ? "ignored" : "unparsable";
 }
 
 // The rows in which the two readers differ are those with two results.
@@ -72,28 +74,36 @@ TEST(QVRStatement, ReadsOptions) {
   }
 }
 
+// The pairs, then what is left of the line, or what is wrong and where.
+std::string List(std::string_view line) {
+  QVRStatement::List list;
+  LineFault fault;
+  std::string text = ReadList(line, list, fault) ? "" : std::string(fault.text) + " at ";
+  if (fault.text) return text + std::to_string(fault.where.data() - line.data());
+  for (const Pair& pair : list.pairs) {
+    text.append("<").append(pair.key).append("=").append(pair.value).append(">");
+  }
+  return text.append(list.rest);
+}
+
 TEST(QVRStatement, ReadsPairs) {
   const char* const rows[][2] = {
       {"PORT a = 1", "<a=1>"},
-      {"PORT a = 1 b = 2", "<a=1>"},
-      {"PORT a = 1,", "<a=1>"},
-      {"PORT a = 1, b", "unparsable"},
-      {"PORT a = 1, b =", "unparsable"},
-      {"PORT a = , b = 2", "<a=,>"},
+      {"PORT a = 1 b = 2", "<a=1>b = 2"},
+      {"PORT a = 1,", "<a=1>,"},
+      {"PORT a = 1, b", "missing '=' behind the name at 13"},
+      {"PORT a = 1, b =", "missing value behind '=' at 15"},
+      {"PORT a = , b = 2", "<a=,>b = 2"},
       {"PORT a = 1,b=\"2, 3\" , c = 16:4", "<a=1><b=2, 3><c=16:4>"},
-      {"PARAMETER a = two words, b = 1", "<a=two>"},
+      {"PARAMETER a = two words, b = 1", "<a=two>words, b = 1"},
       {"PARAMETER a = (1, 2), b = [3, (4]", "<a=(1, 2)><b=[3, (4]>"},
       {"PARAMETER a = \"it's\", b = 'say \"x\"'", "<a=it's><b=say \"x\">"},
-      {"PARAMETER a = \"abc", "unparsable"},
+      {"PARAMETER a = \"abc", "quote or bracket is not closed at 14"},
       {"PARAMETER a = 1, , = 2", "<a=1><,=2>"},
-      {"PARAMETER", "unparsable"},
-      {"PARAMETER a", "unparsable"}};
-  for (const auto& [line, expected] : rows) {
-    PropertyList pairs = {{"old", "pair"}};
-    const bool read = ReadPairs(line, pairs);
-    EXPECT_EQ(Dump(pairs), read ? expected : "<old=pair>") << line;
-    EXPECT_EQ(read, std::string(expected) != "unparsable") << line;
-  }
+      {"PARAMETER", "missing name at 9"},
+      {"PARAMETER a", "missing '=' behind the name at 11"},
+      {"PARAMETER a b = 1", "missing '=' behind the name at 12"}};
+  for (const auto& [line, expected] : rows) EXPECT_EQ(List(line), expected) << line;
 }
 
 // Whatever the line: its tokens joined give it back, and reading values until it ends does end.

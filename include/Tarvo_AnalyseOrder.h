@@ -1,0 +1,128 @@
+#ifndef TARVO_ANALYSEORDER_H
+#define TARVO_ANALYSEORDER_H
+
+#include <cstddef>
+#include <memory>
+#include <string_view>
+#include <unordered_map>
+#include <vector>
+
+#include "Port_FileName.h"
+#include "Tarvo_Export.h"
+#include "Tarvo_Kel_Key.h"
+
+namespace Tarvo {
+
+// An analyse order (a compile order, as many say): the sources for synthesis and for simulation,
+// the Verilog include directories, and the cores that were taken in. A plain value that LDXParser
+// fills and answers from; callers ask that class.
+//
+// A source is known by a text, its file key: its library and its name below the language's
+// directory. It is made in two ways. An entry's source is looked up by the name as the entry writes
+// it; a source that comes from another core's order, and one that a caller asks for, by what its
+// location tells. Both give the same text but for odd names, such as one with a doubled slash: then
+// entry and location are keyed apart, and what is the same file counts as two.
+class AnalyseOrder {
+ public:
+  // What the sources of one entry after another mostly share.
+  struct Origin {
+    std::shared_ptr<const Kel_Key> library;
+    std::shared_ptr<const StringBase> file;  // that lists them
+    StringBase language;                     // as settled
+  };
+  // Where on its file an entry names what it adds.
+  struct Mark {
+    unsigned line;
+    unsigned column;
+    unsigned length;
+  };
+  struct Source {
+    std::shared_ptr<const Origin> origin;
+    Port::FileName location;
+    StringBase fileKey;   // by its location
+    StringBase entryKey;  // by its entry, if that is another text
+    Mark mark;
+  };
+  // Made once, and then handed from order to order.
+  using SourcePointer = std::shared_ptr<const Source>;
+  using SourcePointers = std::vector<SourcePointer>;
+
+  struct Library {
+    std::shared_ptr<const Kel_Key> key;
+    SourcePointers sources;
+  };
+
+  // The sources for one purpose, library by library. No library is without sources.
+  class SourceList {
+   public:
+    // Adds a source under the key of its entry. If that is there already, gives the source that has
+    // it, and nothing changes; else null.
+    const Source* Add(const SourcePointer& source);
+    // Adds the sources of another list, which is of no use afterwards, under the keys of their
+    // locations. Gives those whose keys were there.
+    SourcePointers Append(SourceList& other);
+    // The source with that file key, or null.
+    const Source* Find(const StringBase& fileKey) const;
+
+    std::vector<Library> libraries;
+
+   private:
+    void AppendSource(const SourcePointer& source);
+
+    // Views of the texts in keys and sources that the libraries hold.
+    std::unordered_map<std::string_view, std::size_t> libraryIndex;    // by the key's text
+    std::unordered_map<std::string_view, const Source*> sourcesByKey;  // by file key
+    bool isKeyedByLocation = true;  // whether all keys of sourcesByKey are those of locations
+  };
+
+  struct IncludeDirectory {
+    Kel_Key library;  // as the entry names it
+    Port::FileName location;
+    std::shared_ptr<const StringBase> file;
+    Mark mark;
+  };
+
+  // A core whose whole order an entry takes in.
+  struct Include {
+    StringBase library;  // as the entry names it
+    Kel_Key core;        // as the index has it
+    std::shared_ptr<const StringBase> file;
+    Mark mark;
+  };
+
+  // What stood in the lists already; null where the source is new or was not to be added.
+  struct Earlier {
+    const Source* synthesis = nullptr;
+    const Source* simulation = nullptr;
+  };
+  struct Known {
+    const SourcePointers& ForSimulation() const { return isParted ? simulation : synthesis; }
+
+    SourcePointers synthesis;
+    SourcePointers simulation;  // empty while the lists are the same
+    bool isParted = false;
+  };
+
+  Earlier Add(const SourcePointer& source, bool forSynthesis, bool forSimulation);
+  // Takes over the sources and include directories of another order. A library keeps the directory
+  // that it was given first.
+  Known Append(AnalyseOrder&& other);
+
+  const IncludeDirectory* FindIncludeDirectory(const Kel_Key& library) const;
+
+  const SourceList& GetSynthesis() const { return synthesis; }
+  const SourceList& GetSimulation() const { return simulation ? *simulation : synthesis; }
+
+  std::vector<IncludeDirectory> includeDirectories;
+  std::vector<Include> includes;  // of the core's own file, in the order of its lines
+
+ private:
+  void PartLists();
+
+  SourceList synthesis;
+  std::unique_ptr<SourceList> simulation;  // null while it is the same as for synthesis
+};
+
+}  // namespace Tarvo
+
+#endif

@@ -1,0 +1,379 @@
+#include "Tarvo_DescriptionChecker.h"
+
+#include <algorithm>
+#include <map>
+#include <set>
+#include <string>
+#include <string_view>
+#include <utility>
+
+#include "Port_Input.h"
+#include "Tarvo_FileScanner.h"
+#include "Tarvo_KelIP.h"
+#include "Tarvo_KelLibrary_Utils.h"
+#include "Tarvo_LDXParser.h"
+#include "Tarvo_OptionScanner.h"
+#include "Tarvo_PropertyNames.h"
+#include "Tarvo_QVRParser.h"
+#include "Tarvo_QVRStatement.h"
+#include "Tarvo_RangeText.h"
+#include "Tarvo_TellFault.h"
+#include "Tarvo_TellUnknown.h"
+#include "Tarvo_TokenReader.h"
+#include "Tarvo_Word.h"
+
+namespace Tarvo {
+
+namespace {
+
+using Diagnosis::At;
+using Diagnosis::Say;
+using QVRStatement::Pair;
+
+// A property or an option that takes a few values, in any letter case.
+struct Choice {
+  QVRStatement::Keyword keyword;
+  const char* key;
+  std::vector<const char*> values;
+  bool isOpen;  // it takes others too, and only what is nearly one of these is told
+};
+const Choice kChoices[] = {
+    {QVRStatement::Option, "STYLE", {"HDL", "BLACKBOX", "MIX"}, false},
+    {QVRStatement::Option, "HDL", {"VHDL", "Verilog", "MIXED", "BOTH"}, false},
+    {QVRStatement::Parameter, "TYPE", {"HDL", "NON_HDL"}, false},
+    {QVRStatement::Port, "DIR", {"I", "O", "IO"}, false},
+    {QVRStatement::Port, "ENDIAN", {"BIG", "LITTLE"}, false},
+    {QVRStatement::Port, "SIGIS", {"CLK", "RST", "INTERRUPT"}, true}};
+
+// What has a value in front of the stated ones, which hides them.
+StringList FixedKeys(QVRStatement::Keyword keyword) {
+  if (keyword == QVRStatement::Parameter) return {"NAME", "VALUE", "DEFAULT_VALUE"};
+  if (keyword == QVRStatement::Port) return {"NAME", "DEFAULT"};
+  if (keyword == QVRStatement::Option) return {"NAME", "VERSION"};
+  return {};
+}
+
+StringList KnownKeys(QVRStatement::Keyword keyword) {
+  switch (keyword) {
+    case QVRStatement::Parameter:
+      return PropertyNames::OfParameters();
+    case QVRStatement::Port:
+      return PropertyNames::OfPorts();
+    case QVRStatement::BusInterface:
+      return PropertyNames::OfBusInterfaces();
+    case QVRStatement::IoInterface:
+      return PropertyNames::OfIoInterfaces();
+    default:
+      return PropertyNames::OfCores();
+  }
+}
+
+std::string_view FirstOf(std::string_view text, const char* ends) {
+  return text.substr(0, std::max<std::size_t>(1, std::min(text.find_first_of(ends), text.size())));
+}
+
+StringBase Joined(const std::vector<const char*>& words) {
+  std::string text;
+  for (const char* const word : words) {
+    text += text.empty() ? "" : word == words.back() ? " or " : ", ";
+    text += word;
+  }
+  return StringBase(std::string_view(text));
+}
+
+class DescriptionChecker {
+ public:
+  explicit DescriptionChecker(const Port::FileName& file)
+      : name(file.GetName()), input(name), lines(file) {}
+
+  DescribedCore Check();
+
+ private:
+  using Text = std::string_view;
+
+  // What can be judged only when all is read: an interface or a parameter that is named somewhere.
+  struct Mention {
+    QVRStatement::Keyword declaredBy;
+    const KelDiagnosticCode* code;
+    StringBase name;
+    KelPlace place;
+    StringBase text;
+  };
+
+  void CheckLine(Text line);
+  void CheckKeyword(Text line);
+  bool CheckScanned(Text line);
+  void CheckOption(Text line);
+  void CheckList(QVRStatement::Keyword keyword, Text line);
+  void CheckEnd(const QVRStatement::List& list);
+  void CheckPairs(QVRStatement::Keyword keyword, const QVRStatement::List& list, std::size_t first);
+  void CheckKey(QVRStatement::Keyword keyword, const std::vector<Pair>& pairs, std::size_t at,
+                std::size_t first);
+  void CheckValue(QVRStatement::Keyword keyword, const Pair& pair);
+  void CheckVector(const Pair& pair);
+  void CheckInterfaces(QVRStatement::Keyword keyword, const Pair& pair);
+  bool Declare(QVRStatement::Keyword keyword, Text declared);
+  void AddParameter(const QVRStatement::List& list);
+  void TellMentions() const;
+
+  template <class... Rest>
+  void Tell(const KelDiagnosticCode& code, Text part, const StringBase& text,
+            const Rest&... hint) const {
+    Diagnosis::Add([&] { return At(code, SpanOf(lines, part), text, hint...); });
+  }
+
+  StringBase name;
+  Port_Input input;
+  FileScanner lines;
+  DescribedCore core;
+  std::map<std::pair<QVRStatement::Keyword, StringBase>, KelPlace> declarations;
+  std::vector<Mention> mentions;
+  std::set<QVRStatement::Keyword> bad;  // of which a statement could not be read
+};
+
+DescribedCore DescriptionChecker::Check() {
+  core.language = LDXParser::LDX_HDL_VHDL;
+  Text line;
+  for (unsigned number = 0; lines.GetNextLine(line, number);) {
+    input.AtLine(number);
+    if (!line.empty()) CheckLine(line);
+  }
+  TellMentions();
+  core.hasAllParameters = bad.count(QVRStatement::Parameter) == 0;
+  return std::move(core);
+}
+
+void DescriptionChecker::CheckLine(Text line) {
+  if (!CheckScanned(line)) return;
+  const QVRStatement::Keyword keyword = QVRStatement::KeywordOf(line);
+  if (keyword == QVRStatement::None) return CheckKeyword(line);
+  if (keyword == QVRStatement::Option) return CheckOption(line);
+  CheckList(keyword, line);
+}
+
+// A line that begins with no keyword is ignored. It may be meant for a statement all the same.
+void DescriptionChecker::CheckKeyword(Text line) {
+  const Text word = FirstOf(line, " =,:");
+  const StringList near =
+      KelLibrary_Utils::ListNear(StringBase(word), QVRStatement::ListKeywords());
+  if (near.empty()) return;
+  bad.insert(QVRStatement::KeywordOf(Say({near.front().View(), " "}).View()));
+  Tell(Codes::kUnknownKeyword, word, "unknown keyword, line ignored",
+       Say({"did you mean ", near.front().View(), "?"}));
+}
+
+// The reader of options takes some lines for options that the other one doesn't.
+bool DescriptionChecker::CheckScanned(Text line) {
+  using namespace QVRStatement;
+  if (!BeginsWith(line, OptionScanner::QVR_OPTION, kScannerDelimiters)) return true;
+  OptionText option;
+  LineFault fault;
+  const Result result = ReadOption(line, kScannerDelimiters, option, fault);
+  if (result == Unparsable) Tell(Codes::kBadStatement, fault.where, fault.text);
+  return result != Unparsable;
+}
+
+// The first of several values is the one that counts.
+void DescriptionChecker::CheckOption(Text line) {
+  QVRStatement::OptionText option;
+  LineFault fault;
+  const auto result =
+      QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option, fault);
+  if (result != QVRStatement::Read) return Tell(Codes::kBadStatement, fault.where, fault.text);
+  if (!Declare(QVRStatement::Option, option.pair.key)) return;
+  CheckKey(QVRStatement::Option, {option.pair}, 0, 1);
+  const Property stated = QVRStatement::MakeOption(option);
+  Pair whole = option.pair;
+  if (!option.tail.empty()) {
+    whole.value =
+        Text(whole.value.data(), static_cast<std::size_t>(line.end() - whole.value.begin()));
+  }
+  CheckValue(QVRStatement::Option, whole);
+  if (stated.first == KelIP::KEL_LANGUAGE_OPTION_NAME) core.language = stated.second;
+  if (stated.first != KelIP::KEL_STYLE_OPTION_NAME) return;
+  const bool isMix = Matches(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_MIX);
+  core.hasSources = isMix || Matches(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_HDL);
+  core.hasNetlists = isMix || Matches(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX);
+  core.isStyleKnown = core.hasSources || core.hasNetlists;
+}
+
+void DescriptionChecker::CheckList(QVRStatement::Keyword keyword, Text line) {
+  QVRStatement::List list;
+  LineFault fault;
+  const bool isBus = keyword == QVRStatement::BusInterface;
+  const bool isInterface = isBus || keyword == QVRStatement::IoInterface;
+  const StringBase& key = isBus ? QVRParser::QVR_BUS_IF_NAME : QVRParser::QVR_IO_IF_NAME;
+  std::size_t position = 0;
+  if (!QVRStatement::ReadList(line, list, fault) ||
+      (isInterface && !QVRStatement::FindName(list, key, position, fault))) {
+    bad.insert(keyword);
+    return Tell(Codes::kBadStatement, fault.where, fault.text);
+  }
+  Declare(keyword, isInterface ? list.pairs[position].value : list.pairs.front().key);
+  CheckPairs(keyword, list, isInterface ? 0 : 1);
+  CheckEnd(list);
+  if (keyword == QVRStatement::Parameter) AddParameter(list);
+}
+
+// A comma is missing in front of what looks like a pair. Anything else is the rest of a value that
+// has several words.
+void DescriptionChecker::CheckEnd(const QVRStatement::List& list) {
+  if (list.rest.empty()) return;
+  if (list.rest == ",") {
+    return Tell(Codes::kTrailingComma, list.rest,
+                "the statement ends in a comma, and does not go on in the next line",
+                "take the comma away");
+  }
+  const Text word = FirstOf(list.rest, " ,=()[]\"'");
+  const Text behind = list.rest.substr(word.size());
+  const std::size_t next = behind.find_first_not_of(' ');
+  const bool isPair = next != Text::npos && behind[next] == '=';
+  const Pair& last = list.pairs.back();
+  const Text written(last.key.data(), static_cast<std::size_t>(list.rest.data() - last.key.data()));
+  const Text trimmed = written.substr(0, written.find_last_not_of(' ') + 1);
+  if (isPair) {
+    return Tell(Codes::kListEnds, word,
+                Say({"missing ',' before ", word, "; the rest of the line is ignored"}),
+                Say({"write ", trimmed, ", ", list.rest}));
+  }
+  Tell(Codes::kListEnds, word,
+       Say({"the list ends before ", word, "; the rest of the line is ignored"}),
+       "put a value of several words in quotes");
+}
+
+void DescriptionChecker::CheckPairs(QVRStatement::Keyword keyword, const QVRStatement::List& list,
+                                    std::size_t first) {
+  for (std::size_t i = first; i < list.pairs.size(); ++i) {
+    CheckKey(keyword, list.pairs, i, first);
+    CheckValue(keyword, list.pairs[i]);
+    const bool isMember = keyword == QVRStatement::Parameter || keyword == QVRStatement::Port;
+    if (isMember) CheckInterfaces(keyword, list.pairs[i]);
+  }
+}
+
+// A key that stands twice, or that is nearly one that means something.
+void DescriptionChecker::CheckKey(QVRStatement::Keyword keyword, const std::vector<Pair>& pairs,
+                                  std::size_t at, std::size_t first) {
+  const Text key = pairs[at].key;
+  const StringList fixed = FixedKeys(keyword);
+  if (std::find(fixed.begin(), fixed.end(), StringBase(key)) != fixed.end()) {
+    return Tell(Codes::kDuplicateName, key,
+                Say({key, " has a value already, so this one is never asked"}));
+  }
+  for (std::size_t i = first; i < at; ++i) {
+    if (pairs[i].key != key) continue;
+    return Diagnosis::Add([&] {
+      return Diagnosis::With(At(Codes::kDuplicateName, SpanOf(lines, key),
+                                Say({key, " is given already; the first one counts"})),
+                             Diagnosis::Here(SpanOf(lines, pairs[i].key)), "first given here");
+    });
+  }
+  const StringBase meant = FindMisspelt(key, KnownKeys(keyword));
+  if (meant.GetLength() == 0) return;
+  const char* const kind = keyword == QVRStatement::Option ? "option " : "property ";
+  Tell(Codes::kUnknownProperty, key, Say({"unknown ", kind, key}),
+       Say({"did you mean ", meant.View(), "?"}));
+}
+
+void DescriptionChecker::CheckValue(QVRStatement::Keyword keyword, const Pair& pair) {
+  if (keyword == QVRStatement::Port && pair.key == QVRParser::QVR_PORT_VEC.View()) {
+    return CheckVector(pair);
+  }
+  if (keyword == QVRStatement::Parameter && pair.key == "RANGE" && !pair.value.empty() &&
+      !ReadRange(pair.value)) {
+    return Tell(Codes::kBadRange, pair.value, Say({"range can't be read: ", pair.value}),
+                "write (LOW:HIGH), or values with commas between");
+  }
+  const StringBase value(pair.value);
+  for (const Choice& choice : kChoices) {
+    if (choice.keyword != keyword || pair.key != choice.key) continue;
+    const auto fits = [&](const char* known) { return Matches(value, known); };
+    if (std::any_of(choice.values.begin(), choice.values.end(), fits)) return;
+    const StringBase meant =
+        FindMisspelt(pair.value, StringList(choice.values.begin(), choice.values.end()));
+    if (choice.isOpen && meant.GetLength() == 0) return;
+    Tell(Codes::kBadValue, pair.value, Say({"unknown ", pair.key, ": ", pair.value}),
+         meant.GetLength() > 0 ? Say({"did you mean ", meant.View(), "?"})
+                               : Say({"it is ", Joined(choice.values).View()}));
+  }
+}
+
+// An empty one is a port of one bit.
+void DescriptionChecker::CheckVector(const Pair& pair) {
+  if (pair.value.empty()) return;
+  const auto range = ReadVector(pair.value);
+  if (!range) {
+    return Tell(Codes::kBadRange, pair.value, Say({"range can't be read: ", pair.value}),
+                "write [LEFT:RIGHT]");
+  }
+  for (const Text used : range->names) {
+    mentions.push_back({QVRStatement::Parameter, &Codes::kBadRange, StringBase(used),
+                        Diagnosis::Here(SpanOf(lines, used)),
+                        Say({"the core has no parameter ", used})});
+  }
+}
+
+void DescriptionChecker::CheckInterfaces(QVRStatement::Keyword keyword, const Pair& pair) {
+  const bool isBus = pair.key == QVRParser::QVR_BUS_IF_NAME.View();
+  if (!isBus && pair.key != QVRParser::QVR_IO_IF_NAME.View()) return;
+  const char* const what = keyword == QVRStatement::Port ? "port" : "parameter";
+  const char* const kind = isBus ? "bus interface " : "I/O interface ";
+  for (Text rest = pair.value; !rest.empty();) {
+    const Text piece = rest.substr(0, rest.find(':'));
+    rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
+    if (piece.empty()) continue;
+    mentions.push_back({isBus ? QVRStatement::BusInterface : QVRStatement::IoInterface,
+                        &Codes::kUndeclaredInterface, StringBase(piece),
+                        Diagnosis::Here(SpanOf(lines, piece)),
+                        Say({what, " of a ", kind, "that is not declared: ", piece})});
+  }
+}
+
+// False for a name that is declared already.
+bool DescriptionChecker::Declare(QVRStatement::Keyword keyword, Text declared) {
+  const KelPlace place = Diagnosis::Here(SpanOf(lines, declared));
+  const auto [known, isNew] = declarations.try_emplace({keyword, StringBase(declared)}, place);
+  if (isNew) return true;
+  Diagnosis::Add([&, first = known->second] {
+    return Diagnosis::With(At(Codes::kDuplicateName, SpanOf(lines, declared),
+                              Say({QVRStatement::ListKeywords()[keyword - 1].View(), " ", declared,
+                                   " is declared already; the first one counts"})),
+                           first, "first declared here");
+  });
+  return false;
+}
+
+void DescriptionChecker::AddParameter(const QVRStatement::List& list) {
+  DescribedParameter parameter{StringBase(list.pairs.front().key), {}, {}};
+  for (std::size_t i = list.pairs.size() - 1; i > 0; --i) {
+    if (list.pairs[i].key == "RANGE") parameter.range = StringBase(list.pairs[i].value);
+    if (list.pairs[i].key == "VALUES") parameter.values = StringBase(list.pairs[i].value);
+  }
+  core.parameters.push_back(std::move(parameter));
+}
+
+// A bad statement may be the one that declares what is missing.
+void DescriptionChecker::TellMentions() const {
+  for (const Mention& mention : mentions) {
+    const bool isDeclared = declarations.count({mention.declaredBy, mention.name}) > 0;
+    if (isDeclared || bad.count(mention.declaredBy) > 0) continue;
+    StringList declared;
+    for (const auto& [key, place] : declarations) {
+      if (key.first == mention.declaredBy) declared.push_back(key.second);
+    }
+    Diagnosis::Add([&] {
+      KelDiagnostic told =
+          At(*mention.code, {}, mention.text, DidYouMean(mention.name.View(), declared));
+      told.place = mention.place;
+      return told;
+    });
+  }
+}
+
+}  // namespace
+
+DescribedCore CheckDescription(const Port::FileName& file) {
+  return DescriptionChecker(file).Check();
+}
+
+}  // namespace Tarvo

@@ -1,0 +1,75 @@
+#include "Tarvo_FileKey.h"
+
+#include <algorithm>
+#include <string_view>
+
+#include "Tarvo_Kel_Index.h"
+
+namespace Tarvo::FileKey {
+
+namespace {
+
+const char* const kBetweenLibraryAndFile = " ";
+
+// Takes the last level off a path; empty if there is none.
+std::string_view PopLevel(std::string_view& path) {
+  while (!path.empty() && path.back() == '/') path.remove_suffix(1);
+  const std::size_t slash = path.rfind('/');
+  const std::size_t start = slash == std::string_view::npos ? 0 : slash + 1;
+  const std::string_view level = path.substr(start);
+  path = path.substr(0, start);
+  return level;
+}
+
+bool IsLanguageDirectory(std::string_view level) {
+  return level == Kel_Index::KEL_VHDL_SUBDIRECTORY.View() ||
+         level == Kel_Index::KEL_VERILOG_SUBDIRECTORY.View();
+}
+
+// Appends the levels of a path, each with one separator behind it.
+void AppendLevels(StringBase& text, std::string_view path) {
+  while (!path.empty()) {
+    const std::size_t end = std::min(path.find('/'), path.size());
+    text.Append(path.data(), static_cast<unsigned>(end));
+    if (end > 0) text.Append("/");
+    path.remove_prefix(std::min(end + 1, path.size()));
+  }
+}
+
+void AppendExtension(StringBase& name, const StringBase& extension) {
+  if (extension.GetLength() == 0) return;
+  name.Append(".");
+  name.Append(extension);
+}
+
+}  // namespace
+
+StringBase OfLocation(const Port::FileName& location) {
+  const StringBase directory = location.GetPath();
+  std::string_view rest = directory.View();
+  std::size_t behindLanguage = rest.size();
+  std::string_view level = PopLevel(rest);
+  for (; !level.empty() && !IsLanguageDirectory(level); level = PopLevel(rest)) {
+    behindLanguage = rest.size();
+  }
+  StringBase fileKey;
+  if (!level.empty()) {
+    PopLevel(rest);
+    fileKey = StringBase(PopLevel(rest));
+    fileKey.Append(kBetweenLibraryAndFile);
+  }
+  AppendLevels(fileKey, directory.View().substr(behindLanguage));
+  fileKey.Append(location.GetTail());
+  return fileKey;
+}
+
+StringBase OfEntry(const Kel_Key& library, const StringBase& file,
+                   const StringBase& missingExtension) {
+  StringBase fileKey = library.GetKey();
+  fileKey.Append(kBetweenLibraryAndFile);
+  fileKey.Append(file.GetText());  // up to a NUL byte, where its name on disk ends too
+  AppendExtension(fileKey, missingExtension);
+  return fileKey;
+}
+
+}  // namespace Tarvo::FileKey

@@ -1,0 +1,251 @@
+#include "Tarvo_KelChecker.h"
+
+#include <algorithm>
+#include <boost/filesystem.hpp>
+#include <iterator>
+#include <new>
+#include <set>
+#include <tuple>
+#include <utility>
+
+#include "Tarvo_AppException.h"
+#include "Tarvo_DescriptionChecker.h"
+#include "Tarvo_Diagnosis.h"
+#include "Tarvo_Existence.h"
+#include "Tarvo_KelLibrary.h"
+#include "Tarvo_Kel_Index.h"
+#include "Tarvo_Kel_Key.h"
+#include "Tarvo_OrderChecker.h"
+#include "Tarvo_TableChecker.h"
+
+namespace Tarvo {
+
+using Diagnosis::Say;
+using Port::FileName;
+
+namespace {
+
+namespace fs = boost::filesystem;
+
+const char* const kVersionsSubdirectory = "ipmods";
+
+auto Rank(const KelDiagnostic& diagnostic) {
+  const KelPlace& place = diagnostic.place;
+  return std::tie(place.file, place.line, place.column, diagnostic.code, diagnostic.text);
+}
+
+bool IsError(const KelDiagnostic& diagnostic) {
+  return diagnostic.severity == KelDiagnostic::Error;
+}
+
+FileName DirectoryOf(const fs::path& path) {
+  FileName directory;
+  directory.SetHead(path.c_str());
+  return directory;
+}
+
+void TellFile(const KelDiagnosticCode& code, const StringBase& file, const StringBase& text) {
+  Diagnosis::Add([&] { return Diagnosis::Of(code, file, text); });
+}
+
+// Gives `visit` each entry of a directory. One that is not there has none; one that can't be read
+// is told.
+template <class Visit>
+void ForEachEntry(const fs::path& directory, const Visit& visit) {
+  boost::system::error_code error;
+  fs::directory_iterator entry(directory, error);
+  for (; !error && entry != fs::directory_iterator(); entry.increment(error)) visit(*entry);
+  if (!error || error == boost::system::errc::no_such_file_or_directory) return;
+  TellFile(Codes::kUnreadable, directory.c_str(), Say({"can't be read: ", error.message()}));
+}
+
+// One call of a checker.
+class CheckRun {
+ public:
+  explicit CheckRun(const KelLibrary& theLibrary)
+      : library(theLibrary), index(library.GetIndex()), orders(index) {}
+
+  void CheckCores(const StringList& keys, const KelChecker::Progress& progress);
+  void CheckRepositories();
+  void FindUnlisted(const StringList& keys);
+  std::vector<KelDiagnostic> Finish();
+
+ private:
+  void CheckCore(const StringBase& text);
+  DescribedCore CheckDescriptionOf(const FileName& file);
+  void CheckNetlists(const FileName& file, const Kel_Key& key, const DescribedCore& core);
+  void CheckRepository(const fs::path& versions);
+  void FindUnlistedIn(const fs::path& directory, const std::set<std::string>& extensions);
+
+  const KelLibrary& library;
+  const Kel_Index& index;
+  DiagnosticCollector collector{DiagnosticCollector::InsteadOfMessages};
+  OrderChecker orders;
+  std::set<StringBase> faulty;  // keys of cores with errors
+};
+
+void CheckRun::CheckCores(const StringList& keys, const KelChecker::Progress& progress) {
+  std::size_t done = 0;
+  for (const StringBase& key : keys) {
+    const std::size_t before = collector.found.size();
+    CheckCore(key);
+    if (std::any_of(collector.found.begin() + static_cast<std::ptrdiff_t>(before),
+                    collector.found.end(), IsError)) {
+      faulty.insert(key);
+    }
+    if (progress) progress(++done, keys.size());
+  }
+  orders.CheckVersions();
+}
+
+// Files that the style calls for must be there. Where the style is not known, those that are there
+// are checked.
+void CheckRun::CheckCore(const StringBase& text) {
+  Kel_Key key;
+  FileName location;
+  try {
+    key = index.GetIPKey(Kel_Key(text));
+    location = index.GetIPLocation(key);
+  } catch (const AppException&) {
+    return TellFile(Codes::kUnknownLibrary, "", Say({"there is no core ", text.View()}));
+  }
+  const auto file = [&](const StringBase& extension) {
+    return Kel_Index::GetDataFile(location, key, extension);
+  };
+  const DescribedCore core = CheckDescriptionOf(file(Kel_Index::KEL_QVR_EXTENSION));
+  const auto check = [&](const KelDiagnosticCode& missing, const FileName& name, bool isNeeded,
+                         const auto& checkFile) {
+    if (core.isStyleKnown && !isNeeded) return;
+    if (MayExist(name)) return checkFile(name);
+    if (core.isStyleKnown) TellFile(missing, name.GetName(), "does not exist");
+  };
+  check(Codes::kMissingOrder, file(Kel_Index::KEL_LDX_EXTENSION), core.hasSources,
+        [&](const FileName& name) { orders.Check(name, key, core.language); });
+  check(Codes::kMissingTable, file(Kel_Index::KEL_TEW_EXTENSION), core.hasNetlists,
+        [&](const FileName& name) { CheckNetlists(name, key, core); });
+}
+
+DescribedCore CheckRun::CheckDescriptionOf(const FileName& file) {
+  DescribedCore unknown;
+  unknown.isStyleKnown = false;
+  if (!MayExist(file)) {
+    TellFile(Codes::kMissingDescription, file.GetName(), "does not exist");
+    return unknown;
+  }
+  try {
+    return CheckDescription(file);
+  } catch (const AppException&) {  // told as it could not be read
+    return unknown;
+  }
+}
+
+void CheckRun::CheckNetlists(const FileName& file, const Kel_Key& key, const DescribedCore& core) {
+  try {
+    for (const ListedFile& netlist : CheckTable(file, index, key, core)) {
+      if (orders.IsThere(netlist.location)) continue;
+      Diagnosis::Add([&] {
+        KelDiagnostic told =
+            Diagnosis::At(Codes::kMissingNetlist, {},
+                          Say({"netlist does not exist: ", netlist.location.GetName().View()}));
+        told.place = netlist.place;
+        return told;
+      });
+    }
+  } catch (const AppException&) {  // told as it could not be read
+    return;
+  }
+}
+
+void CheckRun::CheckRepositories() {
+  for (const StringBase& repository : library.GetRepositories()) {
+    const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
+    boost::system::error_code error;
+    if (fs::is_directory(versions, error)) {
+      CheckRepository(versions);
+    } else {
+      TellFile(Codes::kNotARepository, repository, "has no directory ipmods");
+    }
+  }
+}
+
+void CheckRun::CheckRepository(const fs::path& versions) {
+  ForEachEntry(versions, [&](const fs::directory_entry& entry) {
+    const Kel_Key key(StringBase(entry.path().filename().c_str()));
+    if (key.IsValid() || !IsDirectory(DirectoryOf(entry.path() / "data"))) return;
+    TellFile(Codes::kNotAKey, entry.path().c_str(),
+             "is no core, since its name is no key such as abc_v1_00_a");
+  });
+}
+
+// What a core with errors has, it may be meant to list.
+void CheckRun::FindUnlisted(const StringList& keys) {
+  for (const StringBase& text : keys) {
+    if (faulty.count(text) > 0) continue;
+    const fs::path location = index.GetIPLocation(Kel_Key(text)).GetName().GetText();
+    const fs::path hdl = location / Kel_Index::KEL_HDL_SUBDIRECTORY.GetText();
+    FindUnlistedIn(hdl / Kel_Index::KEL_VHDL_SUBDIRECTORY.GetText(), {".vhd", ".vhdl"});
+    FindUnlistedIn(hdl / Kel_Index::KEL_VERILOG_SUBDIRECTORY.GetText(), {".v"});
+    FindUnlistedIn(location / Kel_Index::KEL_NETLIST_SUBDIRECTORY.GetText(), {});
+  }
+}
+
+// Without extensions, any file counts. Links to directories are not followed.
+void CheckRun::FindUnlistedIn(const fs::path& directory, const std::set<std::string>& extensions) {
+  if (orders.IsIncludeDirectory(DirectoryOf(directory))) return;
+  ForEachEntry(directory, [&](const fs::directory_entry& entry) {
+    boost::system::error_code error;
+    const fs::path& path = entry.path();
+    if (entry.symlink_status(error).type() == fs::directory_file) {
+      return FindUnlistedIn(path, extensions);
+    }
+    if (!extensions.empty() && extensions.count(path.extension().string()) == 0) return;
+    if (orders.IsListed(FileName(path.c_str()))) return;
+    TellFile(Codes::kUnlistedFile, path.c_str(), "nothing lists this file");
+  });
+}
+
+std::vector<KelDiagnostic> CheckRun::Finish() {
+  if (collector.isIncomplete) throw std::bad_alloc();
+  std::vector<KelDiagnostic> found = std::move(collector.found);
+  std::stable_sort(found.begin(), found.end(),
+                   [](const auto& left, const auto& right) { return Rank(left) < Rank(right); });
+  const auto last =
+      std::unique(found.begin(), found.end(),
+                  [](const auto& left, const auto& right) { return Rank(left) == Rank(right); });
+  found.erase(last, found.end());
+  return found;
+}
+
+}  // namespace
+
+KelChecker::KelChecker(const KelLibrary& theLibrary) : library(theLibrary) {}
+
+KelChecker::~KelChecker() = default;
+
+std::vector<KelDiagnostic> KelChecker::CheckCore(const StringBase& key) const {
+  return CheckCores({key});
+}
+
+std::vector<KelDiagnostic> KelChecker::CheckCores(const StringList& keys,
+                                                  const Progress& progress) const {
+  CheckRun run(library);
+  run.CheckCores(keys, progress);
+  return run.Finish();
+}
+
+std::vector<KelDiagnostic> KelChecker::CheckLibrary(const Progress& progress) const {
+  const StringList keys = library.GetIndex().GetAllVersionKeys();
+  CheckRun run(library);
+  run.CheckRepositories();
+  run.CheckCores(keys, progress);
+  run.FindUnlisted(keys);
+  return run.Finish();
+}
+
+std::vector<KelDiagnosticCode> KelChecker::ListCodes() {
+  std::vector<KelDiagnosticCode> codes;
+  for (const KelDiagnosticCode* const code : Codes::kAll) codes.push_back(*code);
+  return codes;
+}
+
+}  // namespace Tarvo

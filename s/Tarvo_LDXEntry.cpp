@@ -1,0 +1,78 @@
+#include "Tarvo_LDXEntry.h"
+
+#include "Tarvo_TokenReader.h"
+#include "Tarvo_Word.h"
+
+namespace Tarvo {
+
+namespace {
+
+const char* const kDelimiters = " \"'";
+const char* const kBoth = "lib";
+const char* const kSynthesisOnly = "synlib";
+const char* const kSimulationOnly = "simlib";
+constexpr std::string_view kWholeLibrary = "all";
+constexpr std::string_view kIncludeDirectory = "vlgincdir";
+
+// Reads a field that must be there; else says what is missing, or that it is not closed.
+bool ReadField(TokenReader& tokens, std::string_view& field, const char* missing,
+               LineFault& fault) {
+  if (tokens.ReadField(field)) return true;
+  const std::string_view tried = tokens.GetTried();
+  fault = {tried, tried.empty() ? missing : "quote or bracket is not closed"};
+  return false;
+}
+
+bool ReadEnd(TokenReader& tokens, const char* text, LineFault& fault) {
+  if (!tokens.MoreTokens()) return true;
+  fault = {tokens.GetRest(), text};
+  return false;
+}
+
+bool ReadLibraryEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
+  std::string_view keyword;
+  if (!ReadField(tokens, keyword, "missing keyword", fault)) return false;
+  entry.forSynthesis = keyword == kBoth || keyword == kSynthesisOnly;
+  entry.forSimulation = keyword == kBoth || keyword == kSimulationOnly;
+  if (!entry.forSynthesis && !entry.forSimulation) {
+    fault = {keyword, "no entry begins with this word"};
+    return false;
+  }
+  if (!ReadField(tokens, entry.library, "missing library", fault)) return false;
+  if (!ReadField(tokens, entry.name, "missing file or 'all'", fault)) return false;
+  if (Matches(entry.name, kWholeLibrary)) {
+    entry.kind = LDXEntry::WholeLibrary;
+    return ReadEnd(tokens, "nothing may stand behind 'all'", fault);
+  }
+  // A language that is not closed is judged by what there is of it.
+  entry.language = tokens.ReadValue().text;
+  tokens.Step();
+  return ReadEnd(tokens, "nothing may stand behind the language", fault);
+}
+
+// A keyword in other letter case, and a line that goes on behind the directory, are ignored.
+bool ReadPathEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
+  std::string_view keyword;
+  entry.kind = LDXEntry::IncludeDirectory;
+  if (!ReadField(tokens, keyword, "missing keyword", fault)) return false;
+  if (keyword != kIncludeDirectory) {
+    entry.kind = LDXEntry::Ignored;
+    entry.rest = keyword;
+    return true;
+  }
+  if (!ReadField(tokens, entry.library, "missing library", fault)) return false;
+  if (!ReadField(tokens, entry.name, "missing directory", fault)) return false;
+  if (tokens.MoreTokens()) entry.rest = tokens.GetRest();
+  return true;
+}
+
+}  // namespace
+
+bool ReadLDXEntry(std::string_view line, LDXEntry& entry, LineFault& fault) {
+  TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);
+  entry = LDXEntry();
+  const bool isPath = Matches(FirstWord(line), kIncludeDirectory);
+  return isPath ? ReadPathEntry(tokens, entry, fault) : ReadLibraryEntry(tokens, entry, fault);
+}
+
+}  // namespace Tarvo

@@ -1,0 +1,192 @@
+#include "Tarvo_OrderChecker.h"
+
+#include <algorithm>
+#include <map>
+#include <utility>
+
+#include "Tarvo_AnalyseOrderReader.h"
+#include "Tarvo_AppException.h"
+#include "Tarvo_Diagnosis.h"
+#include "Tarvo_Existence.h"
+#include "Tarvo_Kel_Index.h"
+#include "Tarvo_LDXParser.h"
+
+namespace Tarvo {
+
+using Diagnosis::Say;
+using Port::FileName;
+
+namespace {
+
+KelPlace PlaceOf(const StringBase& file, const AnalyseOrder::Mark& mark) {
+  return {file, mark.line, mark.column, mark.length};
+}
+
+// A fault at a place that was read before.
+void Tell(const KelDiagnosticCode& code, const KelPlace& place, const StringBase& text) {
+  Diagnosis::Add([&] {
+    KelDiagnostic told = Diagnosis::At(code, {}, text);
+    told.place = place;
+    return told;
+  });
+}
+
+FileName OrderFile(const Kel_Index& index, const Kel_Key& key) {
+  return Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION);
+}
+
+// One name for each file, however its entry writes it.
+StringBase Normal(const FileName& file) { return file.Normalize(); }
+
+}  // namespace
+
+void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringBase& language) {
+  AnalyseOrder order;
+  const std::size_t before = DiagnosticCollector::GetCurrent()->found.size();
+  try {
+    order = ReadAnalyseOrder(file, index, key, Kel_Key(), language);
+  } catch (const AppException&) {  // told as the reader met it
+    return;
+  }
+  const bool isGood = DiagnosticCollector::GetCurrent()->found.size() == before;
+  CheckSources(order.GetSynthesis());
+  CheckSources(order.GetSimulation());
+  CheckIncludeDirectories(order);
+  edges[key.GetKey()] = MakeEdges(order, key);
+  tops.push_back(key.GetKey());
+  const bool isEmpty = order.GetSynthesis().libraries.empty() &&
+                       order.GetSimulation().libraries.empty() && order.includeDirectories.empty();
+  if (isEmpty && isGood) {
+    Diagnosis::Add([&] {
+      return Diagnosis::Of(Codes::kEmptyOrder, file.GetName(), "the order lists no source");
+    });
+  }
+}
+
+bool OrderChecker::IsThere(const FileName& file) {
+  const auto [known, isNew] = files.try_emplace(Normal(file), false);
+  if (isNew) known->second = IsFile(file);
+  return known->second;
+}
+
+bool OrderChecker::IsListed(const FileName& file) const { return files.count(Normal(file)) > 0; }
+
+bool OrderChecker::IsIncludeDirectory(const FileName& directory) const {
+  return includeDirectories.count(Normal(directory)) > 0;
+}
+
+void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
+  for (const AnalyseOrder::Library& library : sources.libraries) {
+    for (const auto& source : library.sources) {
+      if (IsThere(source->location)) continue;
+      Tell(Codes::kMissingSource, PlaceOf(*source->origin->file, source->mark),
+           Say({"source does not exist: ", source->location.GetName().View()}));
+    }
+  }
+}
+
+void OrderChecker::CheckIncludeDirectories(const AnalyseOrder& order) {
+  for (const AnalyseOrder::IncludeDirectory& directory : order.includeDirectories) {
+    includeDirectories.insert(Normal(directory.location));
+    if (IsDirectory(directory.location)) continue;
+    Tell(Codes::kMissingIncludeDirectory, PlaceOf(*directory.file, directory.mark),
+         Say({"include directory is no directory: ", directory.location.GetName().View()}));
+  }
+}
+
+// The cores that the core's own file brings in: whole ones, and those of single sources.
+OrderChecker::Edges OrderChecker::MakeEdges(const AnalyseOrder& order, const Kel_Key& key) const {
+  Edges own;
+  for (const AnalyseOrder::Include& include : order.includes) {
+    own.push_back({include.core, PlaceOf(*include.file, include.mark), true});
+  }
+  const StringBase file = OrderFile(index, key).GetName();
+  for (const auto* list : {&order.GetSynthesis(), &order.GetSimulation()}) {
+    for (const AnalyseOrder::Library& library : list->libraries) {
+      const auto isOwn = [&](const auto& source) { return *source->origin->file == file; };
+      const auto source = std::find_if(library.sources.begin(), library.sources.end(), isOwn);
+      if (*library.key == key || source == library.sources.end()) continue;
+      own.push_back({*library.key, PlaceOf(file, (*source)->mark), false});
+    }
+  }
+  return own;
+}
+
+// Those of a core that nobody asked to check are read for this alone: what is wrong with it was
+// told when it was taken in.
+const OrderChecker::Edges& OrderChecker::EdgesOf(const StringBase& core) {
+  const auto [known, isNew] = edges.try_emplace(core);
+  if (!isNew) return known->second;
+  const Kel_Key key(core);
+  try {
+    const AnalyseOrder order =
+        ReadAnalyseOrder(OrderFile(index, key), index, key, Kel_Key(), LDXParser::LDX_HDL_VHDL);
+    return edges[core] = MakeEdges(order, key);
+  } catch (const AppException&) {
+    return edges[core];
+  }
+}
+
+void OrderChecker::CheckVersions() {
+  for (const StringBase& top : tops) CheckVersionsOf(top);
+}
+
+// A short way to each core that the top takes in, and the cores in the order in which they are met.
+OrderChecker::Steps OrderChecker::FindSteps(const StringBase& top, std::vector<StringBase>& met) {
+  Steps steps;
+  met = {top};
+  std::vector<StringBase> wholes = {top};
+  std::unordered_set<StringBase> queued = {top};
+  for (std::size_t i = 0; i < wholes.size(); ++i) {
+    const StringBase from = wholes[i];
+    for (const Edge& edge : EdgesOf(from)) {
+      const StringBase& to = edge.core.GetKey();
+      if (to != top && steps.try_emplace(to, Step{&edge, from}).second) met.push_back(to);
+      if (edge.isWhole && queued.insert(to).second) wholes.push_back(to);
+    }
+  }
+  return steps;
+}
+
+void OrderChecker::CheckVersionsOf(const StringBase& top) {
+  std::vector<StringBase> met;
+  const Steps steps = FindSteps(top, met);
+  std::map<StringBase, Kel_Key> newest;  // by the core's name
+  for (const StringBase& text : met) {
+    const Kel_Key key(text);
+    const auto [known, isNew] = newest.try_emplace(key.GetName(), key);
+    if (!isNew && known->second < key) known->second = key;
+  }
+  for (const StringBase& text : met) {
+    const Kel_Key& newer = newest.at(Kel_Key(text).GetName());
+    if (newer != Kel_Key(text)) TellVersions(steps, top, text, newer.GetKey());
+  }
+}
+
+// At the entry that brings the older version in. Behind it the rest of the way to that version, and
+// then the way to the newer one, both backwards.
+void OrderChecker::TellVersions(const Steps& steps, const StringBase& top, const StringBase& older,
+                                const StringBase& newer) const {
+  const auto way = [&](const StringBase& to, std::vector<KelRelatedPlace>& places) {
+    for (StringBase at = to; at != top;) {
+      const Step& step = steps.at(at);
+      places.push_back({step.edge->place, Say({step.from.View(), " takes in ", at.View()})});
+      at = step.from;
+    }
+  };
+  Diagnosis::Add([&] {
+    std::vector<KelRelatedPlace> places;
+    way(older == top ? newer : older, places);
+    KelDiagnostic told =
+        Diagnosis::At(Codes::kVersionConflict, {},
+                      Say({older.View(), " comes into one order with the newer ", newer.View()}),
+                      Say({"take ", newer.View(), " everywhere"}));
+    told.place = places.front().place;
+    places.erase(places.begin());
+    if (older != top) way(newer, places);
+    told.related = std::move(places);
+    return told;
+  });
+}
+
+}  // namespace Tarvo

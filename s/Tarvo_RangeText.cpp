@@ -1,0 +1,146 @@
+#include "Tarvo_RangeText.h"
+
+#include <algorithm>
+#include <charconv>
+
+namespace Tarvo {
+
+namespace {
+
+constexpr std::string_view kBlanks = " \t";
+constexpr int kDeepestBracket = 50;
+
+bool IsDigit(char c) { return c >= '0' && c <= '9'; }
+
+bool IsWordChar(char c) {
+  return IsDigit(c) || (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || c == '_' || c == '.';
+}
+
+std::string_view Trim(std::string_view text) {
+  const std::size_t first = text.find_first_not_of(kBlanks);
+  if (first == std::string_view::npos) return {};
+  return text.substr(first, text.find_last_not_of(kBlanks) + 1 - first);
+}
+
+// Passes over an expression:
+//     sum = product { (+ | -) product }     product = factor { (* | / | %) factor }
+//     factor = [-] (WORD | "(" sum ")")
+class Expression {
+ public:
+  Expression(std::string_view text, RangeText& range) : rest(text), result(range) {}
+
+  // What it passed over; empty if there is none.
+  std::string_view Read() {
+    const std::string_view start = rest;
+    if (!PassList("+-", [&] { return PassProduct(); })) return {};
+    return Trim(start.substr(0, start.size() - rest.size()));
+  }
+  // Passes over that character. False if it is not the next one.
+  bool Pass(char c) {
+    PassBlanks();
+    if (rest.empty() || rest.front() != c) return false;
+    rest.remove_prefix(1);
+    return true;
+  }
+  bool IsAtEnd() {
+    PassBlanks();
+    return rest.empty();
+  }
+
+ private:
+  void PassBlanks() { rest.remove_prefix(std::min(rest.find_first_not_of(kBlanks), rest.size())); }
+
+  template <class Part>
+  bool PassList(std::string_view operators, const Part& part) {
+    while (part()) {
+      PassBlanks();
+      if (rest.empty() || operators.find(rest.front()) == std::string_view::npos) return true;
+      rest.remove_prefix(1);
+    }
+    return false;
+  }
+  bool PassProduct() {
+    return PassList("*/%", [&] { return PassFactor(); });
+  }
+  bool PassFactor() {
+    Pass('-');
+    if (!Pass('(')) return PassWord();
+    if (++depth > kDeepestBracket) return false;
+    const bool isClosed = PassList("+-", [&] { return PassProduct(); }) && Pass(')');
+    --depth;
+    return isClosed;
+  }
+  bool PassWord() {
+    PassBlanks();
+    const auto* const end = std::find_if_not(rest.begin(), rest.end(), IsWordChar);
+    const std::string_view word = rest.substr(0, static_cast<std::size_t>(end - rest.begin()));
+    rest.remove_prefix(word.size());
+    if (!word.empty() && !IsDigit(word.front())) result.names.push_back(word);
+    return !word.empty();
+  }
+
+  std::string_view rest;
+  RangeText& result;
+  int depth = 0;
+};
+
+// LOW:HIGH, or a single value where that is enough.
+bool ReadItem(Expression& expression, bool isPair, RangeText& range) {
+  RangeText::Item item;
+  item.low = expression.Read();
+  if (item.low.empty()) return false;
+  item.high = item.low;
+  if (expression.Pass(':')) {
+    item.high = expression.Read();
+  } else if (isPair) {
+    return false;
+  }
+  range.items.push_back(item);
+  return !item.high.empty();
+}
+
+}  // namespace
+
+std::optional<RangeText> ReadVector(std::string_view text) {
+  RangeText range;
+  Expression expression(text, range);
+  const bool isRead = expression.Pass('[') && ReadItem(expression, true, range) &&
+                      expression.Pass(']') && expression.IsAtEnd();
+  return isRead ? std::optional(range) : std::nullopt;
+}
+
+std::optional<RangeText> ReadRange(std::string_view text) {
+  RangeText range;
+  Expression expression(text, range);
+  if (!expression.Pass('(')) return std::nullopt;
+  do {
+    if (!ReadItem(expression, false, range)) return std::nullopt;
+  } while (expression.Pass(','));
+  if (!expression.Pass(')') || !expression.IsAtEnd()) return std::nullopt;
+  return range;
+}
+
+std::optional<long long> ReadNumber(std::string_view text) {
+  const bool isHex = text.substr(0, 2) == "0x" || text.substr(0, 2) == "0X";
+  if (isHex) text.remove_prefix(2);
+  long long number = 0;
+  const auto [end, error] =
+      std::from_chars(text.data(), text.data() + text.size(), number, isHex ? 16 : 10);
+  const bool isRead = error == std::errc() && end == text.data() + text.size() && !text.empty();
+  return isRead ? std::optional(number) : std::nullopt;
+}
+
+std::vector<std::string_view> ReadValues(std::string_view text) {
+  std::vector<std::string_view> words;
+  if (text.size() < 2 || text.front() != '(' || text.back() != ')') return words;
+  text = text.substr(1, text.size() - 2);
+  const char separator = text.find(';') == std::string_view::npos ? ',' : ';';
+  while (!text.empty()) {
+    const std::string_view part = text.substr(0, text.find(separator));
+    text.remove_prefix(std::min(part.size() + 1, text.size()));
+    words.push_back(Trim(part.substr(0, part.find(':'))));
+  }
+  return words;
+}
+
+}  // namespace Tarvo

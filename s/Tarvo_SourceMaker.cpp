@@ -1,0 +1,61 @@
+#include "Tarvo_SourceMaker.h"
+
+#include <utility>
+
+#include "Tarvo_FileKey.h"
+#include "Tarvo_Kel_Index.h"
+
+namespace Tarvo {
+
+using Port::FileName;
+
+void SourceMaker::EnterLibrary(std::string_view entered) {
+  if (library && libraryText.View() == entered) return;
+  const StringBase asked(entered);
+  auto key = std::make_shared<const Kel_Key>(index.GetIPKey(Kel_Key(asked)));
+  location = index.GetIPLocation(*key);
+  libraryText = asked;
+  library = std::move(key);
+  subdirectory.Empty();
+  origin.reset();
+}
+
+void SourceMaker::EnterDirectory(const HdlPlacement& placement) {
+  if (!origin || origin->language != placement.language) {
+    origin = std::make_shared<const AnalyseOrder::Origin>(
+        AnalyseOrder::Origin{library, file, placement.language});
+  }
+  if (subdirectory == placement.subdirectory) return;
+  FileName hdl = location;
+  hdl.SetBase("");
+  hdl.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
+  hdl.PushPathEnd(placement.subdirectory);
+  subdirectory = placement.subdirectory;
+  directory = hdl.GetHead();
+  fileKeyPrefix = FileKey::OfLocation(hdl);
+}
+
+// A name with levels may lead to another directory of a language, so its file key is read off the
+// whole location.
+AnalyseOrder::Source SourceMaker::Make(const StringBase& text, const FileName& name,
+                                       const HdlPlacement& placement,
+                                       const AnalyseOrder::Mark& mark) {
+  EnterDirectory(placement);
+  AnalyseOrder::Source source{origin, name, fileKeyPrefix, {}, mark};
+  const StringBase levels = name.GetPath();
+  source.location.SetHead(directory);
+  if (placement.missingExtension.GetLength() > 0) {
+    source.location.SetExtension(placement.missingExtension);
+  }
+  if (levels.GetLength() > 0) {
+    source.location.PushPathEnd(levels);
+    source.fileKey = FileKey::OfLocation(source.location);
+  } else {
+    source.fileKey.Append(source.location.GetTail());
+  }
+  source.entryKey = FileKey::OfEntry(*library, text, placement.missingExtension);
+  if (source.entryKey == source.fileKey) source.entryKey.Empty();
+  return source;
+}
+
+}  // namespace Tarvo

@@ -1,0 +1,46 @@
+#ifndef TARVO_SOURCEMAKER_H
+#define TARVO_SOURCEMAKER_H
+
+#include <memory>
+#include <string_view>
+
+#include "Port_FileName.h"
+#include "Tarvo_AnalyseOrder.h"
+#include "Tarvo_LDXParser_Hdl.h"
+
+namespace Tarvo {
+
+class Kel_Index;
+
+// Makes the sources of a file's entries, one after another. An entry mostly shares library and
+// language with the one before, so both are kept from one to the next.
+class SourceMaker {
+ public:
+  SourceMaker(const Kel_Index& theIndex, std::shared_ptr<const StringBase> theFile)
+      : index(theIndex), file(std::move(theFile)) {}
+
+  // Goes to the library of an entry. Throws AppException for one that is not in the index; then
+  // that of the entry before stays.
+  void EnterLibrary(std::string_view library);
+
+  // The source of that name, given as text too, in the library that was entered last.
+  AnalyseOrder::Source Make(const StringBase& text, const Port::FileName& name,
+                            const HdlPlacement& placement, const AnalyseOrder::Mark& mark);
+
+ private:
+  void EnterDirectory(const HdlPlacement& placement);
+
+  const Kel_Index& index;
+  std::shared_ptr<const StringBase> file;
+  StringBase libraryText;  // as its entry writes it
+  std::shared_ptr<const Kel_Key> library;
+  Port::FileName location;
+  StringBase subdirectory;  // of the language
+  StringBase directory;
+  StringBase fileKeyPrefix;
+  std::shared_ptr<const AnalyseOrder::Origin> origin;
+};
+
+}  // namespace Tarvo
+
+#endif

@@ -1,0 +1,77 @@
+#include "Tarvo_TEWLine.h"
+
+#include "Tarvo_TokenReader.h"
+#include "Tarvo_Word.h"
+
+namespace Tarvo::TEWLine {
+
+namespace {
+
+const char* const kDelimiters = " ,\"'";
+constexpr std::string_view kEndOfHeader = "FILES";
+
+TokenReader Cut(std::string_view line) {
+  return TokenReader(line, kDelimiters, TokenReader::WithoutGroups);
+}
+
+// Reads a field that must be there, or says that it is missing or not closed.
+bool ReadField(TokenReader& tokens, std::string_view& field, const char* missing,
+               LineFault& fault) {
+  if (tokens.ReadField(field)) return true;
+  const std::string_view tried = tokens.GetTried();
+  fault = {tried, tried.empty() ? missing : "quote is not closed"};
+  return false;
+}
+
+// Goes behind a comma that something follows. False at the end of a row's netlists.
+bool NextNetlist(TokenReader& tokens, Row& row) {
+  if (!tokens.MoreTokens()) return false;
+  const std::string_view rest = tokens.GetRest();
+  const bool isComma = tokens.GetToken() == ",";
+  if (isComma) tokens.Step();
+  if (isComma && tokens.MoreTokens()) return true;
+  row.rest = rest;
+  return false;
+}
+
+}  // namespace
+
+bool ReadHeader(std::string_view line, Header& header, LineFault& fault) {
+  TokenReader tokens = Cut(line);
+  header = Header();
+  std::string_view field;
+  if (!ReadField(tokens, field, "missing name", fault)) return false;
+  while (!Matches(field, kEndOfHeader)) {
+    header.names.push_back(field);
+    if (!ReadField(tokens, field, "missing FILES behind the names", fault)) return true;
+  }
+  header.isEnded = true;
+  return true;
+}
+
+Result ReadRow(std::string_view line, std::size_t columns, Row& row, LineFault& fault) {
+  TokenReader tokens = Cut(line);
+  row = Row();
+  std::string_view field;
+  if (!ReadField(tokens, field, "missing value", fault)) return StatesNothing;
+  while (row.values.size() < columns) {
+    row.values.push_back(field);
+    const bool isLast = row.values.size() == columns;
+    const char* const missing = isLast ? "missing netlist behind the values" : "missing value";
+    if (!ReadField(tokens, field, missing, fault)) return Unparsable;
+  }
+  row.netlists.push_back(field);
+  while (NextNetlist(tokens, row)) {
+    if (!ReadField(tokens, field, "missing netlist", fault)) return Unparsable;
+    row.netlists.push_back(field);
+  }
+  return Read;
+}
+
+Netlist SplitNetlist(std::string_view text) {
+  const std::size_t colon = text.find(':');
+  if (colon == std::string_view::npos) return {false, {}, text};
+  return {true, text.substr(0, colon), text.substr(colon + 1)};
+}
+
+}  // namespace Tarvo::TEWLine

@@ -1,0 +1,28 @@
+#ifndef TARVO_TABLECHECKER_H
+#define TARVO_TABLECHECKER_H
+
+#include <vector>
+
+#include "Port_FileName.h"
+#include "Tarvo_DescriptionChecker.h"
+#include "Tarvo_KelDiagnostic.h"
+#include "Tarvo_Kel_Key.h"
+
+namespace Tarvo {
+
+class Kel_Index;
+
+// A file that a core's own files list, and where.
+struct ListedFile {
+  Port::FileName location;
+  KelPlace place;
+};
+
+// Tells all that is wrong with the table of netlists of a core, to the collector of this thread.
+// Gives the netlists that it lists; whether they exist is not looked at.
+std::vector<ListedFile> CheckTable(const Port::FileName& file, const Kel_Index& index,
+                                   const Kel_Key& key, const DescribedCore& core);
+
+}  // namespace Tarvo
+
+#endif
