@@ -84,7 +84,7 @@ StringBase Joined(const std::vector<const char*>& words) {
 class DescriptionChecker {
  public:
   explicit DescriptionChecker(const Port::FileName& file)
-      : name(file.GetName()), input(name), lines(file) {}
+      : name(file.GetName()), input(name), lines(ScanFile(file, Codes::kMissingDescription)) {}
 
   DescribedCore Check();
 
@@ -317,7 +317,7 @@ void DescriptionChecker::CheckInterfaces(QVRStatement::Keyword keyword, const Pa
   const bool isBus = pair.key == QVRParser::QVR_BUS_IF_NAME.View();
   if (!isBus && pair.key != QVRParser::QVR_IO_IF_NAME.View()) return;
   const char* const what = keyword == QVRStatement::Port ? "port" : "parameter";
-  const char* const kind = isBus ? "bus interface " : "I/O interface ";
+  const char* const kind = isBus ? " of a bus interface" : " of an I/O interface";
   for (Text rest = pair.value; !rest.empty();) {
     const Text piece = rest.substr(0, rest.find(':'));
     rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
@@ -325,7 +325,7 @@ void DescriptionChecker::CheckInterfaces(QVRStatement::Keyword keyword, const Pa
     mentions.push_back({isBus ? QVRStatement::BusInterface : QVRStatement::IoInterface,
                         &Codes::kUndeclaredInterface, StringBase(piece),
                         Diagnosis::Here(SpanOf(lines, piece)),
-                        Say({what, " of a ", kind, "that is not declared: ", piece})});
+                        Say({what, kind, " that is not declared: ", piece})});
   }
 }
 

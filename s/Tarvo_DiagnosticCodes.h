@@ -97,7 +97,7 @@ inline constexpr Code kNotAKey{
     "not-a-key", kWarning, "directory that looks like a core but for its name",
     "A version directory bears the version's key, such as abc_v1_00_a. Any other is passed over."};
 inline constexpr Code kNotARepository{
-    "not-a-repository", kError, "repository without ipmods",
+    "not-a-repository", kWarning, "repository without ipmods",
     "A repository is a directory with a subdirectory ipmods, which holds the versions."};
 inline constexpr Code kRowNeverApplies{
     "row-never-applies", kWarning, "row that can never apply",

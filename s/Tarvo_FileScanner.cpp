@@ -39,22 +39,14 @@ bool HasTabs(std::string_view text) noexcept {
   return false;
 }
 
-// The exception for a file, which is told as it stands.
-template <class Format>
-AppException Refuse(const Format& format, const StringBase& name, const char* text) {
-  Diagnosis::Add([&] { return Diagnosis::Of(Codes::kUnreadable, name, text); });
-  return Report::Told(Report::Exception(AppException::Failure, format, name));
-}
-
 // Whether it can be read is asked only where it could not be opened.
 OpenStream Open(const StringBase& name) {
-  using Name = Report::FormatFor<StringBase>;
   OpenStream stream(Port::File::open(name, Port::File::Read));
   if (stream) return stream;
   if (!Port::File::canread(name)) {
-    throw Refuse(Name("Cannot read file %s\n"), name, "can't be read, or is no plain file");
+    throw Report::Exception(AppException::Failure, "Cannot read file %s\n", name);
   }
-  throw Refuse(Name("Cannot open file %s\n"), name, "can't be opened");
+  throw Report::Exception(AppException::Failure, "Cannot open file %s\n", name);
 }
 
 }  // namespace
@@ -65,8 +57,7 @@ FileScanner::FileScanner(const Port::FileName& file) : fileName(file.GetName()) 
   text = stream->TakeRest();
   if (Report::IsTracing() && HasTabs(text)) TARVO_TRACE("  Tabs found in file %s\n", fileName);
   if (!Port::File::close(stream.release())) {
-    throw Refuse(Report::FormatFor<StringBase>("Cannot close file %s\n"), fileName,
-                 "can't be read to its end");
+    throw Report::Exception(AppException::Failure, "Cannot close file %s\n", fileName);
   }
   TARVO_TRACE("Closed File %s\n", fileName);
 }

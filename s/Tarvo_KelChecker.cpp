@@ -141,12 +141,13 @@ DescribedCore CheckRun::CheckDescriptionOf(const FileName& file) {
 
 void CheckRun::CheckNetlists(const FileName& file, const Kel_Key& key, const DescribedCore& core) {
   try {
-    for (const ListedFile& netlist : CheckTable(file, index, key, core)) {
+    for (const ListedNetlist& netlist : CheckTable(file, index, key, core)) {
       if (orders.IsThere(netlist.location)) continue;
       Diagnosis::Add([&] {
         KelDiagnostic told =
             Diagnosis::At(Codes::kMissingNetlist, {},
-                          Say({"netlist does not exist: ", netlist.location.GetName().View()}));
+                          Say({"netlist does not exist: ",
+                               ShortName(index, netlist.library, netlist.location).View()}));
         told.place = netlist.place;
         return told;
       });

@@ -218,7 +218,7 @@ void OrderReader::TellCircle(OpenOrders::const_iterator first) const {
 void OrderReader::Parse() {
   TARVO_TRACE("  Parsing LDX File %s\n", *fileName);
   Port_Input input(*fileName);
-  FileScanner scanner(ldxFile);
+  FileScanner scanner = ScanFile(ldxFile, Codes::kMissingOrder);
   lines = &scanner;
   std::string_view line;
   for (unsigned lineNumber = 0; scanner.GetNextLine(line, lineNumber);) {

@@ -62,7 +62,7 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
   }
   TARVO_TRACE("  Parsing QVR File %s\n", name);
   Port_Input input(name);
-  FileScanner lines(file);
+  FileScanner lines = ScanFile(file, Codes::kMissingDescription);
   options = {{QVR_OPTION_NAME, key.GetName()}, {QVR_OPTION_VERSION, key.GetVersion()}};
   bool ok = true;
   std::string_view line;

@@ -1,6 +1,7 @@
 #include "Tarvo_OrderChecker.h"
 
 #include <algorithm>
+#include <boost/filesystem.hpp>
 #include <map>
 #include <utility>
 
@@ -40,6 +41,12 @@ StringBase Normal(const FileName& file) { return file.Normalize(); }
 
 }  // namespace
 
+StringBase ShortName(const Kel_Index& index, const Kel_Key& key, const FileName& file) {
+  const boost::filesystem::path location = index.GetIPLocation(key).GetName().GetText();
+  const boost::filesystem::path name = file.GetName().GetText();
+  return name.lexically_relative(location.parent_path()).c_str();
+}
+
 void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringBase& language) {
   AnalyseOrder order;
   const std::size_t before = DiagnosticCollector::GetCurrent()->found.size();
@@ -51,7 +58,7 @@ void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringB
   const bool isGood = DiagnosticCollector::GetCurrent()->found.size() == before;
   CheckSources(order.GetSynthesis());
   CheckSources(order.GetSimulation());
-  CheckIncludeDirectories(order);
+  CheckIncludeDirectories(order, key);
   edges[key.GetKey()] = MakeEdges(order, key);
   tops.push_back(key.GetKey());
   const bool isEmpty = order.GetSynthesis().libraries.empty() &&
@@ -80,17 +87,19 @@ void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
     for (const auto& source : library.sources) {
       if (IsThere(source->location)) continue;
       Tell(Codes::kMissingSource, PlaceOf(*source->origin->file, source->mark),
-           Say({"source does not exist: ", source->location.GetName().View()}));
+           Say({"source does not exist: ",
+                ShortName(index, *library.key, source->location).View()}));
     }
   }
 }
 
-void OrderChecker::CheckIncludeDirectories(const AnalyseOrder& order) {
+void OrderChecker::CheckIncludeDirectories(const AnalyseOrder& order, const Kel_Key& key) {
   for (const AnalyseOrder::IncludeDirectory& directory : order.includeDirectories) {
     includeDirectories.insert(Normal(directory.location));
     if (IsDirectory(directory.location)) continue;
     Tell(Codes::kMissingIncludeDirectory, PlaceOf(*directory.file, directory.mark),
-         Say({"include directory is no directory: ", directory.location.GetName().View()}));
+         Say({"include directory is no directory: ",
+              ShortName(index, key, directory.location).View()}));
   }
 }
 

@@ -14,6 +14,10 @@ namespace Tarvo {
 
 class Kel_Index;
 
+// The name of a file for a text: from the directory of its version on. The version is the one that
+// the key stands for.
+StringBase ShortName(const Kel_Index& index, const Kel_Key& key, const Port::FileName& file);
+
 // Checks analyse orders, one after another, and what they have to do with each other. Tells what is
 // wrong to the collector of this thread.
 class OrderChecker {
@@ -48,7 +52,7 @@ class OrderChecker {
   using Steps = std::unordered_map<StringBase, Step>;
 
   void CheckSources(const AnalyseOrder::SourceList& sources);
-  void CheckIncludeDirectories(const AnalyseOrder& order);
+  void CheckIncludeDirectories(const AnalyseOrder& order, const Kel_Key& key);
   Edges MakeEdges(const AnalyseOrder& order, const Kel_Key& key) const;
   const Edges& EdgesOf(const StringBase& core);
   void CheckVersionsOf(const StringBase& top);

@@ -231,7 +231,7 @@ QVRParser::QVRParser(const Kel_Index& index, const Kel_Key& key)
 QVRParser::QVRParser(const Port::FileName& file) : fileName(file.GetName()) {
   TARVO_TRACE("  Parsing QVR File %s\n", fileName);
   Port_Input input(fileName);
-  FileScanner lines(file);
+  FileScanner lines = ScanFile(file, Codes::kMissingDescription);
   std::string_view line;
   for (unsigned lineNumber = 0; lines.GetNextLine(line, lineNumber);) {
     input.AtLine(lineNumber);

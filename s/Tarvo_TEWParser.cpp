@@ -49,7 +49,7 @@ TEWParser::~TEWParser() = default;
 void TEWParser::Parse(const FileName& file, const Kel_Key& key) {
   TARVO_TRACE("  Parsing TEW File for %s\n", key.GetKey());
   Port_Input input(tewFile);
-  FileScanner lines(file);
+  FileScanner lines = ScanFile(file, Codes::kMissingTable);
   const StringList names = ListParameters();
   const NameSet parameters(names.begin(), names.end());
   std::string_view line;

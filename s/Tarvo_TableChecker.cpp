@@ -44,7 +44,7 @@ class TableChecker {
                const DescribedCore& theCore)
       : name(file.GetName()),
         input(name),
-        lines(file),
+        lines(ScanFile(file, Codes::kMissingTable)),
         index(theIndex),
         key(theKey),
         core(theCore) {
@@ -52,7 +52,7 @@ class TableChecker {
       parameters.push_back(parameter.name);
   }
 
-  std::vector<ListedFile> Check();
+  std::vector<ListedNetlist> Check();
 
  private:
   unsigned FindHeader();
@@ -79,10 +79,10 @@ class TableChecker {
   StringList parameters;
   StringList columns;
   std::map<std::pair<StringList, StringBase>, KelPlace> rows;  // by values and netlist
-  std::vector<ListedFile> netlists;
+  std::vector<ListedNetlist> netlists;
 };
 
-std::vector<ListedFile> TableChecker::Check() {
+std::vector<ListedNetlist> TableChecker::Check() {
   const unsigned headerLine = FindHeader();
   lines.GoToStart();
   Text line;
@@ -189,9 +189,10 @@ void TableChecker::CheckNetlist(const StringList& values, Text text) {
   }
   const TEWLine::Netlist split = TEWLine::SplitNetlist(text);
   const Text library = split.hasLibrary ? split.library : key.GetKey().View();
-  ListedFile netlist{{}, Diagnosis::Here(SpanOf(lines, text))};
+  ListedNetlist netlist{{}, {}, Diagnosis::Here(SpanOf(lines, text))};
   try {
-    netlist.location = index.GetIPLocation(index.GetIPKey(Kel_Key(StringBase(library))));
+    netlist.library = index.GetIPKey(Kel_Key(StringBase(library)));
+    netlist.location = index.GetIPLocation(netlist.library);
   } catch (const AppException&) {
     return Diagnosis::Add([&] { return TellUnknownLibrary(lines, index, library); });
   }
@@ -223,8 +224,8 @@ void TableChecker::CheckEnd(const TEWLine::Row& row) const {
 
 }  // namespace
 
-std::vector<ListedFile> CheckTable(const Port::FileName& file, const Kel_Index& index,
-                                   const Kel_Key& key, const DescribedCore& core) {
+std::vector<ListedNetlist> CheckTable(const Port::FileName& file, const Kel_Index& index,
+                                      const Kel_Key& key, const DescribedCore& core) {
   return TableChecker(file, index, key, core).Check();
 }
 

@@ -12,16 +12,17 @@ namespace Tarvo {
 
 class Kel_Index;
 
-// A file that a core's own files list, and where.
-struct ListedFile {
+// A netlist that a table lists, and where.
+struct ListedNetlist {
+  Kel_Key library;
   Port::FileName location;
   KelPlace place;
 };
 
 // Tells all that is wrong with the table of netlists of a core, to the collector of this thread.
 // Gives the netlists that it lists; whether they exist is not looked at.
-std::vector<ListedFile> CheckTable(const Port::FileName& file, const Kel_Index& index,
-                                   const Kel_Key& key, const DescribedCore& core);
+std::vector<ListedNetlist> CheckTable(const Port::FileName& file, const Kel_Index& index,
+                                      const Kel_Key& key, const DescribedCore& core);
 
 }  // namespace Tarvo
 

@@ -3,7 +3,9 @@
 
 #include <string_view>
 
+#include "Tarvo_AppException.h"
 #include "Tarvo_Diagnosis.h"
+#include "Tarvo_Existence.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_LineFault.h"
 
@@ -18,6 +20,21 @@ inline Diagnosis::Span SpanOf(const FileScanner& lines, std::string_view part) {
 inline KelDiagnostic TellFault(const KelDiagnosticCode& code, const FileScanner& lines,
                                const LineFault& fault) {
   return Diagnosis::At(code, SpanOf(lines, fault.where), fault.text);
+}
+
+// Opens a data file of a core. One that can't be read is told, with the code for a missing one
+// where that is what is wrong; the exception passes.
+inline FileScanner ScanFile(const Port::FileName& file, const KelDiagnosticCode& missing) {
+  try {
+    return FileScanner(file);
+  } catch (AppException& exception) {
+    Diagnosis::Add([&] {
+      return MayExist(file) ? Diagnosis::Of(Codes::kUnreadable, file.GetName(), "can't be read")
+                            : Diagnosis::Of(missing, file.GetName(), "does not exist");
+    });
+    exception.told = true;
+    throw;
+  }
 }
 
 }  // namespace Tarvo

@@ -8,6 +8,8 @@ it are what it must print; a line of three dots stands for the rest. A line that
 goes on in the next. In a manual page the blocks are those between .EX and .EE. Each `cpp` block is
 compiled and run as README.md says, and prints what the `text` block behind it shows. Data files, whose
 first line is a comment with their path, make a repository, in which the document's lines are then run.
+docs/diagnostics.md has a section for each code of `kel help diagnostics`: its data files, in a repository
+of their own behind its `sh` blocks, are checked, and the lines with the code are those of its `text` block.
 The project's directory is written /home/me/kel. And the headers' pages come without a warning.
 """
 
@@ -106,12 +108,33 @@ def document_faults(name, calls, build, environment):
         if shows_files:
             # All is well but for the sources and netlists, which a document doesn't hold.
             findings = run("kel -L . check", environment, scratch).splitlines()[:-1]
-            bad = [finding for finding in findings if " does not exist: " not in finding]
+            bad = [finding for finding in findings if not re.search(r"\[missing-(source|netlist)\]", finding)]
             if bad or not findings:
                 yield f"{name}: its files are not good:\n{bad}"
         yield from console_faults(name, text, environment, scratch if shows_files else ROOT)
     for call in calls:
         yield from program_faults(name, text, call, build)
+
+
+def code_faults(environment):
+    """Each code of the command has its section, and is reported where its example says."""
+    name = "docs/diagnostics.md"
+    sections = re.split(r"^## (.*)\n", (ROOT / name).read_text(), flags=re.MULTILINE)[1:]
+    codes = re.findall(r"^(\S+) \(", run("kel help diagnostics", environment), re.MULTILINE)
+    if codes != sections[::2]:
+        yield f"{name}: its sections are {sections[::2]}, and the codes {codes}"
+    for code, text in zip(sections[::2], sections[1::2]):
+        if not blocks(text, "text") and re.search(r"no\s+example", text):
+            continue
+        with tempfile.TemporaryDirectory() as scratch:
+            (pathlib.Path(scratch) / "ipmods").mkdir()
+            printed = "".join(run(commands, environment, scratch) for commands in blocks(text, "sh"))
+            write_files(text, pathlib.Path(scratch))
+            found = run("kel -L . check --relative-to .", environment, scratch).splitlines()
+            printed += "".join(f"{line}\n" for line in found if f"[{code}]: " in line)
+            printed = printed.replace(scratch, SHOWN_ROOT)
+        if [printed] != blocks(text, "text"):
+            yield f"{name}: the example of {code} gives\n{printed}"
 
 
 def page_faults(environment):
@@ -131,6 +154,7 @@ def main():
         faults += document_faults(name, calls, build, environment)
     if blocks(readme, "cpp") != [(ROOT / "examples/consumer/program.cpp").read_text()]:
         faults.append("examples/consumer/program.cpp is not the program of README.md")
+    faults += code_faults(environment)
     faults += page_faults(environment)
     print("\n".join(faults) or "The documents' examples print what they show")
     return 1 if faults else 0

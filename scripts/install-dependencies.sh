@@ -13,6 +13,9 @@ declare -A groups=(
           doxygen"
 )
 
+# For reading SARIF by programs of others; an npm from anywhere will do.
+command -v npm >/dev/null || groups[tools]+=" npm"
+
 missing=()
 for group in "$@"; do
   if [ -z "${groups[$group]:-}" ]; then

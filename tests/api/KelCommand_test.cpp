@@ -55,13 +55,14 @@ TEST(KelWhich, TellsBadInputByItsStatus) {
        "kel: error: Unable to set repository path to nowhere\n  Invalid path directory nowhere\n",
        false},
       {"-L '" + empty.Path() + "' -L repository which word_fifo", 0,
-       "kel: warning: Unable to add directory " + empty.Path() + " to library\n", true},
+       empty.Path() + ": warning[not-a-repository]: has no directory ipmods\n", true},
       {"-L repository which", 2, "kel: error: KEY is required\n", false},
-      {"wich word_fifo", 2, "kel: error: there is no verb 'wich'", false},
+      {"wich word_fifo", 2, "kel: error: unknown verb 'wich'; did you mean which?", false},
       {"-L '' which word_fifo", 2, "kel: error: -L needs", false},
       {"which word_fifo", 2, "kel: error: -L DIR is required", false},
       {"-L repository", 2, "kel: error: a verb is required: ", false},
-      {"-L repository which --nonsense word_fifo", 2, "kel: error: '--nonsense' is not", false},
+      {"-L repository which --nonsense word_fifo", 2,
+       "kel: error: unexpected argument '--nonsense'", false},
       {"-L repository which word_fifo >/dev/full", 1,
        "kel: error: Unable to write to standard output\n", false}};
   for (const Row& row : rows) {
@@ -87,7 +88,9 @@ TEST(KelList, ListsTheNewestOrAllVersions) {
   const CommandResult result = Kel("list -L " + repo.Path());
   EXPECT_EQ(result.status, 1);
   EXPECT_EQ(result.output, newest + last);
-  EXPECT_NE(result.errors.find("kel: error: Invalid IP index entry a_v1_00_a"), std::string::npos);
+  EXPECT_EQ(result.errors,
+            at + "a_v1_00_a/data/a_v2_1_0.qvr:1:13: error[bad-statement]: missing '=' "
+                 "behind the name\n");
   EXPECT_EQ(Kel("list --all -L " + repo.Path()).output,
             newest + "b_v2_00_a\tHDL\t\t" + at + "b_v2_00_a\ttwo\n" + last);
 }
@@ -150,10 +153,10 @@ TEST(KelSources, ListsThemInOrder) {
       Paths("sources --for simulation tone_gen"),
       own + "vhdl/phase_acc.vhd\n" + own + "vhdl/tone_gen.vhd\n" + own + "vhdl/tone_gen_tb.vhd\n");
   EXPECT_EQ(Paths("sources crc_unit --for synthesis"),
-            "kel: note: crc_unit_v1_00_a has no sources, its STYLE is 'BLACKBOX'\n");
+            "kel: note: crc_unit_v1_00_a has no sources because its STYLE is 'BLACKBOX'\n");
   EXPECT_NE(
       Paths("sources tone_gen --for synthesis --format ghdl")
-          .find("kel: note: the format ghdl is for VHDL alone, and leaves out 1 of 2 sources\n"),
+          .find("kel: note: the format ghdl is for VHDL only and leaves out 1 of 2 sources\n"),
       std::string::npos);
   Paths("sources tone_gen", 2);
   Paths("sources tone_gen --for layout", 2);
@@ -167,7 +170,7 @@ TEST(KelNetlists, ListsThoseThatApply) {
   EXPECT_EQ(Paths("netlists crc_unit --set MODE==x").substr(0, 29),
             "kel: note: no netlist applies");
   EXPECT_EQ(Paths("netlists word_fifo"),
-            "kel: note: word_fifo_v1_00_a has no netlists, its STYLE is 'HDL'\n");
+            "kel: note: word_fifo_v1_00_a has no netlists because its STYLE is 'HDL'\n");
   EXPECT_EQ(
       Paths("netlists crc_unit --set mode=FAST", 1),
       "kel: warning: Unable to set IP crc_unit_v1_00_a parameter mode property VALUE to FAST\n"
@@ -190,11 +193,13 @@ TEST(Kel, SaysWhatItIsAskedToSay) {
 }
 
 TEST(Kel, SuggestsWhatThereIs) {
-  const char* const rows[][2] = {{"show puls_counter", "kel: note: a near name is pulse_counter\n"},
-                                 {"which WORD_FIFO", "kel: note: a near name is word_fifo\n"},
-                                 {"sources math_pack_v2_00_a --for synthesis",
-                                  "kel: note: the versions of this core are math_pack_v1_00_a\n"},
-                                 {"list 'x*'", "kel: note: no core fits 'x*'\n"}};
+  const char* const rows[][2] = {
+      {"show puls_counter",
+       "kel: note: no core is named puls_counter; did you mean pulse_counter?\n"},
+      {"which WORD_FIFO", "; did you mean word_fifo?\n"},
+      {"sources math_pack_v2_00_a --for synthesis",
+       "kel: note: the versions of this core are math_pack_v1_00_a\n"},
+      {"list 'x*'", "kel: note: no core matches 'x*'\n"}};
   for (const auto& [arguments, note] : rows) {
     const CommandResult result = Kel(std::string("-L repository ") + arguments);
     EXPECT_EQ(result.status, 1) << arguments;
@@ -205,8 +210,8 @@ TEST(Kel, SuggestsWhatThereIs) {
   repo.Core("brok_v1_00_a").Qvr("PORT p");
   repo.Core("broc_v1_00_a").Qvr("");
   const CommandResult broken = Kel("show brok -L " + repo.Path());
-  EXPECT_EQ(broken.errors.find("near"), std::string::npos);
-  EXPECT_NE(broken.errors.find("line 1, PORT p"), std::string::npos);
+  EXPECT_EQ(broken.errors.find("did you mean"), std::string::npos);
+  EXPECT_EQ(broken.errors.rfind(repo / "ipmods/brok_v1_00_a/data/brok_v2_1_0.qvr:1:", 0), 0U);
   EXPECT_EQ(Kel("list '[bo][rd]*[cd]' -L " + repo.Path()).output.substr(0, 12), "broc_v1_00_a");
   EXPECT_NE(
       Kel("sources odd --for synthesis --json -L " + repo.Path()).output.find("\"odd_v1_00_a\""),
@@ -218,13 +223,11 @@ TEST(Kel, SuggestsWhatThereIs) {
       std::string::npos);
   const CommandResult above = Kel("-L .. list");
   EXPECT_EQ(above.status, 3);
-  EXPECT_EQ(above.errors,
-            "kel: warning: Unable to add directory .. to library\n"
-            "kel: note: .. has no directory 'ipmods', so it is no repository\n");
-  EXPECT_NE(
-      Kel("-L repository/ipmods list").errors.find("; near it is " + kExamples + "/repository\n"),
-      std::string::npos);
-  EXPECT_NE(Kel("-L . list").errors.find("/overlay, " + kExamples + "/repository\n"),
+  EXPECT_EQ(above.errors, "..: warning[not-a-repository]: has no directory ipmods\n");
+  EXPECT_NE(Kel("-L repository/ipmods list")
+                .errors.find("; did you mean " + kExamples + "/repository?\n"),
+            std::string::npos);
+  EXPECT_NE(Kel("-L . list").errors.find("/overlay or " + kExamples + "/repository?\n"),
             std::string::npos);
 }
 
@@ -234,6 +237,11 @@ TEST(Kel, ShowsHelpAndVersion) {
   EXPECT_EQ(Kel("help which").output, Kel("which --help").output);
   EXPECT_NE(Kel("which --help").output.find("KEY"), std::string::npos);
   EXPECT_EQ(Kel("--version").output.substr(0, 4), "kel ");
+  const std::string one = Kel("help list-ends").output;
+  EXPECT_EQ(one.substr(0, 22), "list-ends (warning): l");
+  EXPECT_NE(Kel("help diagnostics").output.find(one), std::string::npos);
+  EXPECT_EQ(Kel("help list-end").errors.substr(0, 62),
+            "kel: error: no help on 'list-end'; did you mean list-ends?\nRun");
 }
 
 }  // namespace

@@ -179,6 +179,50 @@ TEST_F(Views, AreAbsolute) {
 }
 
 // A file that is bad fails each question anew, and no other, until it is mended.
+// What the files state, each with its place; nothing where the style has none.
+TEST_F(Views, KnowTheirPlaces) {
+  repo.Core("abc_v1_00_a")
+      .Qvr("OPTION STYLE = MIX\n\nPORT p = q\nPARAMETER P = 1\nIO_INTERFACE IO_IF = I\nPORT p = r")
+      .Ldx("lib abc a.vhd")
+      .Tew("# table\nP FILES\n1 xyz:n.edn, m.edn # c\n\n2 n.edn m.edn");
+  repo.Core("xyz_v1_00_a").Qvr("");
+  repo.Core("box_v1_00_a").Qvr("OPTION STYLE = none");
+  const auto ip = Open("abc");
+  std::vector<KelStatement> statements;
+  std::string text;
+  EXPECT_TRUE(ip->GetStatements(statements));
+  for (const KelStatement& one : statements) {
+    text += std::to_string(one.kind) + one.name.GetText() + std::to_string(one.place.line) + " ";
+  }
+  EXPECT_EQ(text, "0STYLE1 2p3 1P4 4I5 2p6 ");
+  EXPECT_EQ(statements.at(0).place.file, (repo / "ipmods/abc_v1_00_a/data/abc_v2_1_0.qvr").c_str());
+  KelNetlistTable table;
+  ip->SetParameterProperty("P", "VALUE", "2");
+  EXPECT_TRUE(ip->GetNetlistTable(table));
+  text = std::string(table.parameters.at(0)) + " ";
+  for (const KelNetlistRow& row : table.rows) {
+    text += std::to_string(row.place.line) + row.values.at(0).GetText() + (row.applies ? "*" : "-");
+    for (const KelNetlist& netlist : row.netlists) {
+      text += std::string(netlist.library.GetKey()) +
+              fs::path(netlist.path.GetText()).filename().string();
+    }
+    text += std::string("<") + row.ignored.GetText() + "> ";
+  }
+  EXPECT_EQ(text,
+            "P 31-xyz_v1_00_an.edn"
+            "abc_v1_00_am.edn<> 52*abc_v1_00_an.edn<m.edn> ");
+  std::vector<KelSource> sources(1);
+  const auto box = Open("box");
+  EXPECT_FALSE(box->GetSimulationSources(sources));
+  EXPECT_FALSE(box->GetNetlistTable(table));
+  EXPECT_TRUE(sources.empty() && table.rows.empty() && table.parameters.empty());
+  EXPECT_TRUE(recorder.Take().empty());
+  repo.Core("abc_v1_00_a").Ldx("lib");
+  EXPECT_FALSE(ip->GetSynthesisSources(sources));
+  EXPECT_EQ(recorder.Take().back().substr(0, 58),
+            "error s/Tarvo_KelIP: Unable to list synthesis analyse orde");
+}
+
 TEST_F(Views, TryAgainAfterAFailure) {
   auto core = repo.Core("abc_v1_00_a");
   core.Qvr("OPTION STYLE = MIX\nPARAMETER A = 1").Ldx("lib").Tew("FILES\nb.edn, '");

@@ -107,6 +107,21 @@ TEST_F(Index, KeepsEqualVersionsApart) {
   EXPECT_EQ(Look(index, "abc_v1_00_a"), "abc_v1_00_a " + At("abc_v1_00_a"));
 }
 
+TEST_F(Index, KnowsWhatTheFirstLocationHides) {
+  for (const char* key : {"abc_v1_00_a", "abc_v2_00_a", "xyz_v1_00_a"}) EXPECT_TRUE(Add(key));
+  EXPECT_TRUE(index.AddIP(Key("abc_v2_00_a"), Directory(repo.Path())));
+  EXPECT_TRUE(index.AddIP(Key("abc_v2_00_a"), Directory("/")));
+  const auto hidden = index.GetHiddenLocations(Key("abc"));
+  ASSERT_EQ(hidden.size(), 2U);
+  EXPECT_EQ(hidden[0].GetName(), repo.Path().c_str());
+  EXPECT_EQ(hidden[1].GetName(), "/");
+  EXPECT_TRUE(index.GetHiddenLocations(Key("abc_v1_00_a")).empty());
+  EXPECT_TRUE(index.GetHiddenLocations(Key("nope")).empty());
+  EXPECT_THAT(index.GetAllVersionKeys(), ElementsAre("abc_v1_00_a", "abc_v2_00_a", "xyz_v1_00_a"));
+  index.ClearIP();
+  EXPECT_TRUE(index.GetAllVersionKeys().empty());
+}
+
 TEST_F(Index, TellsWhatItAdds) {
   EXPECT_TRUE(Add("abc_v1_00_a"));
   EXPECT_TRUE(index.AddIP(Key("abc_V1_00_A"), Directory(repo.Path())));

@@ -312,6 +312,77 @@ TEST_F(AnalyseOrder, ReportsIncludeDirectories) {
                           Unparsable("abc_v1_00_a", "vlgincdir xyz .", "path", 2)));
 }
 
+// What is tested is what is given out, as the system resolves it: a step back from a link leads to
+// where its target lies. The version's directory may be a link too.
+TEST_F(AnalyseOrder, FollowsLinksToIncludeDirectories) {
+  repo.File("far/inc/x", "");
+  repo.File("far/core/data/abc_v2_1_0.ldx", "");
+  fs::create_directory(repo / "ipmods");
+  fs::create_directory_symlink(repo / "far/core", repo / "ipmods/abc_v1_00_a");
+  const std::pair<const char*, bool> rows[] = {
+      {"../inc", true},          {"data/../../inc", true}, {"../inc/../core/data", true},
+      {"../abc_v1_00_a", false}, {"link/../hdl", false},   {"link/../x", false},
+      {"link/..", true}};
+  Core("abc_v1_00_a", "").File("hdl/y", "");
+  fs::create_directory_symlink(repo / "far/inc", repo / "far/core/link");
+  for (const auto& [directory, exists] : rows) {
+    Core("abc_v1_00_a", std::string("vlgincdir abc ") + directory);
+    ASSERT_EQ(Read("abc_v1_00_a"), exists ? "" : Invalid("abc_v1_00_a")) << directory;
+    if (!exists) continue;
+    const StringBase given = Parse("abc_v1_00_a").GetVerilogIncludeLocation("abc");
+    EXPECT_TRUE(fs::is_directory(given.GetText())) << given;
+  }
+}
+
+// A file that is read in the name of another core is none of that core's own.
+TEST_F(AnalyseOrder, ReadsAnyFileForACore) {
+  Core("abc_v1_00_a", "lib abc_v1_00_a a.vhd\nlib xyz_v1_00_a all");
+  Core("xyz_v1_00_a", "lib xyz_v1_00_a x.vhd");
+  repo.File("other", "lib abc_v1_00_a all\nlib abc_v1_00_a b.vhd");
+  const Port::FileName other((repo / "other").c_str());
+  const Kel_Key abc("abc_v1_00_a");
+  const LDXParser order(other, index, abc, Kel_Key("xyz_v2_00_a"), "VHDL");
+  EXPECT_EQ(Shorten(order.ListSynthesisAnalyseOrder()),
+            "abc_v1_00_a/vhdl/a.vhd abc_v1_00_a/vhdl/b.vhd xyz_v1_00_a/vhdl/x.vhd");
+  EXPECT_THROW(LDXParser(other, index, abc, Kel_Key(), "VHDL"), AppException);
+  const Kel_Key root("xyz_v1_00_a");
+  EXPECT_THROW(LDXParser(other, index, abc, root, "VHDL"), AppException);
+}
+
+TEST_F(AnalyseOrder, KeepsThePlaceOfEachEntry) {
+  Core("sub_v1_00_a", "\n\tsimlib sub  's x.v' Verilog # c\nvlgincdir gone data");
+  Core("top_v1_00_a", "lib sub all\n\nlib sub b vhdl\nlib top_v1_00_a a");
+  const LDXParser order = Parse("top_v1_00_a", "verilog");
+  const auto dump = [&](const KelPlace& place) {
+    const std::string file = place.file.GetText();
+    return file.substr(file.rfind('/') + 1, 3) + ":" + std::to_string(place.line) + ":" +
+           std::to_string(place.column) + "+" + std::to_string(place.length);
+  };
+  std::string text;
+  for (const auto& list : {order.GetSynthesisSources(), order.GetSimulationSources()}) {
+    for (const KelSource& source : list) {
+      text += Shorten({source.path}) + " " + source.library.GetKey().GetText() + " " +
+              source.language.GetText() + " " + dump(source.place) + "\n";
+    }
+  }
+  for (const KelIncludeDirectory& directory : order.GetVerilogIncludeDirectories()) {
+    text += Shorten({directory.path}) + " " + directory.library.GetText() + " " +
+            dump(directory.place) + "\n";
+  }
+  for (const KelInclude& include : order.GetIncludes()) {
+    text += std::string(include.library) + " " + include.core.GetKey().GetText() + " " +
+            dump(include.place) + "\n";
+  }
+  EXPECT_EQ(text,
+            "sub_v1_00_a/vhdl/b.vhd sub_v1_00_a vhdl top:3:9+1\n"
+            "top_v1_00_a/verilog/a.v top_v1_00_a verilog top:4:17+1\n"
+            "sub_v1_00_a/verilog/s x.v sub_v1_00_a Verilog sub:2:15+5\n"
+            "sub_v1_00_a/vhdl/b.vhd sub_v1_00_a vhdl top:3:9+1\n"
+            "top_v1_00_a/verilog/a.v top_v1_00_a verilog top:4:17+1\n"
+            "sub_v1_00_a/data gone sub:3:16+4\n"
+            "sub sub_v1_00_a top:1:5+3\n");
+}
+
 TEST_F(AnalyseOrder, ReportsACircleThroughTheRootAtEachLevel) {
   Core("abc_v1_00_a", "lib abc_v1_00_a a.vhd\nlib xyz_v1_00_a all\nlib");
   Core("xyz_v1_00_a", "lib abc_v1_00_a all");
@@ -321,6 +392,8 @@ TEST_F(AnalyseOrder, ReportsACircleThroughTheRootAtEachLevel) {
                           Unparsable("xyz_v1_00_a", "lib abc_v1_00_a all"),
                           Unable("xyz_v1_00_a", Invalid("xyz_v1_00_a").substr(2)),
                           Unparsable("abc_v1_00_a", "lib xyz_v1_00_a all", "library", 2)));
+  EXPECT_THAT(recorder.Inputs(), ElementsAre("xyz_v2_1_0.ldx:1", "xyz_v2_1_0.ldx:1",
+                                             "abc_v2_1_0.ldx:2", "abc_v2_1_0.ldx:2"));
 }
 
 // Whatever the way of a circle, it ends where it would begin again.

@@ -19,6 +19,12 @@ std::string Dump(const Port_Message& message) {
          (revision == "1.0" ? "" : " " + revision) + ": " + message.text;
 }
 
+std::string DumpInput(const Port_Message& message) {
+  const std::string file = message.inputFile;
+  if (file.empty()) return message.inputLine == 0 ? "" : "a line of nothing";
+  return file.substr(file.rfind('/') + 1) + ":" + std::to_string(message.inputLine);
+}
+
 Tarvo::DebugMessenger& Logger() {
   return *Tarvo::DebugMessengerFactory::GetLogger(Port::StringBase<char>("BaseIP"));
 }
@@ -29,6 +35,7 @@ MessageRecorder::MessageRecorder(What what) {
   previous = Port_MsgManData::setHandler([this](const Port_Message& message) {
     entries.push_back(Dump(message));
     lines.push_back(message.line);
+    inputs.push_back(DumpInput(message));
   });
   if (what == MessagesAndTraces) {
     Logger().SetSink([this](const Port::StringBase<char>& text) {

@@ -26,10 +26,14 @@ class MessageRecorder {
   // The lines at which the messages since the making were issued.
   const std::vector<int>& Lines() const { return lines; }
 
+  // What was being read at each of them, as "abc_v2_1_0.ldx:3", or "" for nothing.
+  const std::vector<std::string>& Inputs() const { return inputs; }
+
  private:
   Port_MsgManData::Handler previous;
   std::vector<std::string> entries;
   std::vector<int> lines;
+  std::vector<std::string> inputs;
 };
 
 #endif

@@ -33,6 +33,10 @@ while IFS='|' read -r words expected; do
 done <<EOT
 kel s|show sources
 kel help ne|netlists
+kel help list|list list-ends
+kel check -W no-missing-s|no-missing-source
+kel check --format = |text json sarif
+kel check --e|--excerpts
 kel -L examples/rep|examples/repository
 kel --library = examples/o|examples/overlay
 kel -L examples/repository show pul|$pulse

@@ -19,6 +19,8 @@ import sys
 import tempfile
 import time
 import tomllib
+import urllib.parse
+import xml.etree.ElementTree
 
 import jsonschema
 
@@ -27,7 +29,10 @@ SAMPLES = ROOT / "examples/repository"
 KEL = pathlib.Path(sys.argv[1]).resolve()
 PURPOSES = ["synthesis", "simulation"]
 SOURCE_NAMES = ["a b.vhd", "it's one.vhd", 'a "word".vhd', "$HOME$(x)`y`.vhd", "back\\sl\\nash.vhd",
-                "[br]ac{k}et.vhd", "star*?;&|<>~.vhd", "ünï.vhd", "top [m]\\$o.v"]
+                "[br]ac{k}et.vhd", "star*?;&|<>~.vhd", "ünï.vhd", "del\x7fete.vhd", "top [m]\\$o.v"]
+# A schema of SARIF 2.1.0 and a program that reads it.
+SARIF_PACKAGES = ["@microsoft/jest-sarif@1.0.0-beta.0", "sarif-junit@1.1.4"]
+SARIF_SCHEMA = "@microsoft/jest-sarif/lib/schemas/sarif-2.1.0-rtm.5.json"
 GHDL = {"GHDL_FLAGS": "--std=08"}
 
 
@@ -246,7 +251,7 @@ def strictly_valid(document, schema):
     validator = jsonschema.Draft7Validator(schema)
     if fault := jsonschema.exceptions.best_match(validator.iter_errors(document)):
         raise Fault(f"{list(fault.path)}: {fault.message}")
-    records_at = "files" if "files" in document else "sources"
+    records_at = next(name for name in ["files", "sources", "findings"] if name in document)
     for at in [None, *range(len(document[records_at]))]:
         whole = document if at is None else document[records_at][at]
         for name in [*whole, None]:
@@ -303,6 +308,62 @@ def terminal(scratch):
             raise Fault(f"{words} shows {shown}")
 
 
+def faulty(scratch):
+    """A repository with a fault of each kind of place, and the number of its findings."""
+    data = scratch / "rep o%/ipmods/ü_v1_00_a/data"
+    data.mkdir(parents=True)
+    (data / "ü_v2_1_0.qvr").write_text("PORT p = 'ü', DIR = I VEC = [1:0]\nPORT p = q, DIR = O\n")
+    return data.parent.parent.parent
+
+
+def npm(scratch, *words):
+    """Runs npm; false if it isn't there or reaches nothing."""
+    try:
+        run("npm", *words, "--silent", "--fetch-retries=0", cwd=scratch)
+        return True
+    except (Fault, OSError, subprocess.TimeoutExpired):
+        return False
+
+
+def findings(scratch):
+    """The document of a check, and its SARIF: by the schema that others wrote, and their reader."""
+    schema = json.loads((ROOT / "docs/check.schema.json").read_text())
+    fetched = npm(scratch, "install", "--ignore-scripts", "--no-audit", "--no-fund",
+                  "--no-save", *SARIF_PACKAGES)
+    if not fetched:
+        print("  npm reaches no registry: SARIF is not checked", flush=True)
+    for repository, count in [(SAMPLES, 0), (faulty(scratch), 3)]:
+        done = {form: subprocess.run([KEL, "-L", repository, "check", "--format", form,
+                                      "--relative-to", repository], capture_output=True, timeout=60)
+                for form in ["json", "sarif"]}
+        document, log = [json.loads(done[form].stdout) for form in ["json", "sarif"]]
+        expect(len(document["findings"]), count, "the number of findings")
+        expect(done["sarif"].returncode, 1 if count else 0, "the status")
+        strictly_valid(document, schema)
+        results = log["runs"][0]["results"]
+        expect([result["ruleId"] for result in results],
+               [finding["code"] for finding in document["findings"]], "the rules")
+        addresses = [result["locations"][0]["physicalLocation"]["artifactLocation"]["uri"]
+                     for result in results]
+        expect([urllib.parse.unquote(address) for address in addresses],
+               [finding["file"] for finding in document["findings"]], "the addresses")
+        if fetched:
+            others_read(log, count, scratch)
+
+
+def others_read(log, count, scratch):
+    modules = scratch / "node_modules"
+    schema = json.loads((modules / SARIF_SCHEMA).read_text())
+    validator = jsonschema.validators.validator_for(schema)(schema)
+    if fault := jsonschema.exceptions.best_match(validator.iter_errors(log)):
+        raise Fault(f"{list(fault.path)}: {fault.message}")
+    (scratch / "log.sarif").write_text(json.dumps(log))
+    run("node", modules / "sarif-junit/bin/sarif-junit.js", "-i", "log.sarif", "-o", "log.xml",
+        cwd=scratch)
+    cases = xml.etree.ElementTree.parse(scratch / "log.xml").getroot().findall(".//testcase")
+    expect(len(cases), count, "the number of findings that a reader finds")
+
+
 def main():
     failed = 0
 
@@ -347,6 +408,7 @@ def main():
               ["crc_unit_w8_small.edif", *more])
     check("netlists again", netlists_again)
     check("odd paths", odd_paths, "o'd \"d\" $x [y] {z} #\\t")
+    check("findings", findings)
     check("terminal", terminal)
     check("odd paths with a line break", odd_paths, "new\nline")
     sys.exit(1 if failed else 0)

@@ -4,9 +4,12 @@
 #include <algorithm>
 #include <iostream>
 
+#include "Codes.h"
 #include "Describe.h"
 #include "Formats.h"
+#include "Nearby.h"
 #include "Tarvo_Version.h"
+#include "Text.h"
 
 namespace {
 
@@ -15,10 +18,12 @@ const char* const kKeyHelp =
 const char* const kGlobHelp = "A key or name, in which * ? [...] stand for any text";
 
 const char* const kFooter =
-    "Exit status: 0 all well, 1 something was found or a key is unknown, 2 the words of\n"
-    "the call are wrong, 3 the repository path can't be set. 'kel help VERB' shows an example.\n";
+    "Exit status: 0 success, 1 an error or warning was found or a key is unknown, 2 usage error,\n"
+    "3 no repository can be read. 'kel help VERB' shows an example, and 'kel help diagnostics'\n"
+    "what check may report.\n";
 
-const char* const kVerbNames = "list, which, show, sources, netlists, check or help";
+const std::vector<std::string> kVerbNames = {"list",     "which", "show", "sources",
+                                             "netlists", "check", "help"};
 
 // A verb, with an example of its use.
 CLI::App* AddVerb(CLI::App& app, Call& call, const char* name, const char* help,
@@ -33,6 +38,11 @@ CLI::App* AddVerb(CLI::App& app, Call& call, const char* name, const char* help,
 }
 
 void AddKey(CLI::App* verb, Call& call) { verb->add_option("KEY", call.key, kKeyHelp)->required(); }
+
+void AddRelativeTo(CLI::App* verb, Call& call) {
+  verb->add_option("--relative-to", call.relativeTo, "Write paths relative to this directory")
+      ->type_name("DIR");
+}
 
 void DescribeList(CLI::App& app, Call& call) {
   CLI::App* const list =
@@ -55,7 +65,7 @@ void DescribeShow(CLI::App& app, Call& call) {
       app, call, "show", "Shows all about a core: place, options, parameters, ports, interfaces",
       "show event_station --section ports");
   AddKey(show, call);
-  show->add_option("--section", call.sections, "One of these alone; may be repeated")
+  show->add_option("--section", call.sections, "Show this section only; may be repeated")
       ->check(CLI::IsMember(SectionNames()))
       ->allow_extra_args(false);
 }
@@ -65,18 +75,17 @@ void DescribeSources(CLI::App& app, Call& call) {
       AddVerb(app, call, "sources", "Lists the HDL sources of a core in analyse order",
               "sources event_station --for simulation --format ghdl");
   AddKey(sources, call);
-  sources->add_option("--for", call.purpose, "What the sources are analysed for")
+  sources->add_option("--for", call.purpose, "What the sources are for")
       ->check(CLI::IsMember({"synthesis", "simulation"}))
       ->required();
   sources
       ->add_option("--format", call.format,
-                   "How they are written: list (a path on a line), json, f (file list for Verilog\n"
+                   "Output format: list (a path on a line), json, f (file list for Verilog\n"
                    "tools), ghdl (script for GHDL), edam (for flow generators), vhdl_ls (for the\n"
                    "VHDL language server) or tcl")
       ->check(CLI::IsMember(FormatNames()))
       ->default_str("list");
-  sources->add_option("--relative-to", call.relativeTo, "Write paths relative to this directory")
-      ->type_name("DIR");
+  AddRelativeTo(sources, call);
 }
 
 std::string CheckSetting(const std::string& setting) {
@@ -95,20 +104,43 @@ void DescribeNetlists(CLI::App& app, Call& call) {
       ->check(CheckSetting)
       ->allow_extra_args(false);
   netlists->add_flag("--table", call.wholeTable,
-                     "List all of them with their values, those that apply marked by *");
+                     "List all of them with their values; * marks those that apply");
+}
+
+std::string CheckWarning(const std::string& choice) {
+  std::vector<std::string> choices = {"error"};
+  for (const auto& code : Codes()) choices.push_back(std::string("no-") + code.code);
+  if (std::find(choices.begin(), choices.end(), choice) != choices.end()) return "";
+  return "'" + choice + "' is neither error nor no-CODE" + DidYouMean(choices, choice);
 }
 
 void DescribeCheck(CLI::App& app, Call& call) {
-  CLI::App* const check = AddVerb(
-      app, call, "check", "Opens every core and all that belongs to it, and lists what is wrong",
-      "check 'pulse*'");
+  CLI::App* const check =
+      AddVerb(app, call, "check", "Lists what is wrong with the cores, at its file and line",
+              "check 'pulse*' -W error");
   check->add_option("GLOB", call.keys, kGlobHelp);
+  check
+      ->add_option("--format", call.format,
+                   "Output format: text, json or sarif (for code hosts and editors)")
+      ->check(CLI::IsMember({"text", "json", "sarif"}))
+      ->default_str("text");
+  check->add_flag("--excerpts", call.withExcerpts,
+                  "Show lines, help and related places, as on a terminal");
+  check
+      ->add_option("-W", call.warnings,
+                   "error: warnings count as errors; no-CODE: leave out this code; may be repeated")
+      ->type_name("CHOICE")
+      ->check(CheckWarning)
+      ->allow_extra_args(false);
+  AddRelativeTo(check, call);
 }
 
 void DescribeHelp(CLI::App& app, Call& call) {
-  CLI::App* const help = AddVerb(app, call, "help", "Shows this help, or that of a verb", "");
-  help->footer("Example: kel help list\n");
-  help->add_option("VERB", call.key, "The verb");
+  CLI::App* const help =
+      AddVerb(app, call, "help", "Shows this help, that of a verb, or what a diagnostic means", "");
+  help->footer("Examples: kel help list, kel help list-ends\n");
+  help->add_option("TOPIC", call.key,
+                   "A verb, a code of a diagnostic, or diagnostics for all codes");
 }
 
 void DescribeCall(CLI::App& app, Call& call) {
@@ -121,8 +153,8 @@ void DescribeCall(CLI::App& app, Call& call) {
       ->type_name("DIR")
       ->allow_extra_args(false);
   app.add_flag("--json", call.asJson, "Write a JSON document");
-  app.add_flag("--trace", call.withTraces, "Tell on standard error what is read");
-  app.add_flag("--quiet", call.quiet, "Leave out messages and notes; the exit status tells");
+  app.add_flag("--trace", call.withTraces, "Show on standard error what is read");
+  app.add_flag("--quiet", call.quiet, "Leave out messages and notes; see the exit status");
   app.add_option("--color", call.color, "Whether messages are coloured")
       ->check(CLI::IsMember({"auto", "always", "never"}))
       ->default_str("auto");
@@ -137,7 +169,9 @@ void DescribeCall(CLI::App& app, Call& call) {
 }
 
 std::string NoVerb(const std::string& word) {
-  return "there is no verb '" + word + "', but " + kVerbNames;
+  const std::string question = DidYouMean(kVerbNames, word);
+  return "unknown verb '" + word + "'" +
+         (question.empty() ? "; the verbs are " + Join(kVerbNames) : question);
 }
 
 // What is wrong with a call that parsed, or an empty text.
@@ -146,12 +180,12 @@ std::string Fault(const CLI::App& app, const Call& call) {
   if (call.verb.empty() && !extras.empty() && extras.front().front() != '-') {
     return NoVerb(extras.front());
   }
-  if (!extras.empty()) return "'" + extras.front() + "' is not expected here";
-  if (call.verb.empty()) return std::string("a verb is required: ") + kVerbNames;
+  if (!extras.empty()) return "unexpected argument '" + extras.front() + "'";
+  if (call.verb.empty()) return "a verb is required: " + Join(kVerbNames);
   if (call.asJson && !call.format.empty() && call.format != "json") {
-    return "--json and --format " + call.format + " exclude each other";
+    return "--json and --format " + call.format + " can't be used together";
   }
-  if (call.libraries.empty()) return "-L DIR is required, the repository to ask";
+  if (call.libraries.empty()) return "-L DIR is required; it names a repository";
   const bool empty = std::any_of(
       call.libraries.begin(), call.libraries.end(),
       [](const std::string& path) { return path.find_first_not_of(';') == std::string::npos; });
@@ -195,7 +229,15 @@ void Unmark(Call& call) {
   }
 }
 
+std::string NoTopic(const std::string& word) {
+  std::vector<std::string> topics = kVerbNames;
+  topics.emplace_back("diagnostics");
+  for (const auto& code : Codes()) topics.emplace_back(code.code);
+  return "no help on '" + word + "'" + DidYouMean(topics, word);
+}
+
 Status ShowHelp(const CLI::App& app, const std::string& verb) {
+  if (ShowCodes(verb)) return StatusClean;
   try {
     const CLI::App* const shown = verb.empty() ? &app : app.get_subcommand(verb);
     // The application's own operation would give the help of the verb `help`.
@@ -203,7 +245,7 @@ Status ShowHelp(const CLI::App& app, const std::string& verb) {
                                                 CLI::AppFormatMode::Normal);
     return StatusClean;
   } catch (const CLI::OptionNotFound&) {
-    return Refuse(NoVerb(verb), "");
+    return Refuse(NoTopic(verb), "");
   }
 }
 

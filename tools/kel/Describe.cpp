@@ -6,9 +6,9 @@
 #include <string_view>
 
 #include "Tarvo_KelLibrary_Utils.h"
+#include "Tarvo_Kel_Index.h"
 #include "Tarvo_QVRParser.h"
 #include "Text.h"
-#include "Verbs.h"
 
 namespace {
 
@@ -19,12 +19,6 @@ using Tarvo::KelLibrary;
 using Tarvo::QVRParser;
 using Tarvo::StringBase;
 using Tarvo::StringList;
-
-Json Texts(const StringList& list) {
-  Json texts = Json::array();
-  for (const StringBase& text : list) texts.push_back(Text(text));
-  return texts;
-}
 
 // Gives `visit` each name once.
 template <class Visit>
@@ -151,14 +145,12 @@ Json Interfaces(const KelIP& ip) {
   return interfaces;
 }
 
-Json Place(const KelLibrary& library, const Call& call, const KelIP& ip) {
+Json Place(const KelLibrary& library, const KelIP& ip) {
   const Kel_Key key(ip.GetKey());
   const std::string location = Text(ip.GetLocation());
   Json hidden = Json::array();
-  for (const VersionDirectory& directory : VersionDirectories(call)) {
-    std::error_code error;
-    const bool isOwn = fs::equivalent(directory.path, location, error);
-    if (directory.key == key && !isOwn) hidden.push_back(directory.path);
+  for (const Port::FileName& directory : library.GetIndex().GetHiddenLocations(key)) {
+    hidden.push_back(Text(directory.GetAbsolutePath()));
   }
   Json others = Json::array();
   StringList keys;
@@ -177,13 +169,13 @@ Json Place(const KelLibrary& library, const Call& call, const KelIP& ip) {
 
 // A section that the instance alone can tell.
 template <Json (*Tell)(const KelIP&)>
-Json OfInstance(const KelLibrary& /*library*/, const Call& /*call*/, const KelIP& ip) {
+Json OfInstance(const KelLibrary& /*library*/, const KelIP& ip) {
   return Tell(ip);
 }
 
 struct Section {
   const char* name;
-  Json (*make)(const KelLibrary& library, const Call& call, const KelIP& ip);
+  Json (*make)(const KelLibrary& library, const KelIP& ip);
 };
 const Section kMakers[] = {{"place", Place},
                            {"options", OfInstance<Options>},
@@ -205,7 +197,7 @@ Json Describe(const KelLibrary& library, const Call& call, const KelIP& ip) {
     const auto& chosen = call.sections;
     const bool isWanted =
         chosen.empty() || std::find(chosen.begin(), chosen.end(), section.name) != chosen.end();
-    if (isWanted) core[section.name] = section.make(library, call, ip);
+    if (isWanted) core[section.name] = section.make(library, ip);
   }
   return core;
 }

@@ -9,6 +9,7 @@
 #include <sstream>
 #include <string_view>
 
+#include "Json.h"
 #include "Messages.h"
 #include "Table.h"
 #include "Text.h"
@@ -31,19 +32,20 @@ std::string Backslashed(const std::string& text, std::string_view special) {
 }
 
 std::string ShellWord(const std::string& text) {
-  const auto isPlain = [](char c) {
-    return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z') || (c >= '0' && c <= '9') ||
-           std::string_view("_-./,:+@%").find(c) != std::string_view::npos;
-  };
+  const auto isPlain = [](char c) { return IsPlain(c, "_-./,:+@%"); };
   if (!text.empty() && std::all_of(text.begin(), text.end(), isPlain)) return text;
   std::string word = "'";
   for (const char c : text) word += c == '\'' ? std::string("'\\''") : std::string(1, c);
   return word + "'";
 }
 
-// A string of a document, with quotes, as JSON and TOML have it.
-std::string Quoted(const std::string& text) {
-  return Json(text).dump(-1, ' ', false, Json::error_handler_t::replace);
+// A string with quotes. TOML takes what JSON does, but for one control character.
+std::string TomlString(const std::string& text) {
+  std::string quoted = Json(text).dump(-1, ' ', false, Json::error_handler_t::replace);
+  for (std::size_t at; (at = quoted.find('\x7F')) != std::string::npos;) {
+    quoted.replace(at, 1, "\\u007F");
+  }
+  return quoted;
 }
 
 std::string TclWord(const std::string& text) {
@@ -62,13 +64,13 @@ std::string GlobLiteral(const std::string& path) {
   return pattern;
 }
 
-void WriteList(const SourceList& list) {
+void WriteList(std::ostream& output, const SourceList& list) {
   Table table;
   for (const Source& source : list.sources) table.Add({source.path});
-  table.Write();
+  table.Write(output);
 }
 
-void WriteJsonList(const SourceList& list) {
+void WriteJsonList(std::ostream& output, const SourceList& list) {
   Json sources = Json::array();
   Json libraries = Json::array();
   for (const Source& source : list.sources) {
@@ -85,31 +87,32 @@ void WriteJsonList(const SourceList& list) {
              {"purpose", list.purpose},
              {"libraries", libraries},
              {"sources", sources},
-             {"include_directories", directories}});
+             {"include_directories", directories}},
+            output);
 }
 
 // Comments name the libraries, which the format can't say.
-void WriteFileList(const SourceList& list) {
+void WriteFileList(std::ostream& output, const SourceList& list) {
   const std::string_view special = " \t\\\"$";
   for (const IncludeDirectory& directory : list.includeDirectories) {
-    std::cout << "+incdir+" << Backslashed(directory.path, special) << '\n';
+    output << "+incdir+" << Backslashed(directory.path, special) << '\n';
   }
   std::string library;
   for (const Source& source : list.sources) {
     if (source.language != kVerilog) continue;
-    if (source.library != library) std::cout << "// library " << source.library << '\n';
+    if (source.library != library) output << "// library " << source.library << '\n';
     library = source.library;
-    std::cout << Backslashed(source.path, special) << '\n';
+    output << Backslashed(source.path, special) << '\n';
   }
 }
 
-void WriteGhdl(const SourceList& list) {
-  std::cout << "#!/bin/sh\n# Analyses into the current directory; GHDL_FLAGS go to every call.\n"
-               "set -e\n";
+void WriteGhdl(std::ostream& output, const SourceList& list) {
+  output << "#!/bin/sh\n# Analyses into the current directory; GHDL_FLAGS go to every call.\n"
+            "set -e\n";
   for (const Source& source : list.sources) {
     if (source.language != kVhdl) continue;
-    std::cout << "ghdl -a $GHDL_FLAGS --work=" << ShellWord(source.library) << ' '
-              << ShellWord(source.path) << '\n';
+    output << "ghdl -a $GHDL_FLAGS --work=" << ShellWord(source.library) << ' '
+           << ShellWord(source.path) << '\n';
   }
 }
 
@@ -122,19 +125,24 @@ Json EdamFile(const Source& source) {
   return file;
 }
 
-// The files of an include directory, by name; none if it can't be read.
+// The files of an include directory, by name. One that can't be read is an error.
 std::vector<std::string> FilesIn(const std::string& directory) {
   std::vector<std::string> files;
   std::error_code error;
-  for (fs::directory_iterator entry(directory, error), end; !error && entry != end;
-       entry.increment(error)) {
-    if (entry->is_regular_file(error)) files.push_back(entry->path().filename());
+  fs::directory_iterator entry(directory, error);
+  while (!error && entry != fs::directory_iterator()) {
+    std::error_code failure;
+    const fs::file_type type = entry->status(failure).type();
+    if (type == fs::file_type::regular) files.push_back(entry->path().filename());
+    if (type == fs::file_type::none) error = failure;
+    if (!error) entry.increment(error);
   }
+  if (error) Messages::Error("Unable to list " + directory + "\n" + error.message());
   std::sort(files.begin(), files.end());
   return files;
 }
 
-void WriteEdam(const SourceList& list) {
+void WriteEdam(std::ostream& output, const SourceList& list) {
   Json files = Json::array();
   for (const IncludeDirectory& directory : list.includeDirectories) {
     for (const std::string& name : FilesIn(directory.location)) {
@@ -146,41 +154,40 @@ void WriteEdam(const SourceList& list) {
   }
   for (const Source& source : list.sources) files.push_back(EdamFile(source));
   const Json document = {{"version", "0.2.1"}, {"name", list.key}, {"files", files}};
-  std::cout << document.dump(2, ' ', false, Json::error_handler_t::replace) << '\n';
+  WriteDocument(output, document);
 }
 
-void WriteVhdlLs(const SourceList& list) {
-  std::cout << "[libraries]\n";
+void WriteVhdlLs(std::ostream& output, const SourceList& list) {
+  output << "[libraries]\n";
   std::string library;
   bool open = false;
   for (const Source& source : list.sources) {
     if (source.language != kVhdl) continue;
     if (!open || source.library != library) {
-      std::cout << (open ? "]\n" : "") << Quoted(source.library) << ".files = [\n";
+      output << (open ? "]\n" : "") << TomlString(source.library) << ".files = [\n";
     }
     library = source.library;
     open = true;
-    std::cout << "  " << Quoted(GlobLiteral(source.path)) << ",\n";
+    output << "  " << TomlString(GlobLiteral(source.path)) << ",\n";
   }
-  if (open) std::cout << "]\n";
+  if (open) output << "]\n";
 }
 
-void WriteTcl(const SourceList& list) {
-  std::cout << "# Each source is a dict of library, language and path.\nset kel_sources {}\n";
+void WriteTcl(std::ostream& output, const SourceList& list) {
+  output << "# Each source is a dict of library, language and path.\nset kel_sources {}\n";
   for (const Source& source : list.sources) {
-    std::cout << "lappend kel_sources [dict create library " << TclWord(source.library)
-              << " language " << TclWord(source.language) << " path " << TclWord(source.path)
-              << "]\n";
+    output << "lappend kel_sources [dict create library " << TclWord(source.library) << " language "
+           << TclWord(source.language) << " path " << TclWord(source.path) << "]\n";
   }
-  std::cout << "set kel_include_directories {}\n";
+  output << "set kel_include_directories {}\n";
   for (const IncludeDirectory& directory : list.includeDirectories) {
-    std::cout << "lappend kel_include_directories " << TclWord(directory.path) << '\n';
+    output << "lappend kel_include_directories " << TclWord(directory.path) << '\n';
   }
 }
 
 struct Format {
   const char* name;
-  void (*write)(const SourceList&);
+  void (*write)(std::ostream& output, const SourceList& list);
   const char* language;  // the only one that it has room for, if there is one
 };
 const Format kFormats[] = {{"list", WriteList, nullptr},   {"json", WriteJsonList, nullptr},
@@ -196,29 +203,8 @@ void NoteWhatIsLeftOut(const Format& format, const SourceList& list) {
                     [&](const Source& source) { return source.language != format.language; });
   if (left == 0) return;
   Messages::Note(std::string("the format ") + format.name + " is for " + format.language +
-                 " alone, and leaves out " + std::to_string(left) + " of " +
+                 " only and leaves out " + std::to_string(left) + " of " +
                  std::to_string(list.sources.size()) + " sources");
-}
-
-// While one of these lives, what is written to standard output is kept.
-class Keeper {
- public:
-  Keeper() : output(std::cout.rdbuf(kept.rdbuf())) {}
-  ~Keeper() { std::cout.rdbuf(output); }
-  Keeper(const Keeper&) = delete;
-  Keeper& operator=(const Keeper&) = delete;
-
-  std::string Text() const { return kept.str(); }
-
- private:
-  std::ostringstream kept;
-  std::streambuf* output;
-};
-
-std::string WrittenBy(const Format& format, const SourceList& list) {
-  const Keeper keeper;
-  format.write(list);
-  return keeper.Text();
 }
 
 }  // namespace
@@ -235,7 +221,8 @@ void WriteSources(const SourceList& list, const std::string& format) {
                    [&](const Format& candidate) { return candidate.name == format; });
   if (chosen == std::end(kFormats)) return;
   NoteWhatIsLeftOut(*chosen, list);
-  if (::isatty(STDOUT_FILENO) == 0) return chosen->write(list);
-  std::istringstream lines(WrittenBy(*chosen, list));
+  if (::isatty(STDOUT_FILENO) == 0) return chosen->write(std::cout, list);
+  std::stringstream lines;
+  chosen->write(lines, list);
   for (std::string line; std::getline(lines, line);) std::cout << Printable(line) << '\n';
 }

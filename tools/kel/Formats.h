@@ -4,8 +4,6 @@
 #include <string>
 #include <vector>
 
-#include "Json.h"
-
 // How the sources of a core are written for the tools that read them.
 //
 //     list       a path on each line

@@ -1,8 +1,5 @@
 #include <algorithm>
 
-#include "Json.h"
-#include "Messages.h"
-#include "Table.h"
 #include "Text.h"
 #include "Verbs.h"
 
@@ -58,10 +55,7 @@ Status List(const KelLibrary& library, const Call& call) {
     const std::string style = Option(library, text, "STYLE");
     const std::string language = Option(library, text, "HDL");
     const std::string description = Option(library, text, "DESC");
-    if (!call.asJson) {
-      table.Add({Text(text), style, language, location, description});
-      continue;
-    }
+    table.Add({Text(text), style, language, location, description});
     cores.push_back({{"key", Text(text)},
                      {"name", Text(key.GetName())},
                      {"version", Text(key.GetVersion())},
@@ -70,12 +64,8 @@ Status List(const KelLibrary& library, const Call& call) {
                      {"location", location},
                      {"description", description}});
   }
-  if (call.asJson) {
-    WriteJson({{"cores", cores}});
-  } else {
-    table.Write();
-  }
+  WriteAnswer(table, {{"cores", cores}}, call.asJson);
   if (core.GetLength() > 0 || globs.empty()) return StatusClean;
-  Messages::Note("no core fits '" + call.key + "'");
+  Messages::Note("no core matches '" + call.key + "'");
   return StatusFindings;
 }

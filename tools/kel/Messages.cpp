@@ -2,13 +2,13 @@
 
 #include <unistd.h>
 
-#include <cstdlib>
 #include <iostream>
 #include <set>
 #include <sstream>
 
+#include "Codes.h"
+#include "Diagnostics.h"
 #include "Port_MsgManData.h"
-#include "Table.h"
 #include "Tarvo_DebugMessenger.h"
 #include "Text.h"
 
@@ -16,68 +16,72 @@ namespace Messages {
 
 namespace {
 
+using Tarvo::KelDiagnostic;
+
 int errorCount = 0;
 bool isQuiet = false;
-bool isColoured = false;
-bool withTraces = false;
+DiagnosticWriter writer;
 std::set<std::string> shownTexts;
 
-struct Lead {
-  const char* word;
-  const char* colour;
-};
-const Lead kError{"error: ", "\x1B[1;31m"};
-const Lead kWarning{"warning: ", "\x1B[1;33m"};
-const Lead kNote{"note: ", "\x1B[1;36m"};
-const Lead kTrace{"trace: ", ""};
-
-bool WantsColour(const std::string& choice) {
-  if (choice != "auto") return choice == "always";
-  const char* const refused = std::getenv("NO_COLOR");
-  const char* const terminal = std::getenv("TERM");
-  const bool isRefused = refused != nullptr && *refused != 0;
-  const bool isDumb = terminal != nullptr && std::string(terminal) == "dumb";
-  return ::isatty(STDERR_FILENO) != 0 && !isRefused && !isDumb;
+void ShowOnce(const std::string& text) {
+  if (!isQuiet && shownTexts.insert(text).second) std::cerr << text;
 }
 
 // Wrapped texts bring line ends of their own, so empty lines are left out.
-void Show(const Lead& lead, const std::string& text) {
-  if (isQuiet) return;
+std::string Wrapped(std::string start, const std::string& text) {
   std::istringstream lines(text);
-  std::string shown = "kel: ";
-  const bool coloured = isColoured && *lead.colour != 0;
-  std::string start = coloured ? std::string(lead.colour) + lead.word + "\x1B[0m" : lead.word;
+  std::string wrapped = "kel: ";
   for (std::string line; std::getline(lines, line);) {
     if (line.empty()) continue;
-    shown += start + Printable(line) + '\n';
+    wrapped += start + Printable(line) + '\n';
     start = "  ";
   }
-  std::cerr << shown;
+  return wrapped;
 }
 
-void ShowMessage(const Port_Message& message) {
-  const bool isWarning = message.severity == Port_Message::Warning;
-  if (!isWarning) ++errorCount;
-  if (shownTexts.insert(message.text).second) Show(isWarning ? kWarning : kError, message.text);
+void Say(KelDiagnostic::Severity severity, const std::string& text) {
+  const std::string lead = std::string(SeverityWord(severity)) + ": ";
+  ShowOnce(Wrapped(writer.withColour ? Coloured(lead, severity) : lead, text));
+}
+
+void TakeMessage(const Port_Message& message, const Tarvo::KelDiagnosticLog& log) {
+  if (message.severity != Port_Message::Warning) ++errorCount;
+  for (const KelDiagnostic& diagnostic : log.Take()) Show(diagnostic);
 }
 
 }  // namespace
 
-void Install(const Call& call) {
+Session::Session(const Call& call) {
   isQuiet = call.quiet;
-  isColoured = WantsColour(call.color);
-  Port_MsgManData::setHandler(ShowMessage);
-  withTraces = call.withTraces;
-  if (!withTraces) return;
+  writer.relativeTo = call.relativeTo;
+  writer.withColour = WantsColour(call.color, STDERR_FILENO);
+  writer.withRelated = true;
+  writer.withHelp = ::isatty(STDERR_FILENO) != 0;
+  Port_MsgManData::setHandler([this](const Port_Message& message) { TakeMessage(message, log); });
+  if (!call.withTraces || isQuiet) return;
   Tarvo::DebugMessengerFactory::GetLogger("BaseIP")->SetSink(
-      [](const Tarvo::StringBase& text) { Trace(Text(text)); });
+      [](const Tarvo::StringBase& text) { std::cerr << Wrapped("trace: ", Text(text)); });
 }
 
-void Trace(const std::string& text) {
-  if (withTraces) Show(kTrace, text);
+Session::~Session() {
+  Tarvo::DebugMessengerFactory::GetLogger("BaseIP")->SetSink({});
+  Port_MsgManData::setHandler({});
 }
 
-void Note(const std::string& text) { Show(kNote, text); }
+void Show(const KelDiagnostic& diagnostic) {
+  if (diagnostic.place.file.GetLength() > 0) {
+    ShowOnce(writer.Write(diagnostic));
+  } else {
+    Say(diagnostic.severity, Text(diagnostic.text));
+  }
+}
+
+void Note(const std::string& text) { Say(KelDiagnostic::Note, text); }
+
+void Error(const std::string& text) {
+  ++errorCount;
+  Say(KelDiagnostic::Error, text);
+}
 
 int ErrorCount() { return errorCount; }
 

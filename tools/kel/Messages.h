@@ -4,20 +4,31 @@
 #include <string>
 
 #include "Call.h"
+#include "Tarvo_KelDiagnostic.h"
 
-// The library's messages and traces, as the command shows them. Standard output is for data alone,
-// so they go to standard error: the first line behind its severity, and what it wraps indented
-// below. A message that was shown already, of a core that is opened twice, is not shown again.
+// What the command says beside its answer, on standard error. What the library finds wrong in a
+// file stands behind its place, and all else behind "kel: " and its severity, with further lines
+// indented. Nothing is shown twice.
 namespace Messages {
 
-// Shows messages from here on, as the call asks for.
-void Install(const Call& call);
+// While one of these lives, each message of the library shows the diagnostics that it comes with.
+// One that comes with none only follows from what was shown.
+class Session {
+ public:
+  explicit Session(const Call& call);
+  ~Session();
+  Session(const Session&) = delete;
+  Session& operator=(const Session&) = delete;
 
-// Shows a trace, if the call asks for traces.
-void Trace(const std::string& text);
+ private:
+  Tarvo::KelDiagnosticLog log;
+};
 
-// The command's own words, which change no status.
+void Show(const Tarvo::KelDiagnostic& diagnostic);
+
+// The command's own words. An error counts as one of the library does.
 void Note(const std::string& text);
+void Error(const std::string& text);
 
 // The number of errors so far, fatal ones included.
 int ErrorCount();

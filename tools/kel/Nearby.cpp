@@ -5,10 +5,9 @@
 #include <numeric>
 #include <set>
 #include <utility>
-#include <vector>
 
 #include "Messages.h"
-#include "Tarvo_Kel_Key.h"
+#include "Tarvo_Kel_Index.h"
 #include "Text.h"
 #include "Verbs.h"
 
@@ -58,33 +57,46 @@ std::set<std::string> RepositoriesNear(const fs::path& directory) {
   return near;
 }
 
-}  // namespace
-
 bool IsNear(const std::string& word, const std::string& text) {
   const std::size_t most = std::max<std::size_t>(1, text.size() / 3);
   if (text.empty() || text.size() > word.size() + most) return false;  // of any length
   return word.rfind(text, 0) == 0 || Distance(word, text) <= most;
 }
 
-void SuggestKeys(const Call& call, const std::string& key) {
+std::string Question(const std::set<std::string>& names) {
+  return names.empty() ? "" : "; did you mean " + Join(names, " or ") + "?";
+}
+
+}  // namespace
+
+std::string DidYouMean(const std::vector<std::string>& words, const std::string& text) {
+  std::set<std::string> near;
+  for (const std::string& word : words) {
+    if (IsNear(word, text)) near.insert(word);
+  }
+  return Question(near);
+}
+
+void SuggestKeys(const Tarvo::KelLibrary& library, const std::string& key) {
   const Kel_Key asked{StringBase(key.c_str())};
   StringBase wanted = asked.GetName();
   wanted.MakeLower();
   std::set<std::string> versions;
   std::set<std::string> names;
-  for (const VersionDirectory& directory : VersionDirectories(call)) {
-    StringBase name = directory.key.GetName();
+  for (const StringBase& text : library.GetIndex().GetAllVersionKeys()) {
+    const Kel_Key other(text);
+    StringBase name = other.GetName();
     if (name == asked.GetName()) {
-      if (!asked.IsValid() || directory.key == asked) return;
-      versions.insert(Text(directory.key.GetKey()));
+      if (!asked.IsValid() || other == asked) return;
+      versions.insert(Text(text));
     }
     name.MakeLower();
-    if (IsNear(Text(name), Text(wanted))) names.insert(Text(directory.key.GetName()));
+    if (IsNear(Text(name), Text(wanted))) names.insert(Text(other.GetName()));
   }
   if (!versions.empty()) {
     Messages::Note("the versions of this core are " + Join(versions));
   } else if (!names.empty()) {
-    Messages::Note("a near name is " + Join(names));
+    Messages::Note("no core is named " + Text(asked.GetName()) + Question(names));
   }
 }
 
@@ -92,9 +104,7 @@ void SuggestRepositories(const Call& call) {
   for (const std::string& repository : Repositories(call)) {
     std::error_code error;
     if (!fs::is_directory(repository, error) || IsRepository(repository)) continue;
-    const fs::path directory = fs::absolute(repository).lexically_normal();
-    const std::string near = Join(RepositoriesNear(directory));
-    Messages::Note(repository + " has no directory 'ipmods', so it is no repository" +
-                   (near.empty() ? "" : "; near it is " + near));
+    const auto near = RepositoriesNear(fs::absolute(repository).lexically_normal());
+    if (!near.empty()) Messages::Note(repository + " is no repository" + Question(near));
   }
 }

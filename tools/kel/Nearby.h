@@ -2,18 +2,21 @@
 #define KEL_NEARBY_H
 
 #include <string>
+#include <vector>
 
 #include "Call.h"
+#include "Tarvo_KelLibrary.h"
 
 // Notes for a key that could not be opened: the versions that its core has, or the names that are
 // near to it. None for a core that is there but can't be opened, whose own error tells enough.
-void SuggestKeys(const Call& call, const std::string& key);
+void SuggestKeys(const Tarvo::KelLibrary& library, const std::string& key);
 
-// A note for each directory of a call that is no repository, with those that are near to it.
+// A note for each directory of a call that is no repository but has some near to it.
 void SuggestRepositories(const Call& call);
 
-// Whether somebody who wrote the text may well have meant the word: it begins so, or differs in at
-// most a third of its letters. Two neighbours that changed places are one difference.
-bool IsNear(const std::string& word, const std::string& text);
+// Those of the words that somebody who wrote the text may well have meant, as a question: a word
+// that begins so, or differs in at most a third of its letters. Two neighbours that changed places
+// are one difference. Empty if there is none.
+std::string DidYouMean(const std::vector<std::string>& words, const std::string& text);
 
 #endif

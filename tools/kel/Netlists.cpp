@@ -1,13 +1,10 @@
-#include "Json.h"
-#include "Messages.h"
-#include "NetlistTable.h"
-#include "Table.h"
 #include "Text.h"
 #include "Verbs.h"
 
 namespace {
 
 using Tarvo::KelIP;
+using Tarvo::KelNetlistTable;
 
 // False, with a warning, for a parameter that the core does not have.
 bool SetParameters(KelIP& ip, const std::vector<std::string>& settings) {
@@ -20,32 +17,37 @@ bool SetParameters(KelIP& ip, const std::vector<std::string>& settings) {
   return true;
 }
 
-void WriteTable(const KelIP& ip, const NetlistTable& netlists, bool asJson) {
-  Table table;
-  Json rows = Json::array();
-  if (!netlists.rows.empty()) {
-    Table::Row head = {"#"};
-    head.insert(head.end(), netlists.parameters.begin(), netlists.parameters.end());
-    head.emplace_back("netlist");
-    table.Add(head);
-  }
-  for (const NetlistTable::Row& row : netlists.rows) {
-    rows.push_back({{"values", row.values}, {"netlists", row.netlists}, {"applies", row.applies}});
-    for (const std::string& netlist : row.netlists) {
-      Table::Row fields = {row.applies ? "*" : ""};
-      fields.insert(fields.end(), row.values.begin(), row.values.end());
-      fields.push_back(netlist);
-      table.Add(fields);
-    }
-  }
-  if (asJson) {
-    WriteJson({{"key", Text(ip.GetKey())}, {"parameters", netlists.parameters}, {"rows", rows}});
-  } else {
-    table.Write();
-  }
+// A line of the table: a mark, a field for each of the texts, and a last one.
+Table::Row TableRow(const char* mark, const Tarvo::StringList& texts, const std::string& last) {
+  Table::Row fields = {mark};
+  for (const Tarvo::StringBase& text : texts) fields.push_back(Text(text));
+  fields.push_back(last);
+  return fields;
 }
 
-void WriteList(const KelIP& ip, const Tarvo::StringList& paths, bool asJson) {
+Status AnswerTable(const KelIP& ip, bool asJson) {
+  KelNetlistTable netlists;
+  if (!Ask(ip, &KelIP::GetNetlistTable, "netlists", netlists)) return StatusFindings;
+  Table table;
+  Json rows = Json::array();
+  if (!netlists.rows.empty()) table.Add(TableRow("#", netlists.parameters, "netlist"));
+  for (const Tarvo::KelNetlistRow& row : netlists.rows) {
+    Json paths = Json::array();
+    for (const Tarvo::KelNetlist& netlist : row.netlists) {
+      paths.push_back(Text(netlist.path));
+      table.Add(TableRow(row.applies ? "*" : "", row.values, Text(netlist.path)));
+    }
+    rows.push_back({{"values", Texts(row.values)}, {"netlists", paths}, {"applies", row.applies}});
+  }
+  const Json parameters = Texts(netlists.parameters);
+  WriteAnswer(table, {{"key", Text(ip.GetKey())}, {"parameters", parameters}, {"rows", rows}},
+              asJson);
+  return StatusClean;
+}
+
+Status AnswerList(const KelIP& ip, bool asJson) {
+  Tarvo::StringList paths;
+  if (!Ask(ip, &KelIP::ListNetlists, "netlists", paths)) return StatusFindings;
   Table table;
   Json netlists = Json::array();
   for (const Tarvo::StringBase& path : paths) {
@@ -54,11 +56,13 @@ void WriteList(const KelIP& ip, const Tarvo::StringList& paths, bool asJson) {
     ip.GetNetlistProperty(path, KelIP::KEL_NETLIST_LIBRARY_PROPERTY, library);
     netlists.push_back({{"path", Text(path)}, {"library", Text(library)}});
   }
-  if (asJson) {
-    WriteJson({{"key", Text(ip.GetKey())}, {"netlists", netlists}});
-  } else {
-    table.Write();
+  WriteAnswer(table, {{"key", Text(ip.GetKey())}, {"netlists", netlists}}, asJson);
+  Tarvo::StringList libraries;
+  const bool hasTable = ip.ListNetlistLibraries(libraries);
+  if (paths.empty() && hasTable) {
+    Messages::Note("no netlist applies to these values; --table lists those for all values");
   }
+  return StatusClean;
 }
 
 }  // namespace
@@ -68,17 +72,5 @@ void WriteList(const KelIP& ip, const Tarvo::StringList& paths, bool asJson) {
 Status Netlists(const Tarvo::KelLibrary& library, const Call& call) {
   const std::unique_ptr<KelIP> ip = OpenCore(library, call);
   if (!ip || !SetParameters(*ip, call.settings)) return StatusFindings;
-  Tarvo::StringList paths;
-  if (!AskForFiles(*ip, &KelIP::ListNetlists, "netlists", paths)) return StatusFindings;
-  if (call.wholeTable) {
-    WriteTable(*ip, ReadNetlistTable(*ip), call.asJson);
-  } else {
-    WriteList(*ip, paths, call.asJson);
-    Tarvo::StringList libraries;
-    const bool hasTable = ip->ListNetlistLibraries(libraries);
-    if (paths.empty() && hasTable) {
-      Messages::Note("no netlist applies at these values; --table shows which would");
-    }
-  }
-  return StatusClean;
+  return call.wholeTable ? AnswerTable(*ip, call.asJson) : AnswerList(*ip, call.asJson);
 }

@@ -5,7 +5,7 @@
 enum Status {
   StatusClean = 0,
   StatusFindings = 1,   // a key was not found, or a message was an error
-  StatusUsage = 2,      // the words of the call are wrong
+  StatusUsage = 2,      // usage error
   StatusUnreadable = 3  // the repository path can't be set
 };
 

@@ -4,9 +4,9 @@
 
 #include <algorithm>
 #include <cstddef>
-#include <iostream>
 #include <utility>
 
+#include "Cells.h"
 #include "Text.h"
 
 void Table::Add(const Row& fields) {
@@ -19,20 +19,21 @@ std::vector<std::size_t> Table::Widths() const {
   std::vector<std::size_t> widths;
   for (const Row& row : rows) {
     widths.resize(std::max(widths.size(), row.size()));
-    for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
+    for (std::size_t i = 0; i < row.size(); ++i) {
+      widths[i] = std::max(widths[i], CountCells(row[i]));
+    }
   }
   return widths;
 }
 
 // The last field of a row needs nothing behind it.
-void Table::Write() const {
+void Table::Write(std::ostream& output) const {
   const bool aligned = ::isatty(STDOUT_FILENO) != 0;
-  const std::vector<std::size_t> widths = Widths();
+  const std::vector<std::size_t> widths = aligned ? Widths() : std::vector<std::size_t>();
   for (const Row& row : rows) {
     for (std::size_t i = 0; i + 1 < row.size(); ++i) {
-      const std::string gap = aligned ? std::string(widths[i] + 2 - row[i].size(), ' ') : "\t";
-      std::cout << row[i] << gap;
+      output << row[i] << (aligned ? std::string(widths[i] + 2 - CountCells(row[i]), ' ') : "\t");
     }
-    std::cout << row.back() << '\n';
+    output << row.back() << '\n';
   }
 }

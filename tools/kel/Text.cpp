@@ -1,39 +1,35 @@
 #include "Text.h"
 
-#include <algorithm>
+#include <filesystem>
 
-std::string Printable(std::string_view text) {
-  constexpr std::string_view digits = "0123456789abcdef";
+std::string Printable(std::string_view text, bool isControl) {
   std::string printable;
   for (const char c : text) {
-    const auto byte = static_cast<unsigned char>(c);
-    if (byte >= ' ' && byte != 0x7F) {
-      printable += c;
-    } else {
-      printable += {'\\', 'x', digits[byte / 16], digits[byte % 16]};
-    }
+    const bool isShown = !isControl && static_cast<unsigned char>(c) >= ' ' && c != '\x7F';
+    printable += isShown ? std::string(1, c) : "\\x" + Hex(c);
   }
   return printable;
 }
 
-std::vector<std::string> Fields(std::string_view line, const std::string& marks) {
-  std::vector<std::string> fields;
-  const std::string ends = " \"'" + marks;
-  while (!line.empty()) {
-    const char first = line.front();
-    const bool quoted = first == '"' || first == '\'';
-    std::size_t size = quoted ? line.find(first, 1) : line.find_first_of(ends);
-    if (size == std::string_view::npos) size = line.size();
-    if (quoted) {
-      fields.emplace_back(line.substr(1, size - 1));
-      ++size;
-    } else if (size > 0) {
-      fields.emplace_back(line.substr(0, size));
-    } else {
-      if (first != ' ') fields.emplace_back(1, first);
-      ++size;
-    }
-    line.remove_prefix(std::min(size, line.size()));
-  }
-  return fields;
+bool IsPlain(char character, std::string_view others) {
+  const auto isIn = [&](char first, char last) { return character >= first && character <= last; };
+  return isIn('a', 'z') || isIn('A', 'Z') || isIn('0', '9') ||
+         others.find(character) != std::string_view::npos;
+}
+
+std::string Hex(char byte) {
+  constexpr std::string_view digits = "0123456789abcdef";
+  const auto number = static_cast<unsigned char>(byte);
+  return {digits[number / 16], digits[number % 16]};
+}
+
+std::string RelativeTo(const std::string& directory, const Tarvo::StringBase& path) {
+  namespace fs = std::filesystem;
+  std::string text = Text(path);
+  if (directory.empty() || text.empty()) return text;
+  const fs::path base = fs::absolute(directory).lexically_normal();
+  const std::string relative =
+      fs::absolute(text).lexically_normal().lexically_relative(base).string();
+  const bool isPlain = relative.find_first_of("-+#/") != 0;
+  return isPlain ? relative : "./" + relative;
 }

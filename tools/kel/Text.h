@@ -3,7 +3,6 @@
 
 #include <string>
 #include <string_view>
-#include <vector>
 
 #include "Tarvo_Export.h"
 
@@ -11,8 +10,14 @@
 inline std::string Text(const Tarvo::StringBase& text) { return std::string(text.View()); }
 
 // The text with control characters written as \xNN, so that a line stays one line and a terminal
-// obeys nothing that a file held.
-std::string Printable(std::string_view text);
+// obeys nothing that a file held. All bytes are written so if they are said to be controls.
+std::string Printable(std::string_view text, bool isControl = false);
+
+// Whether a character is a letter or digit of ASCII, or one of the others.
+bool IsPlain(char character, std::string_view others);
+
+// A byte as two hexadecimal digits.
+std::string Hex(char byte);
 
 // All texts of a list or set, with the same between each two.
 template <class Texts>
@@ -22,8 +27,8 @@ std::string Join(const Texts& texts, const char* between = ", ") {
   return joined;
 }
 
-// The fields of a line of a data file: words between blanks, each of the marks being a field of its
-// own, and what stands between quotes.
-std::vector<std::string> Fields(std::string_view line, const std::string& marks = "");
+// A path relative to a directory, or as it is if there is none. Paths are compared as texts; links
+// are not followed. No relative path begins like an option.
+std::string RelativeTo(const std::string& directory, const Tarvo::StringBase& path);
 
 #endif

@@ -6,7 +6,10 @@
 #include <vector>
 
 #include "Call.h"
+#include "Json.h"
+#include "Messages.h"
 #include "Status.h"
+#include "Table.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary.h"
 #include "Tarvo_Kel_Key.h"
@@ -30,8 +33,7 @@ Status Sources(const Tarvo::KelLibrary& library, const Call& call);
 // The netlists of a core that apply to the values that the call sets.
 Status Netlists(const Tarvo::KelLibrary& library, const Call& call);
 
-// What is wrong with the cores, found by opening all that belongs to them. Sets the repository path
-// itself, and takes the messages of the library over.
+// What is wrong with the cores, or meant otherwise. Sets the repository path itself.
 Status Check(Tarvo::KelLibrary& library, const Call& call);
 
 // What the verbs share.
@@ -42,23 +44,20 @@ bool MatchesAny(const Tarvo::Kel_Key& key, const std::vector<std::string>& globs
 // Opens the core of a call, or suggests other keys.
 std::unique_ptr<Tarvo::KelIP> OpenCore(const Tarvo::KelLibrary& library, const Call& call);
 
-// Asks for the paths of a core's sources or netlists. A core whose style has none gives an empty
-// list and a note that says so. False for a failure.
-bool AskForFiles(const Tarvo::KelIP& ip, bool (Tarvo::KelIP::*question)(Tarvo::StringList&) const,
-                 const char* what, Tarvo::StringList& paths);
-
-// A directory of a repository whose name is a key.
-struct VersionDirectory {
-  Tarvo::Kel_Key key;
-  std::string path;
-};
-// Those of all repositories of a call, in the order of the repositories.
-std::vector<VersionDirectory> VersionDirectories(const Call& call);
+// Asks for a core's sources or netlists. A core whose style has none gives an empty answer and a
+// note that says so. False for a failure.
+bool HasNoneByStyle(const Tarvo::KelIP& ip, const char* what, int errors);
+template <class Answer>
+bool Ask(const Tarvo::KelIP& ip, bool (Tarvo::KelIP::*question)(Answer&) const, const char* what,
+         Answer& answer) {
+  const int errors = Messages::ErrorCount();
+  return (ip.*question)(answer) || HasNoneByStyle(ip, what, errors);
+}
 
 // The repositories of a call, in their order.
 std::vector<std::string> Repositories(const Call& call);
 
-// Joins the repositories as the library takes them.
-Tarvo::StringBase RepositoryPath(const Call& call);
+// Writes an answer, as rows or as a document.
+void WriteAnswer(const Table& table, const Json& members, bool asJson);
 
 #endif

@@ -1,6 +1,4 @@
-#include "Json.h"
 #include "Nearby.h"
-#include "Table.h"
 #include "Text.h"
 #include "Verbs.h"
 
@@ -23,7 +21,7 @@ Status Which(const Tarvo::KelLibrary& library, const Call& call) {
     const StringBase text = asked.c_str();
     const std::string location = Text(library.GetLocation(text));
     if (location.empty()) {
-      SuggestKeys(call, asked);
+      SuggestKeys(library, asked);
       continue;
     }
     const std::string key = Text(Resolve(library, text));
@@ -37,10 +35,6 @@ Status Which(const Tarvo::KelLibrary& library, const Call& call) {
                      {"location", location}});
   }
   const bool foundAll = cores.size() == call.keys.size();
-  if (call.asJson) {
-    WriteJson({{"cores", cores}});
-  } else {
-    table.Write();
-  }
+  WriteAnswer(table, {{"cores", cores}}, call.asJson);
   return foundAll ? StatusClean : StatusFindings;
 }

@@ -3,6 +3,7 @@
 #include <poll.h>
 #include <unistd.h>
 
+#include <clocale>
 #include <csignal>
 #include <exception>
 #include <iostream>
@@ -12,8 +13,7 @@
 #include "Arguments.h"
 #include "Messages.h"
 #include "Nearby.h"
-#include "Tarvo_AppException.h"
-#include "Tarvo_KelLibrary_Utils.h"
+#include "Tarvo_Kel_Index.h"
 #include "Text.h"
 #include "Verbs.h"
 
@@ -28,24 +28,7 @@ std::vector<std::string> Repositories(const Call& call) {
   return repositories;
 }
 
-Tarvo::StringBase RepositoryPath(const Call& call) { return Join(Repositories(call), ";").c_str(); }
-
 namespace {
-
-bool IsPath(const Tarvo::StringBase& path) {
-  try {
-    Tarvo::KelLibrary_Utils::GetPathVector(path);
-    return true;
-  } catch (const Tarvo::AppException&) {
-    return false;
-  }
-}
-
-bool IsEmpty(const Tarvo::KelLibrary& library) {
-  Tarvo::StringList keys;
-  library.ListAllIPKeys(keys);
-  return keys.empty();
-}
 
 using Verb = Status (*)(const Tarvo::KelLibrary&, const Call&);
 const std::map<std::string, Verb> kVerbs = {
@@ -54,13 +37,12 @@ const std::map<std::string, Verb> kVerbs = {
 // Answers from whatever could be read: what could not has its message, and shows in the status,
 // unless it is another core than those that are asked for.
 Status Run(const Call& call) {
-  Messages::Install(call);
+  const Messages::Session session(call);
   Tarvo::KelLibrary library;
-  const Tarvo::StringBase path = RepositoryPath(call);
-  if (call.verb == "check" && IsPath(path)) return Check(library, call);
-  if (!library.SetRepositoryPath(path)) {
+  if (call.verb == "check") return Check(library, call);
+  if (!library.SetRepositoryPath(Join(Repositories(call), ";").c_str())) {
     SuggestRepositories(call);
-    if (!IsPath(path) || IsEmpty(library)) return StatusUnreadable;
+    if (library.GetIndex().GetFullIPCount() == 0) return StatusUnreadable;
   }
   const int walkErrors = call.verb == "list" ? 0 : Messages::ErrorCount();
   const Status status = kVerbs.at(call.verb)(library, call);
@@ -77,6 +59,7 @@ bool IsClosedPipe() {
 
 int main(int argc, char** argv) try {
   if (std::signal(SIGPIPE, SIG_IGN) == SIG_ERR) return StatusFindings;
+  static_cast<void>(std::setlocale(LC_CTYPE, "C.UTF-8"));  // for the width of characters
   Status status = StatusClean;
   const std::optional<Call> call = ReadCall(argc, argv, status);
   if (call) status = Run(*call);

@@ -28,6 +28,11 @@ _kel_keys() {
   words=("${_kel_words[@]}")
 }
 
+# The codes of diagnostics, in `words`.
+_kel_codes() {
+  mapfile -t words < <(command -- "$kel" help diagnostics 2>/dev/null | sed -n 's/^\([a-z-]*\) (.*/\1/p')
+}
+
 # The options that stand behind a verb, in `words`.
 _kel_options() {
   words=(-L --library --json --trace --quiet --color -h --help)
@@ -37,6 +42,7 @@ _kel_options() {
     show) words+=(--section) ;;
     sources) words+=(--for --format --relative-to) ;;
     netlists) words+=(--set --table) ;;
+    check) words+=(--format --excerpts -W --relative-to) ;;
   esac
 }
 
@@ -53,13 +59,18 @@ _kel_candidates() {
       return ;;
     --section) words=(place options parameters ports interfaces); return ;;
     --for) words=(synthesis simulation); return ;;
-    --format) words=(list json f ghdl edam vhdl_ls tcl); return ;;
+    --format)
+      words=(list json f ghdl edam vhdl_ls tcl)
+      [[ $verb != check ]] || words=(text json sarif)
+      return ;;
+    -W) _kel_codes; words=(error "${words[@]/#/no-}"); return ;;
     --color) words=(auto always never); return ;;
     ?*) return ;;
   esac
   case $cur,$verb,$count in
     -*) _kel_options "$verb" ;;
-    *,,* | *,help,0) words=("${verbs[@]}") ;;
+    *,,*) words=("${verbs[@]}") ;;
+    *,help,0) _kel_codes; words=("${verbs[@]}" diagnostics "${words[@]}") ;;
     *,which,* | *,check,* | *,list,0 | *,show,0 | *,sources,0 | *,netlists,0)
       [[ ${#libraries[@]} -eq 0 ]] || _kel_keys "$kel" "${libraries[@]}" ;;
   esac
@@ -85,7 +96,7 @@ _kel() {
     case $option,$word in
       -L,* | --library,*) _kel_plain "$word"; libraries+=(-L "$plain"); option= ;;
       ?*,*) option= ;;
-      ,-L | ,--library | ,--section | ,--for | ,--format | ,--relative-to | ,--set | ,--color)
+      ,-L | ,-W | ,--library | ,--section | ,--for | ,--format | ,--relative-to | ,--set | ,--color)
         option=$word ;;
       ,-L?*) _kel_plain "${word#-L}"; libraries+=(-L "$plain") ;;
       ,--library=*) _kel_plain "${word#*=}"; libraries+=(-L "$plain") ;;

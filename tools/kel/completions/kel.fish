@@ -14,7 +14,7 @@ function __kel_read
                 set option ''
             case '-*,*'
                 set option ''
-            case ,-L ,--library ,--section ,--for ,--format ,--relative-to ,--set ,--color
+            case ,-L ,--library ,--section ,--for ,--format ,--relative-to ,--set ,--color ,-W
                 set option $word
             case ',-L*'
                 set -a __kel_libraries -L (__kel_plain (string sub -s 3 -- $word))
@@ -72,6 +72,12 @@ function __kel_keys
     printf '%s\n' $__kel_words
 end
 
+# The codes of diagnostics.
+function __kel_codes
+    set -l command (__kel_plain (commandline -opc)[1])
+    command $command help diagnostics 2>/dev/null | string match -r '^[a-z-]+(?= \()'
+end
+
 complete -c kel -f
 complete -c kel -s L -l library -x -a '(__fish_complete_directories)' -d 'A repository'
 complete -c kel -l json -d 'Write a JSON document'
@@ -99,5 +105,12 @@ complete -c kel -n '__kel_in sources' -l format -x -a 'list json f ghdl edam vhd
     -d 'How they are written'
 complete -c kel -n '__kel_in sources' -l relative-to -x -a '(__fish_complete_directories)' \
     -d 'Write paths relative to this directory'
+complete -c kel -n '__kel_in check' -l format -x -a 'text json sarif' -d 'How findings are written'
+complete -c kel -n '__kel_in check' -l excerpts -d 'Show lines, help and related places'
+complete -c kel -n '__kel_in check' -s W -x -a '(echo error; printf "no-%s\n" (__kel_codes))' \
+    -d 'What counts as an error, or is left out'
+complete -c kel -n '__kel_in check' -l relative-to -x -a '(__fish_complete_directories)' \
+    -d 'Write paths relative to this directory'
+complete -c kel -n '__kel_in help; and __kel_wants_verb' -a 'diagnostics (__kel_codes)'
 complete -c kel -n '__kel_in netlists' -l set -x -d 'Set a parameter first'
 complete -c kel -n '__kel_in netlists' -l table -d 'List the netlists for all values'
