@@ -87,6 +87,7 @@ COMPARISONS = [
     (order("AnalyseLadder", 11), order("AnalyseLadder", 10), None),
     (order("AnalyseLadder", 12), order("AnalyseLadder", 11), None),
     (order("AnalyseChain", 1000), order("AnalyseChain", 500), None),
+    (Measured("check", "CheckLibrary"), Measured("check", "OpenAndList"), 3),
     (Measured("library", "Add/newest_last/5000"), Measured("library", "Add/many_cores/5000"), 3),
     (Command("kel", "-L", "DIR/described-1000", "list"), Command("ls", "-R", "DIR/described-1000"), None),
 ]

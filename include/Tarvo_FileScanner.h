@@ -37,6 +37,9 @@ class TARVO_EXPORT FileScanner {
   // counted from 1, in bytes, tabs as one. An empty part may stand right behind the line.
   unsigned int GetColumn(std::string_view part) const noexcept;
 
+  // Whether a comment was taken off the last line that was handed out.
+  bool HasComment() const noexcept;
+
   // Makes the first line the next one, without touching the file.
   void GoToStart();
 

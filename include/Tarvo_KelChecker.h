@@ -1,8 +1,8 @@
 #ifndef TARVO_KELCHECKER_H
 #define TARVO_KELCHECKER_H
 
+#include <cstddef>
 #include <functional>
-#include <memory>
 #include <vector>
 
 #include "Tarvo_Export.h"
@@ -34,7 +34,8 @@ class KelLibrary;
 // one at a time, together with the library.
 class TARVO_EXPORT KelChecker {
  public:
-  // Told after each core how many of how many are done.
+  // Told after each core how many of how many are done. It may ask the library and its instances;
+  // what it throws ends the check and passes.
   using Progress = std::function<void(std::size_t done, std::size_t total)>;
 
   explicit KelChecker(const KelLibrary& library);

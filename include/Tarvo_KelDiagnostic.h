@@ -11,8 +11,9 @@ namespace Tarvo {
 class DiagnosticCollector;
 
 // A place in a file. Lines and columns are counted from 1, columns and lengths in bytes of the line
-// as it stands in the file. A 0 means that there is none: a place without a line is the file or
-// directory as a whole, one without a column the whole line. Without a file it is no place at all.
+// as it stands in the file, behind a byte order mark. A 0 means that there is none: a place without
+// a line is the file or directory as a whole, one without a column the whole line. Without a file
+// it is no place at all.
 struct KelPlace {
   StringBase file;
   unsigned line = 0;
@@ -58,7 +59,8 @@ struct KelDiagnosticCode {
 // Messages are issued as ever. What fails without reading a file, such as a question for an unknown
 // key, is kept too, with the code "failed", the lines of its message as text, and no place.
 //
-// Threads: a log belongs to the thread that made it. Logs nest; the innermost one keeps.
+// What memory has no room for is left out. Threads: a log belongs to the thread that made it. Logs
+// nest, and end in reverse order; the innermost one keeps.
 class TARVO_EXPORT KelDiagnosticLog {
  public:
   KelDiagnosticLog();

@@ -105,6 +105,7 @@ class TARVO_EXPORT TEWParser {
   const Kel_Index& index;
   const QVRParser* qvrParser;
   StringBase tewFile;
+  bool isHeaderTold = false;  // while reading: whether a diagnostic says what is wrong with it
   StringList headerNames;
   std::vector<Row> rows;
 };

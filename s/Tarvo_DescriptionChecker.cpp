@@ -45,28 +45,31 @@ const Choice kChoices[] = {
     {QVRStatement::Port, "ENDIAN", {"BIG", "LITTLE"}, false},
     {QVRStatement::Port, "SIGIS", {"CLK", "RST", "INTERRUPT"}, true}};
 
-// What has a value in front of the stated ones, which hides them.
-StringList FixedKeys(QVRStatement::Keyword keyword) {
-  if (keyword == QVRStatement::Parameter) return {"NAME", "VALUE", "DEFAULT_VALUE"};
-  if (keyword == QVRStatement::Port) return {"NAME", "DEFAULT"};
-  if (keyword == QVRStatement::Option) return {"NAME", "VERSION"};
-  return {};
+// The keys of a kind of statement: those that the readers put in front of the stated ones, which
+// they hide, and all that mean something.
+struct Keys {
+  StringList fixed;
+  StringList known;
+};
+
+const Keys& KeysOf(QVRStatement::Keyword keyword) {
+  static const Keys none;
+  static const Keys options{{"NAME", "VERSION"}, PropertyNames::OfCores()};
+  static const Keys parameters{{"NAME", "VALUE", "DEFAULT_VALUE"}, PropertyNames::OfParameters()};
+  static const Keys ports{{"NAME", "DEFAULT"}, PropertyNames::OfPorts()};
+  static const Keys busInterfaces{{}, PropertyNames::OfBusInterfaces()};
+  static const Keys ioInterfaces{{}, PropertyNames::OfIoInterfaces()};
+  static const Keys* const keys[] = {&none,          &options,      &parameters,
+                                     &busInterfaces, &ioInterfaces, &ports};
+  return *keys[keyword];
 }
 
-StringList KnownKeys(QVRStatement::Keyword keyword) {
-  switch (keyword) {
-    case QVRStatement::Parameter:
-      return PropertyNames::OfParameters();
-    case QVRStatement::Port:
-      return PropertyNames::OfPorts();
-    case QVRStatement::BusInterface:
-      return PropertyNames::OfBusInterfaces();
-    case QVRStatement::IoInterface:
-      return PropertyNames::OfIoInterfaces();
-    default:
-      return PropertyNames::OfCores();
-  }
+bool Contains(const StringList& words, std::string_view word) {
+  return std::any_of(words.begin(), words.end(),
+                     [&](const StringBase& known) { return known.View() == word; });
 }
+
+constexpr std::string_view kRestIgnored = "; the rest of the line is ignored";
 
 std::string_view FirstOf(std::string_view text, const char* ends) {
   return text.substr(0, std::max<std::size_t>(1, std::min(text.find_first_of(ends), text.size())));
@@ -115,11 +118,16 @@ class DescriptionChecker {
   bool Declare(QVRStatement::Keyword keyword, Text declared);
   void AddParameter(const QVRStatement::List& list);
   void TellMentions() const;
+  StringList DeclaredNames(QVRStatement::Keyword keyword) const;
 
   template <class... Rest>
   void Tell(const KelDiagnosticCode& code, Text part, const StringBase& text,
             const Rest&... hint) const {
     Diagnosis::Add([&] { return At(code, SpanOf(lines, part), text, hint...); });
+  }
+
+  void TellBad(const LineFault& fault) const {
+    Diagnosis::Add([&] { return TellFault(Codes::kBadStatement, lines, fault); });
   }
 
   StringBase name;
@@ -154,11 +162,16 @@ void DescriptionChecker::CheckLine(Text line) {
 // A line that begins with no keyword is ignored. It may be meant for a statement all the same.
 void DescriptionChecker::CheckKeyword(Text line) {
   const Text word = FirstOf(line, " =,:");
+  const bool isBare = Contains(QVRStatement::ListKeywords(), word);
+  if (isBare) {
+    return Tell(Codes::kUnknownKeyword, word,
+                "the line is ignored; a keyword has a blank and a name after it");
+  }
   const StringList near =
       KelLibrary_Utils::ListNear(StringBase(word), QVRStatement::ListKeywords());
   if (near.empty()) return;
   bad.insert(QVRStatement::KeywordOf(Say({near.front().View(), " "}).View()));
-  Tell(Codes::kUnknownKeyword, word, "unknown keyword, line ignored",
+  Tell(Codes::kUnknownKeyword, word, "unknown keyword; the line is ignored",
        Say({"did you mean ", near.front().View(), "?"}));
 }
 
@@ -169,7 +182,7 @@ bool DescriptionChecker::CheckScanned(Text line) {
   OptionText option;
   LineFault fault;
   const Result result = ReadOption(line, kScannerDelimiters, option, fault);
-  if (result == Unparsable) Tell(Codes::kBadStatement, fault.where, fault.text);
+  if (result == Unparsable) TellBad(fault);
   return result != Unparsable;
 }
 
@@ -179,7 +192,7 @@ void DescriptionChecker::CheckOption(Text line) {
   LineFault fault;
   const auto result =
       QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option, fault);
-  if (result != QVRStatement::Read) return Tell(Codes::kBadStatement, fault.where, fault.text);
+  if (result != QVRStatement::Read) return TellBad(fault);
   if (!Declare(QVRStatement::Option, option.pair.key)) return;
   CheckKey(QVRStatement::Option, {option.pair}, 0, 1);
   const Property stated = QVRStatement::MakeOption(option);
@@ -207,7 +220,7 @@ void DescriptionChecker::CheckList(QVRStatement::Keyword keyword, Text line) {
   if (!QVRStatement::ReadList(line, list, fault) ||
       (isInterface && !QVRStatement::FindName(list, key, position, fault))) {
     bad.insert(keyword);
-    return Tell(Codes::kBadStatement, fault.where, fault.text);
+    return TellBad(fault);
   }
   Declare(keyword, isInterface ? list.pairs[position].value : list.pairs.front().key);
   CheckPairs(keyword, list, isInterface ? 0 : 1);
@@ -215,30 +228,33 @@ void DescriptionChecker::CheckList(QVRStatement::Keyword keyword, Text line) {
   if (keyword == QVRStatement::Parameter) AddParameter(list);
 }
 
-// A comma is missing in front of what looks like a pair. Anything else is the rest of a value that
+// A comma is missing, if one makes a good list of it. Anything else may be the rest of a value that
 // has several words.
 void DescriptionChecker::CheckEnd(const QVRStatement::List& list) {
   if (list.rest.empty()) return;
   if (list.rest == ",") {
     return Tell(Codes::kTrailingComma, list.rest,
-                "the statement ends in a comma, and does not go on in the next line",
-                "take the comma away");
+                "the statement ends in a comma, but can't continue on the next line",
+                "remove the comma");
   }
-  const Text word = FirstOf(list.rest, " ,=()[]\"'");
-  const Text behind = list.rest.substr(word.size());
-  const std::size_t next = behind.find_first_not_of(' ');
-  const bool isPair = next != Text::npos && behind[next] == '=';
   const Pair& last = list.pairs.back();
-  const Text written(last.key.data(), static_cast<std::size_t>(list.rest.data() - last.key.data()));
-  const Text trimmed = written.substr(0, written.find_last_not_of(' ') + 1);
-  if (isPair) {
-    return Tell(Codes::kListEnds, word,
-                Say({"missing ',' before ", word, "; the rest of the line is ignored"}),
-                Say({"write ", trimmed, ", ", list.rest}));
+  const Text word = FirstOf(list.rest, " ,=()[]\"'");
+  if (last.value == "=" || last.value == ",") {
+    const bool isTwice = last.value == "=";
+    return Tell(Codes::kListEnds, last.value,
+                Say({isTwice ? "'=' stands twice" : "missing value after '='", kRestIgnored}));
   }
+  Text written(last.key.data(), static_cast<std::size_t>(list.rest.data() - last.key.data()));
+  written = written.substr(0, written.find_last_not_of(" ;") + 1);
+  const StringBase mended = Say({written, ", ", list.rest});
+  const StringBase line = Say({"PORT ", mended.View()});
+  QVRStatement::List read;
+  LineFault fault;
+  const bool isMended = QVRStatement::ReadList(line.View(), read, fault) && read.rest.empty();
   Tell(Codes::kListEnds, word,
-       Say({"the list ends before ", word, "; the rest of the line is ignored"}),
-       "put a value of several words in quotes");
+       Say({"missing ',' ", isMended ? "" : "or quotes ", "before ", isMended ? "" : "'", word,
+            isMended ? "" : "'", kRestIgnored}),
+       isMended ? Say({"write ", mended.View()}) : StringBase());
 }
 
 void DescriptionChecker::CheckPairs(QVRStatement::Keyword keyword, const QVRStatement::List& list,
@@ -255,23 +271,24 @@ void DescriptionChecker::CheckPairs(QVRStatement::Keyword keyword, const QVRStat
 void DescriptionChecker::CheckKey(QVRStatement::Keyword keyword, const std::vector<Pair>& pairs,
                                   std::size_t at, std::size_t first) {
   const Text key = pairs[at].key;
-  const StringList fixed = FixedKeys(keyword);
-  if (std::find(fixed.begin(), fixed.end(), StringBase(key)) != fixed.end()) {
+  const Keys& keys = KeysOf(keyword);
+  if (Contains(keys.fixed, key)) {
     return Tell(Codes::kDuplicateName, key,
-                Say({key, " has a value already, so this one is never asked"}));
+                Say({"'", key, "' is set already; this value is ignored"}));
   }
   for (std::size_t i = first; i < at; ++i) {
     if (pairs[i].key != key) continue;
     return Diagnosis::Add([&] {
       return Diagnosis::With(At(Codes::kDuplicateName, SpanOf(lines, key),
-                                Say({key, " is given already; the first one counts"})),
+                                Say({"'", key, "' is given already; the first one counts"})),
                              Diagnosis::Here(SpanOf(lines, pairs[i].key)), "first given here");
     });
   }
-  const StringBase meant = FindMisspelt(key, KnownKeys(keyword));
+  if (Contains(keys.known, key)) return;
+  const StringBase meant = FindMisspelt(key, keys.known);
   if (meant.GetLength() == 0) return;
   const char* const kind = keyword == QVRStatement::Option ? "option " : "property ";
-  Tell(Codes::kUnknownProperty, key, Say({"unknown ", kind, key}),
+  Tell(Codes::kUnknownProperty, key, Say({"unknown ", kind, "'", key, "'"}),
        Say({"did you mean ", meant.View(), "?"}));
 }
 
@@ -284,6 +301,7 @@ void DescriptionChecker::CheckValue(QVRStatement::Keyword keyword, const Pair& p
     return Tell(Codes::kBadRange, pair.value, Say({"range can't be read: ", pair.value}),
                 "write (LOW:HIGH), or values with commas between");
   }
+  if (pair.value == "=") return;  // told as the end of the list
   const StringBase value(pair.value);
   for (const Choice& choice : kChoices) {
     if (choice.keyword != keyword || pair.key != choice.key) continue;
@@ -292,9 +310,9 @@ void DescriptionChecker::CheckValue(QVRStatement::Keyword keyword, const Pair& p
     const StringBase meant =
         FindMisspelt(pair.value, StringList(choice.values.begin(), choice.values.end()));
     if (choice.isOpen && meant.GetLength() == 0) return;
-    Tell(Codes::kBadValue, pair.value, Say({"unknown ", pair.key, ": ", pair.value}),
+    Tell(Codes::kBadValue, pair.value, Say({pair.key, " can't be '", pair.value, "'"}),
          meant.GetLength() > 0 ? Say({"did you mean ", meant.View(), "?"})
-                               : Say({"it is ", Joined(choice.values).View()}));
+                               : Say({"write ", Joined(choice.values).View()}));
   }
 }
 
@@ -309,7 +327,7 @@ void DescriptionChecker::CheckVector(const Pair& pair) {
   for (const Text used : range->names) {
     mentions.push_back({QVRStatement::Parameter, &Codes::kBadRange, StringBase(used),
                         Diagnosis::Here(SpanOf(lines, used)),
-                        Say({"the core has no parameter ", used})});
+                        Say({"the core has no parameter '", used, "'"})});
   }
 }
 
@@ -317,7 +335,7 @@ void DescriptionChecker::CheckInterfaces(QVRStatement::Keyword keyword, const Pa
   const bool isBus = pair.key == QVRParser::QVR_BUS_IF_NAME.View();
   if (!isBus && pair.key != QVRParser::QVR_IO_IF_NAME.View()) return;
   const char* const what = keyword == QVRStatement::Port ? "port" : "parameter";
-  const char* const kind = isBus ? " of a bus interface" : " of an I/O interface";
+  const char* const kind = isBus ? "bus interface " : "I/O interface ";
   for (Text rest = pair.value; !rest.empty();) {
     const Text piece = rest.substr(0, rest.find(':'));
     rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
@@ -325,7 +343,7 @@ void DescriptionChecker::CheckInterfaces(QVRStatement::Keyword keyword, const Pa
     mentions.push_back({isBus ? QVRStatement::BusInterface : QVRStatement::IoInterface,
                         &Codes::kUndeclaredInterface, StringBase(piece),
                         Diagnosis::Here(SpanOf(lines, piece)),
-                        Say({what, kind, " that is not declared: ", piece})});
+                        Say({kind, "'", piece, "' of this ", what, " is not declared"})});
   }
 }
 
@@ -336,8 +354,8 @@ bool DescriptionChecker::Declare(QVRStatement::Keyword keyword, Text declared) {
   if (isNew) return true;
   Diagnosis::Add([&, first = known->second] {
     return Diagnosis::With(At(Codes::kDuplicateName, SpanOf(lines, declared),
-                              Say({QVRStatement::ListKeywords()[keyword - 1].View(), " ", declared,
-                                   " is declared already; the first one counts"})),
+                              Say({QVRStatement::ListKeywords()[keyword - 1].View(), " '", declared,
+                                   "' is declared already; the first one counts"})),
                            first, "first declared here");
   });
   return false;
@@ -352,22 +370,32 @@ void DescriptionChecker::AddParameter(const QVRStatement::List& list) {
   core.parameters.push_back(std::move(parameter));
 }
 
-// A bad statement may be the one that declares what is missing.
+// Each name once, with the other places that name it. A bad statement may be the one that declares
+// what is missing.
 void DescriptionChecker::TellMentions() const {
+  std::map<std::pair<QVRStatement::Keyword, StringBase>, KelDiagnostic> missing;
   for (const Mention& mention : mentions) {
-    const bool isDeclared = declarations.count({mention.declaredBy, mention.name}) > 0;
-    if (isDeclared || bad.count(mention.declaredBy) > 0) continue;
-    StringList declared;
-    for (const auto& [key, place] : declarations) {
-      if (key.first == mention.declaredBy) declared.push_back(key.second);
+    const std::pair key(mention.declaredBy, mention.name);
+    if (declarations.count(key) > 0 || bad.count(mention.declaredBy) > 0) continue;
+    const auto [known, isNew] = missing.try_emplace(key, At(*mention.code, {}, mention.text));
+    if (isNew) {
+      known->second.place = mention.place;
+      known->second.hint = DidYouMean(mention.name.View(), DeclaredNames(mention.declaredBy));
+    } else {
+      known->second.related.push_back({mention.place, "named here too"});
     }
-    Diagnosis::Add([&] {
-      KelDiagnostic told =
-          At(*mention.code, {}, mention.text, DidYouMean(mention.name.View(), declared));
-      told.place = mention.place;
-      return told;
-    });
   }
+  for (const auto& [key, diagnostic] : missing) {
+    Diagnosis::Add([&found = diagnostic] { return found; });
+  }
+}
+
+StringList DescriptionChecker::DeclaredNames(QVRStatement::Keyword keyword) const {
+  StringList names;
+  for (const auto& [key, place] : declarations) {
+    if (key.first == keyword) names.push_back(key.second);
+  }
+  return names;
 }
 
 }  // namespace

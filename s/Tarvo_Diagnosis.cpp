@@ -86,6 +86,12 @@ StringBase Say(std::initializer_list<std::string_view> pieces) {
   return StringBase(std::string_view(text));
 }
 
+bool MayHint() noexcept {
+  if (!innermost || innermost->hintsLeft == 0) return false;
+  --innermost->hintsLeft;
+  return true;
+}
+
 bool GoesOn() noexcept {
   return innermost != nullptr && innermost->mode == DiagnosticCollector::InsteadOfMessages;
 }

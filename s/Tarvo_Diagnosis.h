@@ -28,6 +28,9 @@ class DiagnosticCollector {
   const Mode mode;
   std::vector<KelDiagnostic> found;
   bool isIncomplete = false;
+  // How many names may still be compared with all others for a hint. So a file full of unknown
+  // names costs no more than it is worth.
+  unsigned hintsLeft = 100;
 
  private:
   DiagnosticCollector* outer;
@@ -64,6 +67,9 @@ KelPlace Here(Span span = {});
 
 // The pieces of a text, put together.
 StringBase Say(std::initializer_list<std::string_view> pieces);
+
+// Whether a search for near words is worth its while; each one asked for counts.
+bool MayHint() noexcept;
 
 // Whether a reader is to go on behind a fault.
 bool GoesOn() noexcept;

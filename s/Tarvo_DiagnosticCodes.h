@@ -21,8 +21,8 @@ inline constexpr Code kBadHeader{
     "The first line of a table names parameters of the core and ends in the word FILES."};
 inline constexpr Code kBadRange{
     "bad-range", kWarning, "range that can't be read",
-    "A VEC is [LEFT:RIGHT]; a RANGE is (LOW:HIGH), or values with commas between. Both sides are "
-    "expressions of numbers and parameters."};
+    "A VEC is [LEFT:RIGHT]; a RANGE is (LOW:HIGH), or values with commas between. Each side is an "
+    "expression of numbers and parameters."};
 inline constexpr Code kBadRow{
     "bad-row", kError, "row of a table of netlists can't be read",
     "A row has a value for each parameter of the header, and then one or more netlists with commas "
@@ -34,44 +34,46 @@ inline constexpr Code kBadStatement{
     "of several words stands in quotes or brackets. An interface is named by its BUS or IO_IF."};
 inline constexpr Code kBadValue{
     "bad-value", kWarning, "value that an option or a property does not take",
-    "The option STYLE is HDL, BLACKBOX or MIX, and HDL is VHDL, Verilog, MIXED or BOTH. DIR, SIGIS "
-    "and others take a few values as well."};
+    "The option STYLE is HDL, BLACKBOX or MIX, and HDL is VHDL, Verilog, MIXED or BOTH. DIR is I, "
+    "O "
+    "or IO, ENDIAN is BIG or LITTLE, and TYPE of a parameter is HDL or NON_HDL."};
 inline constexpr Code kDuplicateIncludeDirectory{
     "duplicate-include-directory", kError, "second include directory of one library",
     "A library has one Verilog include directory in an analyse order."};
-inline constexpr Code kDuplicateName{"duplicate-name", kWarning, "second declaration of a name",
-                                     "Of options, parameters, ports, interfaces and properties of "
-                                     "one name, the first one answers and "
-                                     "the others are never asked."};
+inline constexpr Code kDuplicateName{
+    "duplicate-name", kWarning, "second declaration of a name",
+    "When a name is declared twice, the first declaration counts and the others are ignored."};
 inline constexpr Code kDuplicateRow{
     "duplicate-row", kWarning, "row that repeats an earlier one",
     "The same netlist is listed at the same values already, so it would be handed on twice."};
 inline constexpr Code kDuplicateSource{
     "duplicate-source", kWarning, "source that is listed already",
     "A source stands in an analyse order once; its first place counts."};
-inline constexpr Code kEmptyOrder{"empty-order", kWarning, "analyse order without a source",
-                                  "A core of sources that lists none gives nothing to analyse."};
+inline constexpr Code kEmptyOrder{
+    "empty-order", kWarning, "analyse order without a source",
+    "The core should have sources, but its order lists none, so there is nothing to analyse."};
 inline constexpr Code kFailed{"failed", kError, "request failed",
                               "The text says what was asked for, and why there is no answer."};
 inline constexpr Code kIgnoredEntry{
     "ignored-entry", kWarning, "entry that is ignored as a whole",
-    "The keyword vlgincdir counts in small letters alone, and with a directory as its last word."};
+    "Write vlgincdir in small letters, and nothing after the directory."};
 inline constexpr Code kIncludeCircle{
     "include-circle", kError, "cores that include each other in a circle",
     "A core can't be analysed before itself. Take one of the includes out."};
 inline constexpr Code kIncludeTooDeep{"include-too-deep", kError, "includes that nest too deep",
-                                      "Cores may include each other 1,000 levels deep."};
+                                      "Cores may include each other at most 1,000 levels deep."};
 inline constexpr Code kLanguageMismatch{"language-mismatch", kError, "file of the other language",
                                         "The extension v is for Verilog and vhd for VHDL. Name the "
                                         "file's language behind it, or set the "
                                         "option HDL of the core."};
 inline constexpr Code kLanguageNotAllowed{
     "language-not-allowed", kError, "language in an order that goes by extensions",
-    "A core whose option HDL is BOTH tells languages by extensions alone. The source is left out."};
-inline constexpr Code kListEnds{"list-ends", kWarning, "list that ends before its line",
-                                "A list is over at the first word that no comma announces, and the "
-                                "rest of the line is ignored. "
-                                "A value of several words needs quotes or brackets."};
+    "A core whose option HDL is BOTH goes by file extensions only. Remove the language; until then "
+    "the source is left out."};
+inline constexpr Code kListEnds{
+    "list-ends", kWarning, "list that ends before the line does",
+    "A list ends at the first word without a comma before it, and the rest of the line is ignored. "
+    "A value of several words needs quotes or brackets."};
 inline constexpr Code kMissingDescription{
     "missing-description", kError, "core without a description",
     "A version is listed only if data/NAME_v2_1_0.qvr is there; NAME is the core's base name."};
@@ -82,8 +84,8 @@ inline constexpr Code kMissingNetlist{"missing-netlist", kError, "netlist does n
                                       "Netlists lie in the directory netlist of their core."};
 inline constexpr Code kMissingOrder{
     "missing-order", kError, "core without an analyse order",
-    "A core whose option STYLE is HDL or MIX, or that another one includes, needs "
-    "data/NAME_v2_1_0.ldx."};
+    "A core needs data/NAME_v2_1_0.ldx if its option STYLE is HDL or MIX, or if another core "
+    "includes it."};
 inline constexpr Code kMissingSource{
     "missing-source", kError, "source does not exist",
     "Sources lie below hdl/vhdl and hdl/verilog of their library."};
@@ -94,27 +96,26 @@ inline constexpr Code kNoLanguage{"no-language", kError, "source without a langu
                                   "A name without the extension v or vhd needs a language behind "
                                   "it, or one from the option HDL."};
 inline constexpr Code kNotAKey{
-    "not-a-key", kWarning, "directory that looks like a core but for its name",
+    "not-a-key", kWarning, "directory that looks like a core except for its name",
     "A version directory bears the version's key, such as abc_v1_00_a. Any other is passed over."};
 inline constexpr Code kNotARepository{
     "not-a-repository", kWarning, "repository without ipmods",
     "A repository is a directory with a subdirectory ipmods, which holds the versions."};
 inline constexpr Code kRowNeverApplies{
     "row-never-applies", kWarning, "row that can never apply",
-    "A row applies when each parameter has just the text of its value. Values stand apart by "
-    "blanks, "
-    "not commas, and should be among those that the parameter takes."};
+    "A row applies when each parameter has exactly the value of the row. Values are separated by "
+    "blanks, not commas, and should be among those that the parameter takes."};
 inline constexpr Code kTrailingComma{"trailing-comma", kWarning, "statement that ends in a comma",
                                      "No statement goes on in the next line."};
 inline constexpr Code kUndeclaredInterface{
-    "undeclared-interface", kWarning, "member of an interface that nothing declares",
+    "undeclared-interface", kWarning, "port or parameter of an undeclared interface",
     "BUS names bus interfaces and IO_IF I/O interfaces that the same description declares."};
 inline constexpr Code kUnknownKeyword{
     "unknown-keyword", kWarning, "line that is nearly a statement",
     "Statements begin with OPTION, PARAMETER, PORT, BUS_INTERFACE or IO_INTERFACE, in capitals and "
     "with a blank behind. Any other line is ignored."};
 inline constexpr Code kUnknownLanguage{
-    "unknown-language", kError, "language that is none",
+    "unknown-language", kError, "unknown language of a source",
     "A source's language is VHDL or Verilog. The source is left out."};
 inline constexpr Code kUnknownLibrary{
     "unknown-library", kError, "core that is not in the library",

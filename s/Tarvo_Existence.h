@@ -32,10 +32,21 @@ inline bool IsFile(const Port::FileName& name) {
   return boost::filesystem::is_regular_file(name.GetName().GetText(), error);
 }
 
-// The same for a directory.
-inline bool IsDirectory(const Port::FileName& name) {
+// What a look at the disk tells of a directory. A link that leads back to itself is none.
+inline Existence LookForDirectory(const Port::FileName& name) {
+  namespace errc = boost::system::errc;
   boost::system::error_code error;
-  return boost::filesystem::is_directory(name.GetName().GetText(), error);
+  const auto status = boost::filesystem::status(name.GetName().GetText(), error);
+  if (boost::filesystem::is_directory(status)) return Existence::Yes;
+  const bool isKnown = status.type() != boost::filesystem::status_error ||
+                       error == errc::too_many_symbolic_link_levels ||
+                       error == errc::filename_too_long;
+  return isKnown ? Existence::No : Existence::Unknown;
+}
+
+// Whether it is known to be a directory, or a link to one.
+inline bool IsDirectory(const Port::FileName& name) {
+  return LookForDirectory(name) == Existence::Yes;
 }
 
 }  // namespace Tarvo

@@ -110,6 +110,11 @@ unsigned int FileScanner::GetColumn(std::string_view part) const noexcept {
   return static_cast<unsigned>(offset - lastPosition + 1);
 }
 
+bool FileScanner::HasComment() const noexcept {
+  const std::string_view line = std::string_view(text).substr(lastPosition);
+  return line.substr(0, line.find('\n')).find(kComment) != std::string_view::npos;
+}
+
 void FileScanner::GoToStart() {
   current = 0;
   position = 0;

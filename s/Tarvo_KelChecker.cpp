@@ -56,7 +56,8 @@ void ForEachEntry(const fs::path& directory, const Visit& visit) {
   fs::directory_iterator entry(directory, error);
   for (; !error && entry != fs::directory_iterator(); entry.increment(error)) visit(*entry);
   if (!error || error == boost::system::errc::no_such_file_or_directory) return;
-  TellFile(Codes::kUnreadable, directory.c_str(), Say({"can't be read: ", error.message()}));
+  TellFile(Codes::kUnreadable, directory.c_str(),
+           Say({"the directory can't be read: ", error.message()}));
 }
 
 // One call of a checker.
@@ -77,25 +78,35 @@ class CheckRun {
   void CheckRepository(const fs::path& versions);
   void FindUnlistedIn(const fs::path& directory, const std::set<std::string>& extensions);
 
+  // Does the work, and gathers what is told meanwhile. Only then are messages left out: a caller's
+  // function for the progress may ask the library as ever. True without errors.
+  template <class Work>
+  bool Collect(const Work& work);
+
   const KelLibrary& library;
   const Kel_Index& index;
-  DiagnosticCollector collector{DiagnosticCollector::InsteadOfMessages};
   OrderChecker orders;
+  std::vector<KelDiagnostic> found;
   std::set<StringBase> faulty;  // keys of cores with errors
 };
+
+template <class Work>
+bool CheckRun::Collect(const Work& work) {
+  DiagnosticCollector collector(DiagnosticCollector::InsteadOfMessages);
+  work();
+  if (collector.isIncomplete) throw std::bad_alloc();
+  const bool isGood = std::none_of(collector.found.begin(), collector.found.end(), IsError);
+  std::move(collector.found.begin(), collector.found.end(), std::back_inserter(found));
+  return isGood;
+}
 
 void CheckRun::CheckCores(const StringList& keys, const KelChecker::Progress& progress) {
   std::size_t done = 0;
   for (const StringBase& key : keys) {
-    const std::size_t before = collector.found.size();
-    CheckCore(key);
-    if (std::any_of(collector.found.begin() + static_cast<std::ptrdiff_t>(before),
-                    collector.found.end(), IsError)) {
-      faulty.insert(key);
-    }
+    if (!Collect([&] { CheckCore(key); })) faulty.insert(key);
     if (progress) progress(++done, keys.size());
   }
-  orders.CheckVersions();
+  Collect([&] { orders.CheckVersions(); });
 }
 
 // Files that the style calls for must be there. Where the style is not known, those that are there
@@ -107,7 +118,7 @@ void CheckRun::CheckCore(const StringBase& text) {
     key = index.GetIPKey(Kel_Key(text));
     location = index.GetIPLocation(key);
   } catch (const AppException&) {
-    return TellFile(Codes::kUnknownLibrary, "", Say({"there is no core ", text.View()}));
+    return TellFile(Codes::kUnknownLibrary, "", Say({"there is no core '", text.View(), "'"}));
   }
   const auto file = [&](const StringBase& extension) {
     return Kel_Index::GetDataFile(location, key, extension);
@@ -117,7 +128,7 @@ void CheckRun::CheckCore(const StringBase& text) {
                          const auto& checkFile) {
     if (core.isStyleKnown && !isNeeded) return;
     if (MayExist(name)) return checkFile(name);
-    if (core.isStyleKnown) TellFile(missing, name.GetName(), "does not exist");
+    if (core.isStyleKnown) TellFile(missing, name.GetName(), "the file does not exist");
   };
   check(Codes::kMissingOrder, file(Kel_Index::KEL_LDX_EXTENSION), core.hasSources,
         [&](const FileName& name) { orders.Check(name, key, core.language); });
@@ -129,7 +140,7 @@ DescribedCore CheckRun::CheckDescriptionOf(const FileName& file) {
   DescribedCore unknown;
   unknown.isStyleKnown = false;
   if (!MayExist(file)) {
-    TellFile(Codes::kMissingDescription, file.GetName(), "does not exist");
+    TellFile(Codes::kMissingDescription, file.GetName(), "the file does not exist");
     return unknown;
   }
   try {
@@ -161,20 +172,26 @@ void CheckRun::CheckRepositories() {
   for (const StringBase& repository : library.GetRepositories()) {
     const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
     boost::system::error_code error;
-    if (fs::is_directory(versions, error)) {
-      CheckRepository(versions);
-    } else {
-      TellFile(Codes::kNotARepository, repository, "has no directory ipmods");
-    }
+    const bool isThere = fs::is_directory(versions, error);
+    Collect([&] {
+      if (isThere) return CheckRepository(versions);
+      TellFile(Codes::kNotARepository, repository,
+               "this is no repository, it has no subdirectory ipmods");
+    });
   }
 }
 
 void CheckRun::CheckRepository(const fs::path& versions) {
   ForEachEntry(versions, [&](const fs::directory_entry& entry) {
     const Kel_Key key(StringBase(entry.path().filename().c_str()));
-    if (key.IsValid() || !IsDirectory(DirectoryOf(entry.path() / "data"))) return;
-    TellFile(Codes::kNotAKey, entry.path().c_str(),
-             "is no core, since its name is no key such as abc_v1_00_a");
+    if (key.IsValid()) return;
+    const Existence data = LookForDirectory(DirectoryOf(entry.path() / "data"));
+    if (data == Existence::Yes) {
+      TellFile(Codes::kNotAKey, entry.path().c_str(),
+               "this directory is ignored: its name is not a key such as abc_v1_00_a");
+    } else if (data == Existence::Unknown) {
+      TellFile(Codes::kUnreadable, entry.path().c_str(), "the directory can't be read");
+    }
   });
 }
 
@@ -184,9 +201,11 @@ void CheckRun::FindUnlisted(const StringList& keys) {
     if (faulty.count(text) > 0) continue;
     const fs::path location = index.GetIPLocation(Kel_Key(text)).GetName().GetText();
     const fs::path hdl = location / Kel_Index::KEL_HDL_SUBDIRECTORY.GetText();
-    FindUnlistedIn(hdl / Kel_Index::KEL_VHDL_SUBDIRECTORY.GetText(), {".vhd", ".vhdl"});
-    FindUnlistedIn(hdl / Kel_Index::KEL_VERILOG_SUBDIRECTORY.GetText(), {".v"});
-    FindUnlistedIn(location / Kel_Index::KEL_NETLIST_SUBDIRECTORY.GetText(), {});
+    Collect([&] {
+      FindUnlistedIn(hdl / Kel_Index::KEL_VHDL_SUBDIRECTORY.GetText(), {".vhd", ".vhdl"});
+      FindUnlistedIn(hdl / Kel_Index::KEL_VERILOG_SUBDIRECTORY.GetText(), {".v"});
+      FindUnlistedIn(location / Kel_Index::KEL_NETLIST_SUBDIRECTORY.GetText(), {});
+    });
   }
 }
 
@@ -196,8 +215,11 @@ void CheckRun::FindUnlistedIn(const fs::path& directory, const std::set<std::str
   ForEachEntry(directory, [&](const fs::directory_entry& entry) {
     boost::system::error_code error;
     const fs::path& path = entry.path();
-    if (entry.symlink_status(error).type() == fs::directory_file) {
-      return FindUnlistedIn(path, extensions);
+    const fs::file_type type = entry.symlink_status(error).type();
+    if (type == fs::directory_file) return FindUnlistedIn(path, extensions);
+    if (type == fs::status_error) {
+      return TellFile(Codes::kUnreadable, path.c_str(),
+                      Say({"the file can't be read: ", error.message()}));
     }
     if (!extensions.empty() && extensions.count(path.extension().string()) == 0) return;
     if (orders.IsListed(FileName(path.c_str()))) return;
@@ -206,15 +228,13 @@ void CheckRun::FindUnlistedIn(const fs::path& directory, const std::set<std::str
 }
 
 std::vector<KelDiagnostic> CheckRun::Finish() {
-  if (collector.isIncomplete) throw std::bad_alloc();
-  std::vector<KelDiagnostic> found = std::move(collector.found);
   std::stable_sort(found.begin(), found.end(),
                    [](const auto& left, const auto& right) { return Rank(left) < Rank(right); });
   const auto last =
       std::unique(found.begin(), found.end(),
                   [](const auto& left, const auto& right) { return Rank(left) == Rank(right); });
   found.erase(last, found.end());
-  return found;
+  return std::move(found);
 }
 
 }  // namespace

@@ -75,7 +75,8 @@ bool KelLibraryImpl::AddRepository(const StringBase& repository) {
   const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
   if (!fs::is_directory(versions)) {
     Diagnosis::Add([&] {
-      return Diagnosis::Of(Codes::kNotARepository, repository, "has no directory ipmods");
+      return Diagnosis::Of(Codes::kNotARepository, repository,
+                           "this is no repository, it has no subdirectory ipmods");
     });
     kModule.Warning("Unable to add directory %s to library\n", repository);
     return false;

@@ -93,9 +93,10 @@ Insertion<typename Table::mapped_type> Insert(Table& table, const Kel_Key& key, 
 
 void TellRefused(const Kel_Key& key, const FileName& location) {
   Diagnosis::Add([&] {
-    return key.IsValid()
-               ? Diagnosis::Of(Codes::kUnreadable, location.GetName(), "can't be looked at")
-               : Diagnosis::Of(Codes::kNotAKey, location.GetName(), "its key is no version's");
+    return key.IsValid() ? Diagnosis::Of(Codes::kUnreadable, location.GetName(),
+                                         "the directory can't be read")
+                         : Diagnosis::Of(Codes::kNotAKey, location.GetName(),
+                                         "its name is not a version's key");
   });
 }
 

@@ -19,7 +19,7 @@ bool ReadField(TokenReader& tokens, std::string_view& field, const char* missing
                LineFault& fault) {
   if (tokens.ReadField(field)) return true;
   const std::string_view tried = tokens.GetTried();
-  fault = {tried, tried.empty() ? missing : "quote or bracket is not closed"};
+  fault = {tried, tried.empty() ? missing : "quote or bracket is not closed", !tried.empty()};
   return false;
 }
 
@@ -35,19 +35,19 @@ bool ReadLibraryEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
   entry.forSynthesis = keyword == kBoth || keyword == kSynthesisOnly;
   entry.forSimulation = keyword == kBoth || keyword == kSimulationOnly;
   if (!entry.forSynthesis && !entry.forSimulation) {
-    fault = {keyword, "no entry begins with this word"};
+    fault = {keyword, "unknown keyword", false, true};
     return false;
   }
   if (!ReadField(tokens, entry.library, "missing library", fault)) return false;
-  if (!ReadField(tokens, entry.name, "missing file or 'all'", fault)) return false;
+  if (!ReadField(tokens, entry.name, "missing file name or 'all'", fault)) return false;
   if (Matches(entry.name, kWholeLibrary)) {
     entry.kind = LDXEntry::WholeLibrary;
-    return ReadEnd(tokens, "nothing may stand behind 'all'", fault);
+    return ReadEnd(tokens, "nothing may follow 'all'", fault);
   }
   // A language that is not closed is judged by what there is of it.
   entry.language = tokens.ReadValue().text;
   tokens.Step();
-  return ReadEnd(tokens, "nothing may stand behind the language", fault);
+  return ReadEnd(tokens, "nothing may follow the language", fault);
 }
 
 // A keyword in other letter case, and a line that goes on behind the directory, are ignored.
@@ -67,6 +67,10 @@ bool ReadPathEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
 }
 
 }  // namespace
+
+StringList LDXKeywords() {
+  return {kBoth, kSynthesisOnly, kSimulationOnly, StringBase(kIncludeDirectory)};
+}
 
 bool ReadLDXEntry(std::string_view line, LDXEntry& entry, LineFault& fault) {
   TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);

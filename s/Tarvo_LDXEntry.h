@@ -3,6 +3,7 @@
 
 #include <string_view>
 
+#include "Tarvo_Export.h"
 #include "Tarvo_LineFault.h"
 
 namespace Tarvo {
@@ -26,6 +27,9 @@ struct LDXEntry {
   std::string_view language;  // empty if the entry gives none
   std::string_view rest;      // behind a directory, or all of an ignored line
 };
+
+// The words that entries begin with.
+StringList LDXKeywords();
 
 // Reads an entry. False for a line of another form, with the first thing that is wrong with it; its
 // kind then tells whether it was tried as one for a directory.

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <iterator>
 #include <memory>
+#include <set>
 #include <string>
 #include <string_view>
 #include <tuple>
@@ -56,6 +57,12 @@ struct OpenOrder {
 // The outermost first.
 using OpenOrders = std::vector<OpenOrder>;
 
+// What the readers of one analysis share.
+struct Analysis {
+  OpenOrders open;
+  std::set<StringBase> done;  // for a checker alone: the files that were read to their end
+};
+
 KelPlace PlaceOf(const OpenOrder& open) { return PlaceOf(*open.file, open.entry); }
 
 bool IsBefore(const OpenOrder& left, const OpenOrder& right) {
@@ -77,8 +84,9 @@ FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   FileName file =
       Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION);
   if (MayExist(file)) return file;
-  Diagnosis::Add(
-      [&] { return Diagnosis::Of(Codes::kMissingOrder, file.GetName(), "does not exist"); });
+  Diagnosis::Add([&] {
+    return Diagnosis::Of(Codes::kMissingOrder, file.GetName(), "the file does not exist");
+  });
   throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", file.GetName()));
 }
 
@@ -94,13 +102,15 @@ Kel_Key Resolve(const Kel_Index& index, const Kel_Key& key) {
 // Reads one file. An include makes a further reader, and both work on one list of open files.
 class OrderReader {
  public:
-  OrderReader(const Kel_Index& theIndex, OpenOrders& openOrders, const Kel_Key& version,
+  OrderReader(const Kel_Index& theIndex, Analysis& theAnalysis, const Kel_Key& version,
               const Kel_Key& theRoot, StringBase language, const FileName& theFile)
       : index(theIndex),
-        open(openOrders),
+        analysis(theAnalysis),
+        open(analysis.open),
         key(version),
         core(Resolve(theIndex, version)),
         root(theRoot.IsValid() ? theRoot : version),
+        isRoot(theRoot.IsValid() && version == theRoot),
         hdl(std::move(language)),
         ldxFile(theFile),
         fileName(std::make_shared<const StringBase>(ldxFile.GetName())),
@@ -114,8 +124,8 @@ class OrderReader {
   void Parse();
   void ReadLine(std::string_view line);
   bool AddEntry(const LDXEntry& entry);
-  bool AddFile(const LDXEntry& entry);
-  bool AddDirectory(const LDXEntry& entry);
+  [[gnu::noinline]] bool AddFile(const LDXEntry& entry);
+  [[gnu::noinline]] bool AddDirectory(const LDXEntry& entry);
   bool AddLibrary(const LDXEntry& entry);
   void AddSource(const LDXEntry& entry, const SourcePointer& source);
 
@@ -125,6 +135,7 @@ class OrderReader {
   bool ReportMisplaced(const LDXEntry& entry, const HdlPlacement& placement) const;
   void WarnOfSecond(const Source& source, const char* purpose) const;
   void TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const;
+  KelDiagnostic TellBadEntry(const LineFault& fault) const;
   void TellUnknown(std::string_view library) const;
   void TellIgnored(const LDXEntry& entry) const;
   void TraceKnown(const AnalyseOrder::SourcePointers& sources, const char* purpose,
@@ -142,10 +153,12 @@ class OrderReader {
   }
 
   const Kel_Index& index;
+  Analysis& analysis;
   OpenOrders& open;
   Kel_Key key;   // as given
   Kel_Key core;  // the version that it stands for
   Kel_Key root;
+  bool isRoot;  // whether the key is that of the root again
   StringBase hdl;
   FileName ldxFile;
   std::shared_ptr<const StringBase> fileName;
@@ -154,8 +167,10 @@ class OrderReader {
   SourceMaker maker;
 };
 
+// For a checker, what a file read before has was told, and taken over by what leads to it.
 AnalyseOrder OrderReader::Read() {
   CheckNesting();
+  if (Diagnosis::GoesOn() && !analysis.done.insert(*fileName).second) return {};
   open.push_back({fileName, core, {}});
   try {
     Parse();
@@ -171,7 +186,6 @@ AnalyseOrder OrderReader::Read() {
 // and what is too deep for the stack. A core whose own file is another one than that which is read
 // in its name is no circle.
 void OrderReader::CheckNesting() const {
-  const bool isRoot = !open.empty() && root.IsValid() && key == root;
   const auto same = std::find_if(open.begin(), open.end(), [&](const OpenOrder& outer) {
     return outer.core == core && (isRoot || *outer.file == *fileName);
   });
@@ -206,7 +220,8 @@ void OrderReader::TellCircle(OpenOrders::const_iterator first) const {
                       Say({"circle of includes: ", cores, circle[0].core.GetKey().View()}),
                       "take one of the includes out");
     told.place = PlaceOf(circle[0]);
-    for (std::size_t i = 1; i < circle.size(); ++i) {
+    // Otherwise the includes are told as those that lead here.
+    for (std::size_t i = 1; Diagnosis::GoesOn() && i < circle.size(); ++i) {
       const Kel_Key& next = circle[(i + 1) % circle.size()].core;
       told.related.push_back({PlaceOf(circle[i]), Say({"includes ", next.GetKey().View()})});
     }
@@ -234,13 +249,19 @@ void OrderReader::ReadLine(std::string_view line) {
   LDXEntry entry;
   LineFault fault;
   const bool isRead = ReadLDXEntry(line, entry, fault);
-  if (!isRead) Tell(Codes::kBadEntry, fault.where, [&] { return StringBase(fault.text); });
+  if (!isRead) Diagnosis::Add([&] { return TellBadEntry(fault); });
   if (isRead && AddEntry(entry)) return;
   const char* const kind = entry.kind == LDXEntry::IncludeDirectory ? "path" : "library";
   kModule.Error("LDX unparsable %s entry: %s line %d, %s\n", kind, *fileName,
                 open.back().entry.line, StringBase(line));
   if (Diagnosis::GoesOn()) return;
   throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", *fileName));
+}
+
+KelDiagnostic OrderReader::TellBadEntry(const LineFault& fault) const {
+  KelDiagnostic told = TellFault(Codes::kBadEntry, *lines, fault);
+  if (fault.isKeyword) told.hint = DidYouMean(fault.where, LDXKeywords());
+  return told;
 }
 
 bool OrderReader::AddEntry(const LDXEntry& entry) {
@@ -287,25 +308,30 @@ bool OrderReader::ReportMisplaced(const LDXEntry& entry, const HdlPlacement& pla
     case HdlPlacement::Placed:
       return true;
     case HdlPlacement::UnknownLanguage:
-      Tell(Codes::kUnknownLanguage, language, [&] {
-        return Say({"no such language: ", language, "; the source is left out"});
+      Diagnosis::Add([&] {
+        return Diagnosis::At(
+            Codes::kUnknownLanguage, SpanOf(language),
+            Say({"unknown language '", language, "'; the source is left out"}),
+            DidYouMean(language, {LDXParser::LDX_HDL_VHDL, LDXParser::LDX_HDL_VERILOG}));
       });
       kModule.Error("Unknown HDL language specified\n");
       return true;
     case HdlPlacement::LanguageOnBoth:
       Tell(Codes::kLanguageNotAllowed, language,
-           [] { return "in a core of HDL BOTH no source has a language; it is left out"; });
+           [] { return "a core of HDL BOTH names no languages; the source is left out"; });
       kModule.Error("HDL language specified when IP core is BOTH\n");
       return true;
     case HdlPlacement::AgainstExtension:
       Tell(Codes::kLanguageMismatch, language.empty() ? entry.name : language, [&] {
-        return Say({entry.name, " is listed as ", placement.language.View()});
+        return Say(
+            {"'", entry.name, "' can't be ", placement.language.View(), " by its extension"});
       });
       kModule.Error("File %s declared to be %s\n", file, placement.language);
       return false;
     case HdlPlacement::NeitherLanguageNorExtension:
       Tell(Codes::kNoLanguage, entry.name, [&] {
-        return Say({entry.name, " has neither a language nor an extension"});
+        return Say({"the language of '", entry.name,
+                    "' is unknown: it has no extension v or vhd, and no language is given"});
       });
       kModule.Error("Unable to add file extension to %s\n", file);
       return false;
@@ -328,7 +354,7 @@ void OrderReader::TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier&
     const Source& first = *(earlier.synthesis ? earlier.synthesis : earlier.simulation);
     return Diagnosis::With(
         Diagnosis::At(Codes::kDuplicateSource, SpanOf(entry.name),
-                      Say({entry.name, " of ", first.origin->library->GetKey().View(),
+                      Say({"'", entry.name, "' of ", first.origin->library->GetKey().View(),
                            " is listed already", both ? "" : " for ", both ? "" : purpose})),
         PlaceOf(*first.origin->file, first.mark), "first listed here");
   });
@@ -348,7 +374,7 @@ void OrderReader::TellIgnored(const LDXEntry& entry) const {
   if (!Diagnosis::GoesOn()) return;
   Tell(Codes::kIgnoredEntry, entry.rest, [&] {
     const bool isPath = entry.kind == LDXEntry::IncludeDirectory;
-    return Say({isPath ? "the entry is ignored, since it goes on behind its directory"
+    return Say({isPath ? "the entry is ignored, because something follows the directory"
                        : "the entry is ignored; write vlgincdir in small letters"});
   });
 }
@@ -359,7 +385,7 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
   const Kel_Key libKey(library);
   FileName location = index.GetIPLocation(key);
   location.PushPathEnd(directory);
-  if (!Exists(FileName(location.Normalize()))) {
+  if (!Exists(location)) {  // as the system resolves it, links and all
     Tell(Codes::kMissingIncludeDirectory, entry.name, [&] {
       return Say({"include directory does not exist: ", entry.name});
     });
@@ -374,7 +400,7 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
     Diagnosis::Add([&] {
       return Diagnosis::With(
           Diagnosis::At(Codes::kDuplicateIncludeDirectory, SpanOf(entry.library),
-                        Say({entry.library, " has an include directory already"})),
+                        Say({"'", entry.library, "' has an include directory already"})),
           PlaceOf(*known->file, known->mark), "first given here");
     });
     kModule.Warning("Library %s already has path %s defined\n", library, known->location.GetName());
@@ -393,7 +419,8 @@ bool OrderReader::AddLibrary(const LDXEntry& entry) {
     const FileName libFile = FindOrder(libKey, entry.library);
     order.includes.push_back({library, Resolve(index, libKey), fileName, open.back().entry});
     // Not on the stack, of which each level of a deep chain needs some.
-    const auto nested = std::make_unique<OrderReader>(index, open, libKey, root, language, libFile);
+    const auto nested =
+        std::make_unique<OrderReader>(index, analysis, libKey, root, language, libFile);
     const AnalyseOrder::Known known = order.Append(nested->Read());
     TraceKnown(known.synthesis, kSynthesis, libKey);
     TraceKnown(known.ForSimulation(), kSimulation, libKey);
@@ -464,8 +491,8 @@ StringList ListDirectories(const Kel_Index& index, const AnalyseOrder::SourceLis
 AnalyseOrder ReadAnalyseOrder(const FileName& file, const Kel_Index& index, const Kel_Key& version,
                               const Kel_Key& root, const StringBase& language) {
   CheckRoot(version, root);
-  OpenOrders open;
-  return OrderReader(index, open, version, root, language, file).Read();
+  Analysis analysis;
+  return OrderReader(index, analysis, version, root, language, file).Read();
 }
 
 LDXParser::LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,

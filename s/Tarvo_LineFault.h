@@ -10,6 +10,8 @@ namespace Tarvo {
 struct LineFault {
   std::string_view where;
   const char* text = nullptr;
+  bool isOpen = false;     // a quote or a bracket is not closed
+  bool isKeyword = false;  // the first word is no keyword
 };
 
 }  // namespace Tarvo

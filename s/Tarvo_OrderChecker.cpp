@@ -9,8 +9,10 @@
 #include "Tarvo_AppException.h"
 #include "Tarvo_Diagnosis.h"
 #include "Tarvo_Existence.h"
+#include "Tarvo_KelIP.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_LDXParser.h"
+#include "Tarvo_OptionScanner.h"
 
 namespace Tarvo {
 
@@ -34,6 +36,24 @@ void Tell(const KelDiagnosticCode& code, const KelPlace& place, const StringBase
 
 FileName OrderFile(const Kel_Index& index, const Kel_Key& key) {
   return Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION);
+}
+
+// Whether a file key has neither steps nor doubled slashes.
+bool IsNormal(std::string_view fileKey) {
+  const std::string_view name = fileKey.substr(fileKey.find(' ') + 1);
+  return name.substr(0, 1) != "." && name.find("/.") == std::string_view::npos &&
+         name.find("//") == std::string_view::npos;
+}
+
+// The language that a core's options give it.
+StringBase LanguageOf(const Kel_Index& index, const Kel_Key& key) {
+  StringBase language;
+  try {
+    language =
+        OptionScanner::GetOptionValue(index.GetIPOptions(key), KelIP::KEL_LANGUAGE_OPTION_NAME);
+  } catch (const AppException&) {  // it has none
+  }
+  return language.GetLength() > 0 ? language : LDXParser::LDX_HDL_VHDL;
 }
 
 // One name for each file, however its entry writes it.
@@ -71,24 +91,51 @@ void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringB
 }
 
 bool OrderChecker::IsThere(const FileName& file) {
-  const auto [known, isNew] = files.try_emplace(Normal(file), false);
-  if (isNew) known->second = IsFile(file);
+  const auto [known, isNew] = files.try_emplace(file.GetName(), false);
+  if (isNew) {
+    known->second = IsFile(file);
+    listed.insert(Normal(file));
+  }
   return known->second;
 }
 
-bool OrderChecker::IsListed(const FileName& file) const { return files.count(Normal(file)) > 0; }
+bool OrderChecker::IsListed(const FileName& file) const { return listed.count(Normal(file)) > 0; }
 
 bool OrderChecker::IsIncludeDirectory(const FileName& directory) const {
   return includeDirectories.count(Normal(directory)) > 0;
 }
 
 void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
+  bool isNormal = true;
   for (const AnalyseOrder::Library& library : sources.libraries) {
     for (const auto& source : library.sources) {
+      isNormal = isNormal && IsNormal(source->fileKey.View());
       if (IsThere(source->location)) continue;
       Tell(Codes::kMissingSource, PlaceOf(*source->origin->file, source->mark),
            Say({"source does not exist: ",
                 ShortName(index, *library.key, source->location).View()}));
+    }
+  }
+  if (!isNormal) CheckNames(sources);
+}
+
+// Sources are told apart by their names as written, so that one may be listed twice. Names without
+// a step or a doubled slash are normal as they are.
+void OrderChecker::CheckNames(const AnalyseOrder::SourceList& sources) {
+  std::unordered_map<StringBase, const AnalyseOrder::Source*> known;
+  for (const AnalyseOrder::Library& library : sources.libraries) {
+    for (const auto& source : library.sources) {
+      const auto [first, isNew] = known.try_emplace(Normal(source->location), source.get());
+      if (isNew) continue;
+      const AnalyseOrder::Source& other = *first->second;
+      Diagnosis::Add([&] {
+        KelDiagnostic told =
+            Diagnosis::At(Codes::kDuplicateSource, {},
+                          Say({ShortName(index, *library.key, source->location).View(),
+                               " is listed already under another name"}));
+        told.place = PlaceOf(*source->origin->file, source->mark);
+        return Diagnosis::With(told, PlaceOf(*other.origin->file, other.mark), "first listed here");
+      });
     }
   }
 }
@@ -98,7 +145,7 @@ void OrderChecker::CheckIncludeDirectories(const AnalyseOrder& order, const Kel_
     includeDirectories.insert(Normal(directory.location));
     if (IsDirectory(directory.location)) continue;
     Tell(Codes::kMissingIncludeDirectory, PlaceOf(*directory.file, directory.mark),
-         Say({"include directory is no directory: ",
+         Say({"include directory is not a directory: ",
               ShortName(index, key, directory.location).View()}));
   }
 }
@@ -127,9 +174,10 @@ const OrderChecker::Edges& OrderChecker::EdgesOf(const StringBase& core) {
   const auto [known, isNew] = edges.try_emplace(core);
   if (!isNew) return known->second;
   const Kel_Key key(core);
+  const DiagnosticCollector ignored(DiagnosticCollector::InsteadOfMessages);
   try {
     const AnalyseOrder order =
-        ReadAnalyseOrder(OrderFile(index, key), index, key, Kel_Key(), LDXParser::LDX_HDL_VHDL);
+        ReadAnalyseOrder(OrderFile(index, key), index, key, Kel_Key(), LanguageOf(index, key));
     return edges[core] = MakeEdges(order, key);
   } catch (const AppException&) {
     return edges[core];
@@ -179,17 +227,17 @@ void OrderChecker::TellVersions(const Steps& steps, const StringBase& top, const
   const auto way = [&](const StringBase& to, std::vector<KelRelatedPlace>& places) {
     for (StringBase at = to; at != top;) {
       const Step& step = steps.at(at);
-      places.push_back({step.edge->place, Say({step.from.View(), " takes in ", at.View()})});
+      places.push_back({step.edge->place, Say({step.from.View(), " includes ", at.View()})});
       at = step.from;
     }
   };
   Diagnosis::Add([&] {
     std::vector<KelRelatedPlace> places;
     way(older == top ? newer : older, places);
-    KelDiagnostic told =
-        Diagnosis::At(Codes::kVersionConflict, {},
-                      Say({older.View(), " comes into one order with the newer ", newer.View()}),
-                      Say({"take ", newer.View(), " everywhere"}));
+    KelDiagnostic told = Diagnosis::At(
+        Codes::kVersionConflict, {},
+        Say({older.View(), " and the newer ", newer.View(), " are both in one order"}),
+        Say({"use ", newer.View(), " everywhere"}));
     told.place = places.front().place;
     places.erase(places.begin());
     if (older != top) way(newer, places);

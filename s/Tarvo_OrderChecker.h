@@ -30,7 +30,7 @@ class OrderChecker {
   // Checks that no order takes in two versions of one core: once, behind the others.
   void CheckVersions();
 
-  // Whether a file is known to be there; each is looked at once. A name counts as listed then.
+  // Whether a listed file is known to be there; each is looked at once.
   bool IsThere(const Port::FileName& file);
   bool IsListed(const Port::FileName& file) const;
   // Whether a directory is given to Verilog compilers, whatever it holds.
@@ -52,6 +52,7 @@ class OrderChecker {
   using Steps = std::unordered_map<StringBase, Step>;
 
   void CheckSources(const AnalyseOrder::SourceList& sources);
+  void CheckNames(const AnalyseOrder::SourceList& sources);
   void CheckIncludeDirectories(const AnalyseOrder& order, const Kel_Key& key);
   Edges MakeEdges(const AnalyseOrder& order, const Kel_Key& key) const;
   const Edges& EdgesOf(const StringBase& core);
@@ -62,6 +63,7 @@ class OrderChecker {
 
   const Kel_Index& index;
   std::unordered_map<StringBase, bool> files;  // by name, and whether they are there
+  std::unordered_set<StringBase> listed;       // the same, however their entries write them
   std::unordered_set<StringBase> includeDirectories;
   std::unordered_map<StringBase, Edges> edges;  // by the text of the including core's key
   std::vector<StringBase> tops;

@@ -31,13 +31,16 @@ bool ReadPair(TokenReader& tokens, Pair& pair, LineFault& fault) {
   pair.key = tokens.GetToken();
   tokens.Step();
   if (!tokens.MoreTokens() || tokens.GetToken() != "=") {
-    return Refuse(tokens, "missing '=' behind the name", fault);
+    Refuse(tokens, "missing '=' after the name", fault);
+    if (pair.key == "=") fault = {pair.key, "missing name before '='"};
+    if (pair.key == ",") fault = {pair.key, "one comma too many"};
+    return false;
   }
   tokens.Step();
-  if (!tokens.MoreTokens()) return Refuse(tokens, "missing value behind '='", fault);
+  if (!tokens.MoreTokens()) return Refuse(tokens, "missing value after '='", fault);
   const TokenReader::Value value = tokens.ReadValue();
   pair.value = value.text;
-  if (!value.whole) fault = {tokens.GetTried(), "quote or bracket is not closed"};
+  if (!value.whole) fault = {tokens.GetTried(), "quote or bracket is not closed", true};
   return value.whole;
 }
 
@@ -108,14 +111,14 @@ bool FindName(const List& list, const StringBase& key, std::size_t& position, Li
   for (std::size_t i = 0; i < list.pairs.size(); ++i) {
     if (!Matches(StringBase(list.pairs[i].key), key)) continue;
     if (isNamed) {
-      fault = {list.pairs[i].key, "the interface is named a second time"};
+      fault = {list.pairs[i].key, "the interface has two names"};
       return false;
     }
     isFound = true;
     isNamed = !list.pairs[i].value.empty();
     position = i;
   }
-  if (!isFound) fault = {list.pairs.front().key, "no pair names the interface"};
+  if (!isFound) fault = {list.pairs.front().key, "the interface has no name"};
   return isFound;
 }
 

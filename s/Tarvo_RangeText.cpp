@@ -7,6 +7,8 @@ namespace Tarvo {
 
 namespace {
 
+using Text = std::string_view;
+
 constexpr std::string_view kBlanks = " \t";
 constexpr int kDeepestBracket = 50;
 
@@ -20,6 +22,23 @@ std::string_view Trim(std::string_view text) {
   const std::size_t first = text.find_first_not_of(kBlanks);
   if (first == std::string_view::npos) return {};
   return text.substr(first, text.find_last_not_of(kBlanks) + 1 - first);
+}
+
+std::string_view Unquoted(std::string_view text) {
+  const bool isQuoted = text.size() > 1 && text.front() == text.back() &&
+                        (text.front() == '"' || text.front() == '\'');
+  return isQuoted ? text.substr(1, text.size() - 2) : text;
+}
+
+// Whether brackets close, and no list of two or more dots stands for a range.
+bool IsPlausible(std::string_view text) {
+  int depth = 0;
+  for (const char c : text) {
+    if (c == '(' || c == '[') ++depth;
+    if (c == ')' || c == ']') --depth;
+    if (depth < 0) return false;
+  }
+  return depth == 0 && text.find("..") == std::string_view::npos;
 }
 
 // Passes over an expression:
@@ -106,18 +125,23 @@ std::optional<RangeText> ReadVector(std::string_view text) {
   Expression expression(text, range);
   const bool isRead = expression.Pass('[') && ReadItem(expression, true, range) &&
                       expression.Pass(']') && expression.IsAtEnd();
-  return isRead ? std::optional(range) : std::nullopt;
+  if (isRead) return range;
+  const std::size_t colon = text.find(':');
+  const bool isFramed = text.size() > 4 && text.front() == '[' && text.back() == ']' && colon > 1 &&
+                        colon + 2 < text.size() && text.find(':', colon + 1) == Text::npos;
+  return isFramed && IsPlausible(text) ? std::optional(RangeText()) : std::nullopt;
 }
 
 std::optional<RangeText> ReadRange(std::string_view text) {
   RangeText range;
   Expression expression(text, range);
-  if (!expression.Pass('(')) return std::nullopt;
+  bool isRead = expression.Pass('(');
   do {
-    if (!ReadItem(expression, false, range)) return std::nullopt;
-  } while (expression.Pass(','));
-  if (!expression.Pass(')') || !expression.IsAtEnd()) return std::nullopt;
-  return range;
+    isRead = isRead && ReadItem(expression, false, range);
+  } while (isRead && expression.Pass(','));
+  if (isRead && expression.Pass(')') && expression.IsAtEnd()) return range;
+  const bool isFramed = text.size() > 2 && text.front() == '(' && text.back() == ')';
+  return isFramed && IsPlausible(text) ? std::optional(RangeText()) : std::nullopt;
 }
 
 std::optional<long long> ReadNumber(std::string_view text) {
@@ -138,7 +162,9 @@ std::vector<std::string_view> ReadValues(std::string_view text) {
   while (!text.empty()) {
     const std::string_view part = text.substr(0, text.find(separator));
     text.remove_prefix(std::min(part.size() + 1, text.size()));
-    words.push_back(Trim(part.substr(0, part.find(':'))));
+    const std::string_view word = Unquoted(Trim(part.substr(0, part.find_first_of(":="))));
+    if (word.empty() || !std::all_of(word.begin(), word.end(), IsWordChar)) return {};
+    words.push_back(word);
   }
   return words;
 }

@@ -8,7 +8,8 @@
 namespace Tarvo {
 
 // The ranges of a description: a VEC is "[LEFT:RIGHT]", a RANGE "(ITEM, ...)" with items that are
-// values or LOW:HIGH. All sides are expressions of numbers and names with + - * / and brackets.
+// values or LOW:HIGH. Sides that are sums and products of numbers and names are read; of any other
+// expression only the frame is looked at, and there are no items.
 struct RangeText {
   struct Item {
     std::string_view low;

@@ -19,7 +19,7 @@ bool ReadField(TokenReader& tokens, std::string_view& field, const char* missing
                LineFault& fault) {
   if (tokens.ReadField(field)) return true;
   const std::string_view tried = tokens.GetTried();
-  fault = {tried, tried.empty() ? missing : "quote is not closed"};
+  fault = {tried, tried.empty() ? missing : "quote is not closed", !tried.empty()};
   return false;
 }
 
@@ -43,7 +43,7 @@ bool ReadHeader(std::string_view line, Header& header, LineFault& fault) {
   if (!ReadField(tokens, field, "missing name", fault)) return false;
   while (!Matches(field, kEndOfHeader)) {
     header.names.push_back(field);
-    if (!ReadField(tokens, field, "missing FILES behind the names", fault)) return true;
+    if (!ReadField(tokens, field, "missing FILES after the names", fault)) return true;
   }
   header.isEnded = true;
   return true;
@@ -57,7 +57,7 @@ Result ReadRow(std::string_view line, std::size_t columns, Row& row, LineFault& 
   while (row.values.size() < columns) {
     row.values.push_back(field);
     const bool isLast = row.values.size() == columns;
-    const char* const missing = isLast ? "missing netlist behind the values" : "missing value";
+    const char* const missing = isLast ? "missing netlist after the values" : "missing value";
     if (!ReadField(tokens, field, missing, fault)) return Unparsable;
   }
   row.netlists.push_back(field);

@@ -65,7 +65,7 @@ void TEWParser::Parse(const FileName& file, const Kel_Key& key) {
     if (!line.empty()) ok = ParseRow(lines, line, key);
   }
   if (!ok) {
-    if (!hasHeader) TellMissingHeader();
+    if (!hasHeader && !isHeaderTold) TellMissingHeader();
     throw Report::Told(Report::Exception(AppException::Failure, "Invalid TEW %s\n", tewFile));
   }
   TARVO_TRACE("  Parse successful\n");
@@ -73,11 +73,13 @@ void TEWParser::Parse(const FileName& file, const Kel_Key& key) {
 
 void TEWParser::TellMissingHeader() const {
   Diagnosis::Add([&] {
-    return Diagnosis::Of(Codes::kBadHeader, tewFile, "no line is a header that ends in FILES");
+    return Diagnosis::Of(Codes::kBadHeader, tewFile,
+                         "missing header: names of parameters, then FILES");
   });
 }
 
-// The names of a line that turns out to be no header stay.
+// The names of a line that turns out to be no header stay. Each such line has its message, but only
+// one that ends in FILES was meant for a header.
 bool TEWParser::ParseHeader(const FileScanner& lines, std::string_view line,
                             const NameSet& parameters) {
   TEWLine::Header header;
@@ -89,10 +91,10 @@ bool TEWParser::ParseHeader(const FileScanner& lines, std::string_view line,
     headerNames.emplace_back(name);
   }
   if (header.isEnded && !unknown) return true;
-  Diagnosis::Add([&] {
-    return unknown ? TellUnknownParameter(lines, *unknown, ListParameters())
-                   : TellFault(Codes::kBadHeader, lines, fault);
-  });
+  if (unknown && header.isEnded) {
+    Diagnosis::Add([&] { return TellUnknownParameter(lines, *unknown, ListParameters()); });
+    isHeaderTold = true;
+  }
   kModule.Error("TEW unparsable header: %s line %d, %s\n", tewFile,
                 Port_Input::GetCurrent()->GetLine(), StringBase(line));
   return false;

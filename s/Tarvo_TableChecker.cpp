@@ -57,12 +57,13 @@ class TableChecker {
  private:
   unsigned FindHeader();
   void TellNoHeader(Text line) const;
-  void CheckHeader(Text line);
+  void CheckHeader(Text line, bool isChosen);
   void TellHeader(const TEWLine::Header& header, const LineFault& fault) const;
   void CheckRow(Text line);
   void CheckValues(const TEWLine::Row& row) const;
   void CheckNetlist(const StringList& values, Text text);
-  void CheckEnd(const TEWLine::Row& row) const;
+  bool CheckCommas(const TEWLine::Row& row) const;
+  void CheckEnd(Text line, const TEWLine::Row& row) const;
   const DescribedParameter* FindParameter(const StringBase& parameter) const;
 
   void Tell(const KelDiagnosticCode& code, Text part, const StringBase& text,
@@ -90,7 +91,7 @@ std::vector<ListedNetlist> TableChecker::Check() {
     input.AtLine(number);
     if (line.empty()) continue;
     if (number <= headerLine) {
-      CheckHeader(line);
+      CheckHeader(line, number == headerLine);
     } else if (headerLine > 0) {
       CheckRow(line);
     } else {
@@ -102,26 +103,38 @@ std::vector<ListedNetlist> TableChecker::Check() {
   return std::move(netlists);
 }
 
-// The first line that ends in FILES, also if it names what is no parameter: then its rows are
-// checked all the same. 0 if there is none.
+// The line that the library takes for the header, or else the first that ends in FILES: so the rows
+// of a header with a misspelt name are checked all the same. 0 if there is none.
 unsigned TableChecker::FindHeader() {
+  unsigned first = 0;
   Text line;
   for (unsigned number = 0; lines.GetNextLine(line, number);) {
     TEWLine::Header header;
     LineFault fault;
-    if (TEWLine::ReadHeader(line, header, fault) && header.isEnded) return number;
+    if (!TEWLine::ReadHeader(line, header, fault) || !header.isEnded) continue;
+    const auto isKnown = [&](Text column) { return FindParameter(StringBase(column)) != nullptr; };
+    if (std::all_of(header.names.begin(), header.names.end(), isKnown)) return number;
+    if (first == 0) first = number;
   }
-  return 0;
+  return first;
 }
 
 void TableChecker::TellNoHeader(Text line) const {
-  const char* const text = "missing header of parameters and the word FILES";
-  if (!line.empty()) return Tell(Codes::kBadHeader, line, text);
-  Diagnosis::Add([&] { return Diagnosis::Of(Codes::kBadHeader, name, text); });
+  const char* const text = "missing header: names of parameters, then FILES";
+  TEWLine::Header header;
+  LineFault fault;
+  const bool hasNames = TEWLine::ReadHeader(line, header, fault) && !header.names.empty();
+  if (!hasNames) {
+    return Diagnosis::Add([&] { return Diagnosis::Of(Codes::kBadHeader, name, text); });
+  }
+  const StringBase meant = FindMisspelt(header.names.back(), {"FILES"});
+  const bool isMisspelt = meant.GetLength() > 0;
+  Tell(Codes::kBadHeader, isMisspelt ? header.names.back() : line, text,
+       isMisspelt ? "did you mean FILES?" : "");
 }
 
 // The names of a line that turns out to be no header stay, up to the first that is no parameter.
-void TableChecker::CheckHeader(Text line) {
+void TableChecker::CheckHeader(Text line, bool isChosen) {
   TEWLine::Header header;
   LineFault fault;
   if (!TEWLine::ReadHeader(line, header, fault)) {
@@ -129,14 +142,16 @@ void TableChecker::CheckHeader(Text line) {
   }
   TellHeader(header, fault);
   for (const Text column : header.names) {
-    if (!header.isEnded && !FindParameter(StringBase(column))) return;
-    columns.emplace_back(column);
+    if (!isChosen && !FindParameter(StringBase(column))) return;
+    if (column != ",") columns.emplace_back(column);
   }
 }
 
 void TableChecker::TellHeader(const TEWLine::Header& header, const LineFault& fault) const {
   for (const Text column : header.names) {
-    if (core.hasAllParameters && !FindParameter(StringBase(column))) {
+    if (column == ",") {
+      Tell(Codes::kBadHeader, column, "a comma is read as a name", "separate names by blanks only");
+    } else if (core.hasAllParameters && !FindParameter(StringBase(column))) {
       Diagnosis::Add([&] { return TellUnknownParameter(lines, column, parameters); });
     }
   }
@@ -154,13 +169,26 @@ void TableChecker::CheckRow(Text line) {
   TEWLine::Row row;
   LineFault fault;
   if (TEWLine::ReadRow(line, columns.size(), row, fault) != TEWLine::Read) {
-    Tell(Codes::kBadRow, fault.where, fault.text);
+    Diagnosis::Add([&] { return TellFault(Codes::kBadRow, lines, fault); });
   }
+  if (CheckCommas(row)) return;
   CheckValues(row);
   StringList values;
   for (const Text value : row.values) values.emplace_back(value);
   for (const Text netlist : row.netlists) CheckNetlist(values, netlist);
-  CheckEnd(row);
+  CheckEnd(line, row);
+}
+
+// Whether a comma is read as a value, or as the first netlist: then nothing of the row is as it was
+// meant.
+bool TableChecker::CheckCommas(const TEWLine::Row& row) const {
+  const auto value = std::find(row.values.begin(), row.values.end(), ",");
+  const bool isNetlist = !row.netlists.empty() && row.netlists.front() == ",";
+  if (value == row.values.end() && !isNetlist) return false;
+  Tell(Codes::kRowNeverApplies, isNetlist ? row.netlists.front() : *value,
+       isNetlist ? "the comma is read as a netlist" : "the comma is read as a value",
+       "separate values by blanks only");
+  return true;
 }
 
 void TableChecker::CheckValues(const TEWLine::Row& row) const {
@@ -169,25 +197,24 @@ void TableChecker::CheckValues(const TEWLine::Row& row) const {
     const auto first = std::find(columns.begin(), columns.end(), columns[i]);
     const Text before = row.values[static_cast<std::size_t>(first - columns.begin())];
     const DescribedParameter* const parameter = FindParameter(columns[i]);
-    if (value == ",") {
-      Tell(Codes::kRowNeverApplies, value, "a comma is taken for a value",
-           "put blanks alone between values");
-    } else if (value != before) {
+    if (value != before) {
       Tell(Codes::kRowNeverApplies, value,
-           Say({"the row gives ", columns[i].View(), " two values: ", before, " and ", value}));
+           Say({"the row gives ", columns[i].View(), " two values: '", before, "' and '", value,
+                "'"}));
     } else if (parameter && !MayTake(*parameter, value)) {
       Tell(Codes::kRowNeverApplies, value,
-           Say({columns[i].View(), " does not take the value ", value}));
+           Say({columns[i].View(), " does not take the value '", value, "'"}));
     }
   }
 }
 
 void TableChecker::CheckNetlist(const StringList& values, Text text) {
-  if (text == ",") {
-    return Tell(Codes::kMissingNetlist, text, "a comma is taken for a netlist",
-                "put blanks alone between values");
-  }
+  if (text == ",") return Tell(Codes::kMissingNetlist, text, "one comma too many");
   const TEWLine::Netlist split = TEWLine::SplitNetlist(text);
+  if (split.hasLibrary && split.library.empty()) {
+    return Tell(Codes::kUnknownLibrary, text, "missing library before ':'");
+  }
+  if (split.name.empty()) return Tell(Codes::kMissingNetlist, text, "missing netlist after ':'");
   const Text library = split.hasLibrary ? split.library : key.GetKey().View();
   ListedNetlist netlist{{}, {}, Diagnosis::Here(SpanOf(lines, text))};
   try {
@@ -202,24 +229,32 @@ void TableChecker::CheckNetlist(const StringList& values, Text text) {
   if (!isNew) {
     Diagnosis::Add([&, place = first->second] {
       return Diagnosis::With(At(Codes::kDuplicateRow, SpanOf(lines, text),
-                                Say({split.name, " is listed at these values already"})),
+                                Say({"'", split.name, "' is already listed for these values"})),
                              place, "first listed here");
     });
   }
   netlists.push_back(std::move(netlist));
 }
 
-void TableChecker::CheckEnd(const TEWLine::Row& row) const {
-  if (row.rest.empty() || row.netlists.back() == ",") return;
+void TableChecker::CheckEnd(Text line, const TEWLine::Row& row) const {
+  if (row.rest.empty()) return;
   if (row.rest == ",") {
     return Tell(Codes::kTrailingComma, row.rest,
-                "the row ends in a comma, and does not go on in the next line",
-                "take the comma away");
+                "the row ends in a comma, but can't continue on the next line", "remove the comma");
   }
   const Text word = row.rest.substr(0, row.rest.find_first_of(" ,"));
+  Text last = row.netlists.back();
+  const auto start = static_cast<std::size_t>(last.data() - line.data());
+  last = last.substr(0, last.find_last_not_of(';') + 1);
+  const StringBase mended = Say({line.substr(0, start), last, ", ", row.rest});
+  TEWLine::Row read;
+  LineFault fault;
+  const bool isMended =
+      TEWLine::ReadRow(mended.View(), columns.size(), read, fault) == TEWLine::Read &&
+      read.rest.empty();
   Tell(Codes::kListEnds, word,
        Say({"missing ',' before ", word, "; the rest of the line is ignored"}),
-       Say({"write ", row.netlists.back(), ", ", row.rest}));
+       isMended ? Say({"write ", last, ", ", row.rest}) : StringBase());
 }
 
 }  // namespace

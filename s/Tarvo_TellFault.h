@@ -19,7 +19,9 @@ inline Diagnosis::Span SpanOf(const FileScanner& lines, std::string_view part) {
 // What is wrong with the present line, as a diagnostic.
 inline KelDiagnostic TellFault(const KelDiagnosticCode& code, const FileScanner& lines,
                                const LineFault& fault) {
-  return Diagnosis::At(code, SpanOf(lines, fault.where), fault.text);
+  const bool isCut = fault.isOpen && lines.HasComment();
+  return Diagnosis::At(code, SpanOf(lines, fault.where), fault.text,
+                       isCut ? "'#' begins a comment, in quotes too" : "");
 }
 
 // Opens a data file of a core. One that can't be read is told, with the code for a missing one
@@ -29,8 +31,9 @@ inline FileScanner ScanFile(const Port::FileName& file, const KelDiagnosticCode&
     return FileScanner(file);
   } catch (AppException& exception) {
     Diagnosis::Add([&] {
-      return MayExist(file) ? Diagnosis::Of(Codes::kUnreadable, file.GetName(), "can't be read")
-                            : Diagnosis::Of(missing, file.GetName(), "does not exist");
+      return MayExist(file)
+                 ? Diagnosis::Of(Codes::kUnreadable, file.GetName(), "the file can't be read")
+                 : Diagnosis::Of(missing, file.GetName(), "the file does not exist");
     });
     exception.told = true;
     throw;

@@ -23,6 +23,7 @@ StringBase Sentence(const char* start, const StringList& words, const char* end)
 }
 
 StringBase NearCores(const Kel_Index& index, const Kel_Key& asked) {
+  if (!Diagnosis::MayHint()) return {};
   StringList versions;
   StringList names;
   for (const StringBase& version : index.GetAllVersionKeys()) {
@@ -37,6 +38,7 @@ StringBase NearCores(const Kel_Index& index, const Kel_Key& asked) {
 }  // namespace
 
 StringBase DidYouMean(std::string_view text, const StringList& words) {
+  if (!Diagnosis::MayHint()) return {};
   const StringList near = KelLibrary_Utils::ListNear(StringBase(text), words);
   return near.empty() ? StringBase() : Sentence("did you mean ", near, "?");
 }
@@ -48,7 +50,7 @@ StringBase FindMisspelt(std::string_view text, const StringList& words) {
   const auto fits = [&](const StringBase& word) {
     const bool isAsLong =
         word.GetLength() + 1 >= text.size() && text.size() + 1 >= word.GetLength();
-    return Matches(asked, word) || (text.size() >= 4 && isAsLong);
+    return Matches(asked, word) || (text.size() >= 3 && isAsLong);
   };
   const auto found = std::find_if(near.begin(), near.end(), fits);
   return found == near.end() ? StringBase() : *found;
@@ -57,14 +59,14 @@ StringBase FindMisspelt(std::string_view text, const StringList& words) {
 KelDiagnostic TellUnknownLibrary(const FileScanner& lines, const Kel_Index& index,
                                  std::string_view library) {
   return Diagnosis::At(Codes::kUnknownLibrary, SpanOf(lines, library),
-                       Diagnosis::Say({"there is no core ", library}),
+                       Diagnosis::Say({"there is no core '", library, "'"}),
                        NearCores(index, Kel_Key(StringBase(library))));
 }
 
 KelDiagnostic TellUnknownParameter(const FileScanner& lines, std::string_view name,
                                    const StringList& parameters) {
   return Diagnosis::At(Codes::kUnknownParameter, SpanOf(lines, name),
-                       Diagnosis::Say({"the core has no parameter ", name}),
+                       Diagnosis::Say({"the core has no parameter '", name, "'"}),
                        DidYouMean(name, parameters));
 }
 

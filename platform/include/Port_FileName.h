@@ -70,10 +70,8 @@ class PORT_EXPORT FileName {
   // root or nothing is left.
   StringBase<char> PopPathEnd();
 
-  // The name without "." and ".." steps and repeated separators: what the system finds there is
-  // what it finds under the name itself. A step back from a link leads to where its target lies. A
-  // name without such steps, and one that is not there, is resolved as text. The flag has no
-  // effect.
+  // The name with "." and ".." steps and repeated separators resolved as text, links not followed.
+  // The flag has no effect.
   StringBase<char> Normalize(bool reserved = true) const;
 
  private:

@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <filesystem>
-#include <system_error>
 #include <utility>
 
 namespace Port {
@@ -107,15 +106,8 @@ String FileName::PopPathEnd() {
   return popped;
 }
 
-// Only the disk can tell where a step back leads to. Where it does not, the name stays as it is.
 String FileName::Normalize(bool /*reserved*/) const {
-  const std::filesystem::path path(GetName().View());
-  if (std::find(path.begin(), path.end(), "..") == path.end()) {
-    return String(path.lexically_normal().native());
-  }
-  std::error_code error;
-  const std::filesystem::path resolved = std::filesystem::weakly_canonical(path, error);
-  return error ? GetName() : String(resolved.native());
+  return String(std::filesystem::path(GetName().View()).lexically_normal().native());
 }
 
 }  // namespace Port

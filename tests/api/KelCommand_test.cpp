@@ -55,7 +55,9 @@ TEST(KelWhich, TellsBadInputByItsStatus) {
        "kel: error: Unable to set repository path to nowhere\n  Invalid path directory nowhere\n",
        false},
       {"-L '" + empty.Path() + "' -L repository which word_fifo", 0,
-       empty.Path() + ": warning[not-a-repository]: has no directory ipmods\n", true},
+       empty.Path() +
+           ": warning[not-a-repository]: this is no repository, it has no subdirectory ipmods\n",
+       true},
       {"-L repository which", 2, "kel: error: KEY is required\n", false},
       {"wich word_fifo", 2, "kel: error: unknown verb 'wich'; did you mean which?", false},
       {"-L '' which word_fifo", 2, "kel: error: -L needs", false},
@@ -90,7 +92,7 @@ TEST(KelList, ListsTheNewestOrAllVersions) {
   EXPECT_EQ(result.output, newest + last);
   EXPECT_EQ(result.errors,
             at + "a_v1_00_a/data/a_v2_1_0.qvr:1:13: error[bad-statement]: missing '=' "
-                 "behind the name\n");
+                 "after the name\n");
   EXPECT_EQ(Kel("list --all -L " + repo.Path()).output,
             newest + "b_v2_00_a\tHDL\t\t" + at + "b_v2_00_a\ttwo\n" + last);
 }
@@ -223,7 +225,9 @@ TEST(Kel, SuggestsWhatThereIs) {
       std::string::npos);
   const CommandResult above = Kel("-L .. list");
   EXPECT_EQ(above.status, 3);
-  EXPECT_EQ(above.errors, "..: warning[not-a-repository]: has no directory ipmods\n");
+  EXPECT_EQ(
+      above.errors,
+      "..: warning[not-a-repository]: this is no repository, it has no subdirectory ipmods\n");
   EXPECT_NE(Kel("-L repository/ipmods list")
                 .errors.find("; did you mean " + kExamples + "/repository?\n"),
             std::string::npos);
@@ -241,7 +245,7 @@ TEST(Kel, ShowsHelpAndVersion) {
   EXPECT_EQ(one.substr(0, 22), "list-ends (warning): l");
   EXPECT_NE(Kel("help diagnostics").output.find(one), std::string::npos);
   EXPECT_EQ(Kel("help list-end").errors.substr(0, 62),
-            "kel: error: no help on 'list-end'; did you mean list-ends?\nRun");
+            "kel: error: no help for 'list-end'; did you mean list-ends?\nRu");
 }
 
 }  // namespace

@@ -70,7 +70,7 @@ TEST(KelDiagnostics, ObeysItsOptions) {
        1,
        {"  2 | PORT p = '', DIR = O\n    |      ^\n",
         "qvr:1:6: note: first declared here\n  1 | PORT p = '', DIR = I\n    |      ^\n", ""}},
-      {"--color always", 1, {": \x1B[1;33mwarning[duplicate-name]: \x1B[0mPORT p", "", ""}},
+      {"--color always", 1, {": \x1B[1;33mwarning[duplicate-name]: \x1B[0mPORT 'p'", "", ""}},
       {"--relative-to ipmods", 1, {"\nx_v1_00_a/data/x", "", ""}}};
   for (const Row& row : rows) {
     SCOPED_TRACE(row.arguments);

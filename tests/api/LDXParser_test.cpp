@@ -266,7 +266,8 @@ TEST_F(AnalyseOrder, FindsTheLanguageOfIncludedCores) {
 
 TEST_F(AnalyseOrder, AnswersForSourcesAndDirectories) {
   Core("sub_v1_00_a",
-       "vlgincdir sub_v1_00_a hdl/../data\nvlgincdir gone data\nsimlib sub s.v Verilog");
+       "vlgincdir sub_v1_00_a hdl/../data\nvlgincdir gone data\nsimlib sub s.v Verilog")
+      .File("hdl/verilog/s.v", "");
   Core("far_v1_00_a", "");
   Core("top_v1_00_a",
        "vlgincdir gone .\nlib sub all\nlib top_v1_00_a d/vhdl/a.vhd\nlib top_v1_00_a b.vhd");
@@ -321,8 +322,8 @@ TEST_F(AnalyseOrder, FollowsLinksToIncludeDirectories) {
   fs::create_directory_symlink(repo / "far/core", repo / "ipmods/abc_v1_00_a");
   const std::pair<const char*, bool> rows[] = {
       {"../inc", true},          {"data/../../inc", true}, {"../inc/../core/data", true},
-      {"../abc_v1_00_a", false}, {"link/../hdl", false},   {"link/../x", false},
-      {"link/..", true}};
+      {"../abc_v1_00_a", false}, {"none/../hdl", false},   {"link/../hdl", false},
+      {"link/../x", false},      {"link/..", true}};
   Core("abc_v1_00_a", "").File("hdl/y", "");
   fs::create_directory_symlink(repo / "far/inc", repo / "far/core/link");
   for (const auto& [directory, exists] : rows) {
@@ -345,6 +346,8 @@ TEST_F(AnalyseOrder, ReadsAnyFileForACore) {
   EXPECT_EQ(Shorten(order.ListSynthesisAnalyseOrder()),
             "abc_v1_00_a/vhdl/a.vhd abc_v1_00_a/vhdl/b.vhd xyz_v1_00_a/vhdl/x.vhd");
   EXPECT_THROW(LDXParser(other, index, abc, Kel_Key(), "VHDL"), AppException);
+  const LDXParser bare(index, Kel_Key("abc"), Kel_Key(), "VHDL");  // each level is its own root
+  EXPECT_EQ(bare.ListSynthesisAnalyseOrder().size(), 2U);
   const Kel_Key root("xyz_v1_00_a");
   EXPECT_THROW(LDXParser(other, index, abc, root, "VHDL"), AppException);
 }

@@ -91,8 +91,8 @@ TEST(QVRStatement, ReadsPairs) {
       {"PORT a = 1", "<a=1>"},
       {"PORT a = 1 b = 2", "<a=1>b = 2"},
       {"PORT a = 1,", "<a=1>,"},
-      {"PORT a = 1, b", "missing '=' behind the name at 13"},
-      {"PORT a = 1, b =", "missing value behind '=' at 15"},
+      {"PORT a = 1, b", "missing '=' after the name at 13"},
+      {"PORT a = 1, b =", "missing value after '=' at 15"},
       {"PORT a = , b = 2", "<a=,>b = 2"},
       {"PORT a = 1,b=\"2, 3\" , c = 16:4", "<a=1><b=2, 3><c=16:4>"},
       {"PARAMETER a = two words, b = 1", "<a=two>words, b = 1"},
@@ -101,8 +101,8 @@ TEST(QVRStatement, ReadsPairs) {
       {"PARAMETER a = \"abc", "quote or bracket is not closed at 14"},
       {"PARAMETER a = 1, , = 2", "<a=1><,=2>"},
       {"PARAMETER", "missing name at 9"},
-      {"PARAMETER a", "missing '=' behind the name at 11"},
-      {"PARAMETER a b = 1", "missing '=' behind the name at 12"}};
+      {"PARAMETER a", "missing '=' after the name at 11"},
+      {"PARAMETER a b = 1", "missing '=' after the name at 12"}};
   for (const auto& [line, expected] : rows) EXPECT_EQ(List(line), expected) << line;
 }
 

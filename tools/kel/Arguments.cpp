@@ -233,7 +233,7 @@ std::string NoTopic(const std::string& word) {
   std::vector<std::string> topics = kVerbNames;
   topics.emplace_back("diagnostics");
   for (const auto& code : Codes()) topics.emplace_back(code.code);
-  return "no help on '" + word + "'" + DidYouMean(topics, word);
+  return "no help for '" + word + "'" + DidYouMean(topics, word);
 }
 
 Status ShowHelp(const CLI::App& app, const std::string& verb) {

@@ -36,6 +36,17 @@ StringList Keys(const Tarvo::KelLibrary& library, const std::vector<std::string>
   return keys;
 }
 
+// Whether each pattern matches a version. An error tells of one that doesn't.
+bool MatchAll(const Tarvo::KelLibrary& library, const std::vector<std::string>& globs) {
+  bool all = true;
+  for (const std::string& glob : globs) {
+    if (!Keys(library, {glob}).empty()) continue;
+    Messages::Error("no core matches '" + glob + "'" + NearNames(library, glob));
+    all = false;
+  }
+  return all;
+}
+
 // A word on a terminal now and then, so that one sees that it goes on.
 class Progress {
  public:
@@ -204,8 +215,10 @@ Status Check(Tarvo::KelLibrary& library, const Call& call) {
   for (const KelDiagnostic& diagnostic : found) ++counts.of.at(diagnostic.severity);
   Write(found, counts, call);
   if (!isComplete || keys.empty()) SuggestRepositories(call);
-  if (keys.empty()) Messages::Note("there is no core to check");
-  if (keys.empty() && call.keys.empty()) return StatusUnreadable;
-  const bool isClean = counts.of.at(KelDiagnostic::Note) == found.size() && !keys.empty();
-  return isClean ? StatusClean : StatusFindings;
+  if (keys.empty() && call.keys.empty()) {
+    Messages::Note("there is no core to check");
+    return StatusUnreadable;
+  }
+  const bool isClean = counts.of.at(KelDiagnostic::Note) == found.size();
+  return MatchAll(library, call.keys) && isClean ? StatusClean : StatusFindings;
 }

@@ -21,6 +21,8 @@ std::optional<std::string_view> FileLines::Find(const KelPlace& place) {
     lines.clear();
     std::ifstream stream(file, std::ios::binary);
     for (std::string line; std::getline(stream, line);) lines.push_back(line);
+    const bool isMarked = !lines.empty() && lines[0].starts_with("\xEF\xBB\xBF");
+    if (isMarked) lines[0].erase(0, 3);
   }
   if (place.line > lines.size()) return std::nullopt;
   std::string_view line = lines[place.line - 1];

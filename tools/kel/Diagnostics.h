@@ -13,8 +13,8 @@
 // has no lines.
 class FileLines {
  public:
-  // The line that a place is in, without its end; none for a place without a line. The view is
-  // good until a line of another file is asked for.
+  // The line that a place is in, without its end and a byte order mark; none for a place without a
+  // line. The view is good until a line of another file is asked for.
   std::optional<std::string_view> Find(const Tarvo::KelPlace& place);
 
  private:

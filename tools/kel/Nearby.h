@@ -11,6 +11,9 @@
 // near to it. None for a core that is there but can't be opened, whose own error tells enough.
 void SuggestKeys(const Tarvo::KelLibrary& library, const std::string& key);
 
+// The names of cores that are near to one, as a question, or nothing.
+std::string NearNames(const Tarvo::KelLibrary& library, const std::string& name);
+
 // A note for each directory of a call that is no repository but has some near to it.
 void SuggestRepositories(const Call& call);
 

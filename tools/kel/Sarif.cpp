@@ -75,7 +75,8 @@ class Writer {
   // What lies outside of the directory keeps its whole path. No place is the directory itself.
   Json Address(const KelPlace& place) const {
     const std::string relative = RelativeTo(directory, place.file);
-    if (relative.rfind("..", 0) == 0) return {{"uri", "file://" + Encoded(Text(place.file))}};
+    if (relative == ".." || relative.starts_with("../"))
+      return {{"uri", "file://" + Encoded(Text(place.file))}};
     return {{"uri", relative.empty() ? "." : Encoded(relative)}, {"uriBaseId", kBase}};
   }
 
@@ -98,8 +99,8 @@ class Writer {
 
   // Equal findings of a file are told apart by their order.
   std::string Fingerprint(const KelDiagnostic& found) {
-    const std::string what =
-        Text(found.code) + '\n' + RelativeTo(directory, found.place.file) + '\n' + Text(found.text);
+    const std::string address = Address(found.place)["uri"].get<std::string>();
+    const std::string what = Text(found.code) + '\n' + address + '\n' + Text(found.text);
     return Hash(what + '\n' + std::to_string(counts[what]++));
   }
 
