@@ -58,4 +58,21 @@ void WriteDataFile(const fs::path& repository, const std::string& core,
   if (!(file << text)) throw std::runtime_error("cannot write below " + data.native());
 }
 
+std::string Description() {
+  std::string text =
+      "# a generated core\nOPTION DESC = Generated core for measurements\nOPTION HDL = VHDL\n"
+      "OPTION STYLE = MIX\nOPTION IP_GROUP = Measurement\nOPTION IPTYPE = BLOCK\n"
+      "OPTION CORE_STATE = ACTIVE\n\nBUS_INTERFACE BUS = REGS, BUS_TYPE = SLAVE\n";
+  for (int i = 0; i < 30; ++i) {
+    const std::string number = std::to_string(i);
+    text += "PARAMETER WIDTH_" + number + " = 8, DT = integer, RANGE = (2:32), DESC = \"Width\"\n";
+  }
+  for (int i = 0; i < 100; ++i) {
+    const std::string number = std::to_string(i);
+    text.append("PORT data_").append(number).append(" = DATA_").append(number);
+    text += ",\tDIR = I, VEC = [31:0], BUS = REGS, DESC = \"Data\" # port\n";
+  }
+  return text;
+}
+
 }  // namespace Scratch

@@ -17,6 +17,9 @@ std::filesystem::path Prepare(const std::string& name,
 void WriteDataFile(const std::filesystem::path& repository, const std::string& core,
                    const std::string& extension, const std::string& text);
 
+// A core description of about 140 lines and 10 KB: six options, some parameters, many ports.
+std::string Description();
+
 }  // namespace Scratch
 
 #endif

@@ -26,24 +26,6 @@ constexpr int kSources = 10;
 
 std::string CoreName(int number) { return "core" + std::to_string(number); }
 
-// 140 lines.
-std::string Description() {
-  std::string text =
-      "# a generated core\nOPTION DESC = Generated core for measurements\nOPTION HDL = VHDL\n"
-      "OPTION STYLE = MIX\nOPTION IP_GROUP = Measurement\nOPTION IPTYPE = BLOCK\n"
-      "OPTION CORE_STATE = ACTIVE\n\nBUS_INTERFACE BUS = REGS, BUS_TYPE = SLAVE\n";
-  for (int i = 0; i < 31; ++i) {
-    const std::string number = std::to_string(i);
-    text += "PARAMETER WIDTH_" + number + " = 8, DT = integer, RANGE = (2:32), DESC = \"Width\"\n";
-  }
-  for (int i = 0; i < 100; ++i) {
-    const std::string number = std::to_string(i);
-    text.append("PORT data_").append(number).append(" = DATA_").append(number);
-    text += ",\tDIR = I, VEC = [31:0], BUS = REGS, DESC = \"Data\" # port\n";
-  }
-  return text;
-}
-
 // Each core takes in up to two others, ten sources of its own and a test bench.
 std::string Order(int number) {
   std::string text;
@@ -63,7 +45,7 @@ void MakeEmpty(const fs::path& file) {
 
 fs::path Repository() {
   return Scratch::Prepare("checked", [](const fs::path& repository) {
-    const std::string description = Description();
+    const std::string description = Scratch::Description();
     for (int i = 0; i < kCores; ++i) {
       const std::string name = CoreName(i);
       const fs::path core = repository / "ipmods" / (name + "_v1_00_a");

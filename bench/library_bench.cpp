@@ -28,30 +28,12 @@ using Tarvo::Kel_Key;
 using Tarvo::KelLibrary;
 using Tarvo::StringBase;
 
-// About 140 lines and 10 KB: six options, some parameters, many ports.
-std::string Description() {
-  std::string text =
-      "# a generated core\nOPTION DESC = Generated core for measurements\nOPTION HDL = VHDL\n"
-      "OPTION STYLE = MIX\nOPTION IP_GROUP = Measurement\nOPTION IPTYPE = BLOCK\n"
-      "OPTION CORE_STATE = ACTIVE\n\nBUS_INTERFACE BUS = REGS, BUS_TYPE = SLAVE\n";
-  for (int i = 0; i < 30; ++i) {
-    const std::string number = std::to_string(i);
-    text += "PARAMETER WIDTH_" + number + " = 8, DT = integer, RANGE = (2:32), DESC = \"Width\"\n";
-  }
-  for (int i = 0; i < 100; ++i) {
-    const std::string number = std::to_string(i);
-    text.append("PORT data_").append(number).append(" = DATA_").append(number);
-    text += ",\tDIR = I, VEC = [31:0], BUS = REGS, DESC = \"Data\" # port\n";
-  }
-  return text;
-}
-
 std::string CoreName(std::int64_t number) { return "core" + std::to_string(number); }
 
 // A repository of that many described cores of one version each.
 fs::path Described(std::int64_t versions) {
   return Scratch::Prepare("described-" + std::to_string(versions), [&](const fs::path& repository) {
-    const std::string text = Description();
+    const std::string text = Scratch::Description();
     for (std::int64_t i = 0; i < versions; ++i) {
       Scratch::WriteDataFile(repository, CoreName(i), "qvr", text);
     }

@@ -14,15 +14,6 @@ const char* const kSimulationOnly = "simlib";
 constexpr std::string_view kWholeLibrary = "all";
 constexpr std::string_view kIncludeDirectory = "vlgincdir";
 
-// Reads a field that must be there; else says what is missing, or that it is not closed.
-bool ReadField(TokenReader& tokens, std::string_view& field, const char* missing,
-               LineFault& fault) {
-  if (tokens.ReadField(field)) return true;
-  const std::string_view tried = tokens.GetTried();
-  fault = {tried, tried.empty() ? missing : "quote or bracket is not closed", !tried.empty()};
-  return false;
-}
-
 bool ReadEnd(TokenReader& tokens, const char* text, LineFault& fault) {
   if (!tokens.MoreTokens()) return true;
   fault = {tokens.GetRest(), text};
@@ -31,15 +22,15 @@ bool ReadEnd(TokenReader& tokens, const char* text, LineFault& fault) {
 
 bool ReadLibraryEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
   std::string_view keyword;
-  if (!ReadField(tokens, keyword, "missing keyword", fault)) return false;
+  if (!ReadNeeded(tokens, keyword, "missing keyword", fault)) return false;
   entry.forSynthesis = keyword == kBoth || keyword == kSynthesisOnly;
   entry.forSimulation = keyword == kBoth || keyword == kSimulationOnly;
   if (!entry.forSynthesis && !entry.forSimulation) {
     fault = {keyword, "unknown keyword", false, true};
     return false;
   }
-  if (!ReadField(tokens, entry.library, "missing library", fault)) return false;
-  if (!ReadField(tokens, entry.name, "missing file name or 'all'", fault)) return false;
+  if (!ReadNeeded(tokens, entry.library, "missing library", fault)) return false;
+  if (!ReadNeeded(tokens, entry.name, "missing file name or 'all'", fault)) return false;
   if (Matches(entry.name, kWholeLibrary)) {
     entry.kind = LDXEntry::WholeLibrary;
     return ReadEnd(tokens, "nothing may follow 'all'", fault);
@@ -54,14 +45,14 @@ bool ReadLibraryEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
 bool ReadPathEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
   std::string_view keyword;
   entry.kind = LDXEntry::IncludeDirectory;
-  if (!ReadField(tokens, keyword, "missing keyword", fault)) return false;
+  if (!ReadNeeded(tokens, keyword, "missing keyword", fault)) return false;
   if (keyword != kIncludeDirectory) {
     entry.kind = LDXEntry::Ignored;
     entry.rest = keyword;
     return true;
   }
-  if (!ReadField(tokens, entry.library, "missing library", fault)) return false;
-  if (!ReadField(tokens, entry.name, "missing directory", fault)) return false;
+  if (!ReadNeeded(tokens, entry.library, "missing library", fault)) return false;
+  if (!ReadNeeded(tokens, entry.name, "missing directory", fault)) return false;
   if (tokens.MoreTokens()) entry.rest = tokens.GetRest();
   return true;
 }

@@ -40,7 +40,7 @@ bool ReadPair(TokenReader& tokens, Pair& pair, LineFault& fault) {
   if (!tokens.MoreTokens()) return Refuse(tokens, "missing value after '='", fault);
   const TokenReader::Value value = tokens.ReadValue();
   pair.value = value.text;
-  if (!value.whole) fault = {tokens.GetTried(), "quote or bracket is not closed", true};
+  if (!value.whole) fault = NotClosed(tokens);
   return value.whole;
 }
 

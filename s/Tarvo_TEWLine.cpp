@@ -14,15 +14,6 @@ TokenReader Cut(std::string_view line) {
   return TokenReader(line, kDelimiters, TokenReader::WithoutGroups);
 }
 
-// Reads a field that must be there, or says that it is missing or not closed.
-bool ReadField(TokenReader& tokens, std::string_view& field, const char* missing,
-               LineFault& fault) {
-  if (tokens.ReadField(field)) return true;
-  const std::string_view tried = tokens.GetTried();
-  fault = {tried, tried.empty() ? missing : "quote is not closed", !tried.empty()};
-  return false;
-}
-
 // Goes behind a comma that something follows. False at the end of a row's netlists.
 bool NextNetlist(TokenReader& tokens, Row& row) {
   if (!tokens.MoreTokens()) return false;
@@ -40,10 +31,10 @@ bool ReadHeader(std::string_view line, Header& header, LineFault& fault) {
   TokenReader tokens = Cut(line);
   header = Header();
   std::string_view field;
-  if (!ReadField(tokens, field, "missing name", fault)) return false;
+  if (!ReadNeeded(tokens, field, "missing name", fault)) return false;
   while (!Matches(field, kEndOfHeader)) {
     header.names.push_back(field);
-    if (!ReadField(tokens, field, "missing FILES after the names", fault)) return true;
+    if (!ReadNeeded(tokens, field, "missing FILES after the names", fault)) return true;
   }
   header.isEnded = true;
   return true;
@@ -53,16 +44,16 @@ Result ReadRow(std::string_view line, std::size_t columns, Row& row, LineFault& 
   TokenReader tokens = Cut(line);
   row = Row();
   std::string_view field;
-  if (!ReadField(tokens, field, "missing value", fault)) return StatesNothing;
+  if (!ReadNeeded(tokens, field, "missing value", fault)) return StatesNothing;
   while (row.values.size() < columns) {
     row.values.push_back(field);
     const bool isLast = row.values.size() == columns;
     const char* const missing = isLast ? "missing netlist after the values" : "missing value";
-    if (!ReadField(tokens, field, missing, fault)) return Unparsable;
+    if (!ReadNeeded(tokens, field, missing, fault)) return Unparsable;
   }
   row.netlists.push_back(field);
   while (NextNetlist(tokens, row)) {
-    if (!ReadField(tokens, field, "missing netlist", fault)) return Unparsable;
+    if (!ReadNeeded(tokens, field, "missing netlist", fault)) return Unparsable;
     row.netlists.push_back(field);
   }
   return Read;

@@ -70,4 +70,18 @@ TokenReader::Value TokenReader::ReadGroup(std::string_view closing) {
   return {line.substr(start), false};
 }
 
+bool ReadNeeded(TokenReader& tokens, std::string_view& field, const char* missing,
+                LineFault& fault) {
+  if (tokens.ReadField(field)) return true;
+  const std::string_view tried = tokens.GetTried();
+  fault = tried.empty() ? LineFault{tried, missing} : NotClosed(tokens);
+  return false;
+}
+
+LineFault NotClosed(const TokenReader& tokens) {
+  const std::string_view tried = tokens.GetTried();
+  const bool isQuote = tried.front() == '"' || tried.front() == '\'';
+  return {tried, isQuote ? "quote is not closed" : "bracket is not closed", true};
+}
+
 }  // namespace Tarvo

@@ -5,6 +5,7 @@
 #include <string_view>
 
 #include "Tarvo_Export.h"
+#include "Tarvo_LineFault.h"
 
 namespace Tarvo {
 
@@ -81,6 +82,14 @@ class TokenReader {
   Tokenizer::iterator token;
   std::size_t tried = 0;
 };
+
+// Reads a field that must be there. False with a fault, the text for a missing one, or that it is
+// not closed.
+bool ReadNeeded(TokenReader& tokens, std::string_view& field, const char* missing,
+                LineFault& fault);
+
+// The fault of the value that was tried last, which is not closed.
+LineFault NotClosed(const TokenReader& tokens);
 
 }  // namespace Tarvo
 

@@ -141,7 +141,7 @@ TEST_F(Checker, FindsEachFaultOnceAtItsPlace) {
       "near_v2_0_a not-a-key: this directory is ignored: its name is not a key such as "
       "abc_v1_00_a\n"
       "q1.qvr:3:9+0 error bad-statement: missing '=' after the name\n"
-      "q1.qvr:4:11+2 error bad-statement: quote or bracket is not closed | '#' begins a comment, "
+      "q1.qvr:4:11+2 error bad-statement: quote is not closed | '#' begins a comment, "
       "in "
       "quotes too\n"
       "q1.qvr:5:9+1 error bad-statement: missing '=' after the name\n"

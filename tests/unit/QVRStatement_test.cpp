@@ -98,7 +98,7 @@ TEST(QVRStatement, ReadsPairs) {
       {"PARAMETER a = two words, b = 1", "<a=two>words, b = 1"},
       {"PARAMETER a = (1, 2), b = [3, (4]", "<a=(1, 2)><b=[3, (4]>"},
       {"PARAMETER a = \"it's\", b = 'say \"x\"'", "<a=it's><b=say \"x\">"},
-      {"PARAMETER a = \"abc", "quote or bracket is not closed at 14"},
+      {"PARAMETER a = \"abc", "quote is not closed at 14"},
       {"PARAMETER a = 1, , = 2", "<a=1><,=2>"},
       {"PARAMETER", "missing name at 9"},
       {"PARAMETER a", "missing '=' after the name at 11"},
