@@ -84,6 +84,7 @@ class AnalyseOrder {
 
   // A core whose whole order an entry takes in.
   struct Include {
+    Kel_Key from;        // whose file has the entry
     StringBase library;  // as the entry names it
     Kel_Key core;        // as the index has it
     std::shared_ptr<const StringBase> file;
@@ -115,6 +116,7 @@ class AnalyseOrder {
 
   std::vector<IncludeDirectory> includeDirectories;
   std::vector<Include> includes;  // of the core's own file, in the order of its lines
+  std::vector<Include> further;   // of the files below; for a checker alone
 
  private:
   void PartLists();

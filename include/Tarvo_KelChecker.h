@@ -39,9 +39,6 @@ class TARVO_EXPORT KelChecker {
   using Progress = std::function<void(std::size_t done, std::size_t total)>;
 
   explicit KelChecker(const KelLibrary& library);
-  ~KelChecker();
-  KelChecker(const KelChecker&) = delete;
-  KelChecker& operator=(const KelChecker&) = delete;
 
   // Checks one version, given by its key or bare name, with what its analyse order takes in from
   // others. An unknown key is a diagnostic without a place.

@@ -33,17 +33,17 @@ using QVRStatement::Pair;
 // A property or an option that takes a few values, in any letter case.
 struct Choice {
   QVRStatement::Keyword keyword;
+  bool isOpen;  // it takes others too, and only what is nearly one of these is told
   const char* key;
   std::vector<const char*> values;
-  bool isOpen;  // it takes others too, and only what is nearly one of these is told
 };
 const Choice kChoices[] = {
-    {QVRStatement::Option, "STYLE", {"HDL", "BLACKBOX", "MIX"}, false},
-    {QVRStatement::Option, "HDL", {"VHDL", "Verilog", "MIXED", "BOTH"}, false},
-    {QVRStatement::Parameter, "TYPE", {"HDL", "NON_HDL"}, false},
-    {QVRStatement::Port, "DIR", {"I", "O", "IO"}, false},
-    {QVRStatement::Port, "ENDIAN", {"BIG", "LITTLE"}, false},
-    {QVRStatement::Port, "SIGIS", {"CLK", "RST", "INTERRUPT"}, true}};
+    {QVRStatement::Option, false, "STYLE", {"HDL", "BLACKBOX", "MIX"}},
+    {QVRStatement::Option, false, "HDL", {"VHDL", "Verilog", "MIXED", "BOTH"}},
+    {QVRStatement::Parameter, false, "TYPE", {"HDL", "NON_HDL"}},
+    {QVRStatement::Port, false, "DIR", {"I", "O", "IO"}},
+    {QVRStatement::Port, false, "ENDIAN", {"BIG", "LITTLE"}},
+    {QVRStatement::Port, true, "SIGIS", {"CLK", "RST", "INTERRUPT"}}};
 
 // The keys of a kind of statement: those that the readers put in front of the stated ones, which
 // they hide, and all that mean something.
@@ -147,7 +147,7 @@ DescribedCore DescriptionChecker::Check() {
     if (!line.empty()) CheckLine(line);
   }
   TellMentions();
-  core.hasAllParameters = bad.count(QVRStatement::Parameter) == 0;
+  core.hasAllParameters = !bad.contains(QVRStatement::Parameter);
   return std::move(core);
 }
 
@@ -376,7 +376,7 @@ void DescriptionChecker::TellMentions() const {
   std::map<std::pair<QVRStatement::Keyword, StringBase>, KelDiagnostic> missing;
   for (const Mention& mention : mentions) {
     const std::pair key(mention.declaredBy, mention.name);
-    if (declarations.count(key) > 0 || bad.count(mention.declaredBy) > 0) continue;
+    if (declarations.contains(key) || bad.contains(mention.declaredBy)) continue;
     const auto [known, isNew] = missing.try_emplace(key, At(*mention.code, {}, mention.text));
     if (isNew) {
       known->second.place = mention.place;

@@ -20,7 +20,7 @@ KelPlace PlaceOf(const Port_Input& input, Diagnosis::Span span = {}) {
 // of a file that could not be read at all: each other file is checked for itself.
 void AppendIncludes(KelDiagnostic& diagnostic) {
   const Port_Input* input = Port_Input::GetCurrent();
-  const bool isRead = input && diagnostic.place.file == input->GetFile();
+  const bool isRead = input != nullptr && diagnostic.place.file == input->GetFile();
   if (isRead) input = input->GetOuter();
   const bool isWhole = diagnostic.place.line == 0;
   for (; input && (isWhole || !Diagnosis::GoesOn()); input = input->GetOuter()) {

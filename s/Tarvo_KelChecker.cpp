@@ -73,9 +73,9 @@ class CheckRun {
 
  private:
   void CheckCore(const StringBase& text);
-  DescribedCore CheckDescriptionOf(const FileName& file);
+  static DescribedCore CheckDescriptionOf(const FileName& file);
   void CheckNetlists(const FileName& file, const Kel_Key& key, const DescribedCore& core);
-  void CheckRepository(const fs::path& versions);
+  static void CheckRepository(const fs::path& versions);
   void FindUnlistedIn(const fs::path& directory, const std::set<std::string>& extensions);
 
   // Does the work, and gathers what is told meanwhile. Only then are messages left out: a caller's
@@ -198,7 +198,7 @@ void CheckRun::CheckRepository(const fs::path& versions) {
 // What a core with errors has, it may be meant to list.
 void CheckRun::FindUnlisted(const StringList& keys) {
   for (const StringBase& text : keys) {
-    if (faulty.count(text) > 0) continue;
+    if (faulty.contains(text)) continue;
     const fs::path location = index.GetIPLocation(Kel_Key(text)).GetName().GetText();
     const fs::path hdl = location / Kel_Index::KEL_HDL_SUBDIRECTORY.GetText();
     Collect([&] {
@@ -221,7 +221,7 @@ void CheckRun::FindUnlistedIn(const fs::path& directory, const std::set<std::str
       return TellFile(Codes::kUnreadable, path.c_str(),
                       Say({"the file can't be read: ", error.message()}));
     }
-    if (!extensions.empty() && extensions.count(path.extension().string()) == 0) return;
+    if (!extensions.empty() && !extensions.contains(path.extension().string())) return;
     if (orders.IsListed(FileName(path.c_str()))) return;
     TellFile(Codes::kUnlistedFile, path.c_str(), "nothing lists this file");
   });
@@ -240,8 +240,6 @@ std::vector<KelDiagnostic> CheckRun::Finish() {
 }  // namespace
 
 KelChecker::KelChecker(const KelLibrary& theLibrary) : library(theLibrary) {}
-
-KelChecker::~KelChecker() = default;
 
 std::vector<KelDiagnostic> KelChecker::CheckCore(const StringBase& key) const {
   return CheckCores({key});

@@ -131,6 +131,7 @@ class OrderReader {
 
   StringBase LanguageOf(const Kel_Key& library) const;
 
+  void KeepIncludes(const AnalyseOrder& taken);
   FileName FindOrder(const Kel_Key& library, std::string_view text) const;
   bool ReportMisplaced(const LDXEntry& entry, const HdlPlacement& placement) const;
   void WarnOfSecond(const Source& source, const char* purpose) const;
@@ -417,14 +418,22 @@ bool OrderReader::AddLibrary(const LDXEntry& entry) {
     open.back().entry = MarkOf(entry.library);
     const StringBase language = LanguageOf(libKey);
     const FileName libFile = FindOrder(libKey, entry.library);
-    order.includes.push_back({library, Resolve(index, libKey), fileName, open.back().entry});
+    order.includes.push_back({core, library, Resolve(index, libKey), fileName, open.back().entry});
     // Not on the stack, of which each level of a deep chain needs some.
     const auto nested =
         std::make_unique<OrderReader>(index, analysis, libKey, root, language, libFile);
-    const AnalyseOrder::Known known = order.Append(nested->Read());
+    AnalyseOrder taken = nested->Read();
+    if (Diagnosis::GoesOn()) KeepIncludes(taken);
+    const AnalyseOrder::Known known = order.Append(std::move(taken));
     TraceKnown(known.synthesis, kSynthesis, libKey);
     TraceKnown(known.ForSimulation(), kSimulation, libKey);
   });
+}
+
+void OrderReader::KeepIncludes(const AnalyseOrder& taken) {
+  for (const auto* const includes : {&taken.includes, &taken.further}) {
+    order.further.insert(order.further.end(), includes->begin(), includes->end());
+  }
 }
 
 FileName OrderReader::FindOrder(const Kel_Key& library, std::string_view text) const {

@@ -9,10 +9,7 @@
 #include "Tarvo_AppException.h"
 #include "Tarvo_Diagnosis.h"
 #include "Tarvo_Existence.h"
-#include "Tarvo_KelIP.h"
 #include "Tarvo_Kel_Index.h"
-#include "Tarvo_LDXParser.h"
-#include "Tarvo_OptionScanner.h"
 
 namespace Tarvo {
 
@@ -45,17 +42,6 @@ bool IsNormal(std::string_view fileKey) {
          name.find("//") == std::string_view::npos;
 }
 
-// The language that a core's options give it.
-StringBase LanguageOf(const Kel_Index& index, const Kel_Key& key) {
-  StringBase language;
-  try {
-    language =
-        OptionScanner::GetOptionValue(index.GetIPOptions(key), KelIP::KEL_LANGUAGE_OPTION_NAME);
-  } catch (const AppException&) {  // it has none
-  }
-  return language.GetLength() > 0 ? language : LDXParser::LDX_HDL_VHDL;
-}
-
 // One name for each file, however its entry writes it.
 StringBase Normal(const FileName& file) { return file.Normalize(); }
 
@@ -79,7 +65,7 @@ void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringB
   CheckSources(order.GetSynthesis());
   CheckSources(order.GetSimulation());
   CheckIncludeDirectories(order, key);
-  edges[key.GetKey()] = MakeEdges(order, key);
+  AddEdges(order, key);
   tops.push_back(key.GetKey());
   const bool isEmpty = order.GetSynthesis().libraries.empty() &&
                        order.GetSimulation().libraries.empty() && order.includeDirectories.empty();
@@ -99,10 +85,10 @@ bool OrderChecker::IsThere(const FileName& file) {
   return known->second;
 }
 
-bool OrderChecker::IsListed(const FileName& file) const { return listed.count(Normal(file)) > 0; }
+bool OrderChecker::IsListed(const FileName& file) const { return listed.contains(Normal(file)); }
 
 bool OrderChecker::IsIncludeDirectory(const FileName& directory) const {
-  return includeDirectories.count(Normal(directory)) > 0;
+  return includeDirectories.contains(Normal(directory));
 }
 
 void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
@@ -150,37 +136,37 @@ void OrderChecker::CheckIncludeDirectories(const AnalyseOrder& order, const Kel_
   }
 }
 
-// The cores that the core's own file brings in: whole ones, and those of single sources.
-OrderChecker::Edges OrderChecker::MakeEdges(const AnalyseOrder& order, const Kel_Key& key) const {
-  Edges own;
-  for (const AnalyseOrder::Include& include : order.includes) {
-    own.push_back({include.core, PlaceOf(*include.file, include.mark), true});
-  }
-  const StringBase file = OrderFile(index, key).GetName();
-  for (const auto* list : {&order.GetSynthesis(), &order.GetSimulation()}) {
-    for (const AnalyseOrder::Library& library : list->libraries) {
-      const auto isOwn = [&](const auto& source) { return *source->origin->file == file; };
-      const auto source = std::find_if(library.sources.begin(), library.sources.end(), isOwn);
-      if (*library.key == key || source == library.sources.end()) continue;
-      own.push_back({*library.key, PlaceOf(file, (*source)->mark), false});
+// What each core of the order brings in: whole ones, and those of single sources.
+void OrderChecker::AddEdges(const AnalyseOrder& order, const Kel_Key& key) {
+  std::unordered_map<StringBase, Edges> own = {{key.GetKey(), {}}};
+  std::unordered_map<StringBase, Kel_Key> cores = {{OrderFile(index, key).GetName(), key}};
+  for (const auto* const includes : {&order.includes, &order.further}) {
+    for (const AnalyseOrder::Include& include : *includes) {
+      cores.emplace(*include.file, include.from);
+      own[include.from.GetKey()].push_back(
+          {include.core, PlaceOf(*include.file, include.mark), true});
+      cores.emplace(OrderFile(index, include.core).GetName(), include.core);
     }
   }
-  return own;
+  for (const auto* const list : {&order.GetSynthesis(), &order.GetSimulation()}) {
+    for (const AnalyseOrder::Library& library : list->libraries) {
+      AddSingleSources(library, cores, own);
+    }
+  }
+  edges.merge(own);
 }
 
-// Those of a core that nobody asked to check are read for this alone: what is wrong with it was
-// told when it was taken in.
-const OrderChecker::Edges& OrderChecker::EdgesOf(const StringBase& core) {
-  const auto [known, isNew] = edges.try_emplace(core);
-  if (!isNew) return known->second;
-  const Kel_Key key(core);
-  const DiagnosticCollector ignored(DiagnosticCollector::InsteadOfMessages);
-  try {
-    const AnalyseOrder order =
-        ReadAnalyseOrder(OrderFile(index, key), index, key, Kel_Key(), LanguageOf(index, key));
-    return edges[core] = MakeEdges(order, key);
-  } catch (const AppException&) {
-    return edges[core];
+// One edge from each other core that lists sources of the library.
+void OrderChecker::AddSingleSources(const AnalyseOrder::Library& library,
+                                    const std::unordered_map<StringBase, Kel_Key>& cores,
+                                    std::unordered_map<StringBase, Edges>& own) {
+  std::unordered_set<const StringBase*> seen;
+  for (const auto& source : library.sources) {
+    const StringBase& file = *source->origin->file;
+    if (!seen.insert(&file).second) continue;
+    const auto core = cores.find(file);
+    if (core == cores.end() || core->second == *library.key) continue;
+    own[core->second.GetKey()].push_back({*library.key, PlaceOf(file, source->mark), false});
   }
 }
 
@@ -189,14 +175,17 @@ void OrderChecker::CheckVersions() {
 }
 
 // A short way to each core that the top takes in, and the cores in the order in which they are met.
-OrderChecker::Steps OrderChecker::FindSteps(const StringBase& top, std::vector<StringBase>& met) {
+OrderChecker::Steps OrderChecker::FindSteps(const StringBase& top,
+                                            std::vector<StringBase>& met) const {
   Steps steps;
   met = {top};
   std::vector<StringBase> wholes = {top};
   std::unordered_set<StringBase> queued = {top};
   for (std::size_t i = 0; i < wholes.size(); ++i) {
     const StringBase from = wholes[i];
-    for (const Edge& edge : EdgesOf(from)) {
+    const auto own = edges.find(from);
+    if (own == edges.end()) continue;
+    for (const Edge& edge : own->second) {
       const StringBase& to = edge.core.GetKey();
       if (to != top && steps.try_emplace(to, Step{&edge, from}).second) met.push_back(to);
       if (edge.isWhole && queued.insert(to).second) wholes.push_back(to);

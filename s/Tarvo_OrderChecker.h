@@ -54,10 +54,12 @@ class OrderChecker {
   void CheckSources(const AnalyseOrder::SourceList& sources);
   void CheckNames(const AnalyseOrder::SourceList& sources);
   void CheckIncludeDirectories(const AnalyseOrder& order, const Kel_Key& key);
-  Edges MakeEdges(const AnalyseOrder& order, const Kel_Key& key) const;
-  const Edges& EdgesOf(const StringBase& core);
+  void AddEdges(const AnalyseOrder& order, const Kel_Key& key);
+  static void AddSingleSources(const AnalyseOrder::Library& library,
+                               const std::unordered_map<StringBase, Kel_Key>& cores,
+                               std::unordered_map<StringBase, Edges>& own);
   void CheckVersionsOf(const StringBase& top);
-  Steps FindSteps(const StringBase& top, std::vector<StringBase>& met);
+  Steps FindSteps(const StringBase& top, std::vector<StringBase>& met) const;
   void TellVersions(const Steps& steps, const StringBase& top, const StringBase& older,
                     const StringBase& newer) const;
 
