@@ -46,6 +46,24 @@ TEST(KelDiagnostics, PutsMarksBelowTheWord) {
   }
 }
 
+// No name of a file is taken for a part of a text. Other cores' netlists of one table are told
+// apart.
+TEST(KelDiagnostics, TakesNamesAsTheyAre) {
+  RepositoryBuilder repo;
+  const std::string core = "E line 7, x/ipmods/x_v1_00_a/";
+  repo.File(core + "data/x_v2_1_0.qvr", "OPTION STYLE = BLACKBOX\n\nPORT p");
+  repo.File(core + "data/x_v2_1_0.tew", "FILES\ny:n.edn\nx:n.edn");
+  repo.File(core + "netlist/n.edn", "");
+  repo.File("E line 7, x/ipmods/y_v1_00_a/data/y_v2_1_0.qvr", "OPTION STYLE = none");
+  const std::string data = core + "data/x_v2_1_0.";
+  EXPECT_EQ(RunCommand("cd " + repo.Path() + " && '" + kKel +
+                       "' -L 'E line 7, x' check x --relative-to .")
+                .output,
+            data + "qvr:3:7: error[bad-statement]: missing '=' after the name\n" + data +
+                "tew:2:1: error[missing-netlist]: netlist does not exist: "
+                "y_v1_00_a/netlist/n.edn\n1 core, 2 errors, 0 warnings\n");
+}
+
 TEST(KelDiagnostics, ObeysItsOptions) {
   RepositoryBuilder repo;
   repo.Core("x_v1_00_a").Qvr("PORT p = '', DIR = I\nPORT p = '', DIR = O\nPORT q");
