@@ -12,8 +12,8 @@ namespace Tarvo {
 
 class KelLibrary;
 
-// Finds what is wrong with the cores of a library, and what is taken as it stands but hardly meant
-// so: everything in one run, each thing once and at its place.
+// Finds what is wrong with the cores of a library, and what the library accepts but is probably a
+// mistake: everything in one run, each thing once and at its place.
 //
 //     Tarvo::KelChecker checker(library);
 //     for (const auto& found : checker.CheckCore("pulse_counter"))
@@ -22,7 +22,8 @@ class KelLibrary;
 // It reads the same files by the same rules as the library does, but goes on behind a bad line. So
 // it finds the further faults too, and those of the analyse order and the table of netlists where
 // the description is bad. It issues no messages, writes nothing, and changes no answer of the
-// library or of an instance. Files are read anew by each call.
+// library or of an instance; traces come as ever. Files are read anew by each call. While one runs,
+// a trace sink must not ask the library.
 //
 // Results stand in the order of their files, lines and columns. The codes are listed by ListCodes.
 //
@@ -49,7 +50,7 @@ class TARVO_EXPORT KelChecker {
                                         const Progress& progress = {}) const;
 
   // Checks every version, those without a description too, and the repositories: directories that
-  // look like cores but for their name, and files that no core lists.
+  // look like cores except for their names, and files that no core lists.
   std::vector<KelDiagnostic> CheckLibrary(const Progress& progress = {}) const;
 
   // All codes that a diagnostic may have, in the order of the alphabet.

@@ -27,7 +27,7 @@ struct KelRelatedPlace {
   StringBase text;
 };
 
-// Something that is wrong with a core or a repository, or that hardly anybody means.
+// Something that is wrong with a core or a repository, or that is probably a mistake.
 struct KelDiagnostic {
   enum Severity { Note, Warning, Error };
 
@@ -53,8 +53,8 @@ struct KelDiagnosticCode {
 //
 //     const Tarvo::KelDiagnosticLog log;
 //     if (!ip->ListSynthesisSources(sources))
-//       for (const auto& fault : log.Take()) std::cerr << fault.place.file << ": " << fault.text <<
-//       '\n';
+//       for (const auto& fault : log.Take())
+//         std::cerr << fault.place.file << ": " << fault.text << '\n';
 //
 // Messages are issued as ever. What fails without reading a file, such as a question for an unknown
 // key, is kept too, with the code "failed", the lines of its message as text, and no place.

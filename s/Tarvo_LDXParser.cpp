@@ -103,7 +103,7 @@ Kel_Key Resolve(const Kel_Index& index, const Kel_Key& key) {
 class OrderReader {
  public:
   OrderReader(const Kel_Index& theIndex, Analysis& theAnalysis, const Kel_Key& version,
-              const Kel_Key& theRoot, StringBase language, const FileName& theFile)
+              const Kel_Key& theRoot, StringBase language, FileName theFile)
       : index(theIndex),
         analysis(theAnalysis),
         open(analysis.open),
@@ -112,7 +112,7 @@ class OrderReader {
         root(theRoot.IsValid() ? theRoot : version),
         isRoot(theRoot.IsValid() && version == theRoot),
         hdl(std::move(language)),
-        ldxFile(theFile),
+        ldxFile(std::move(theFile)),
         fileName(std::make_shared<const StringBase>(ldxFile.GetName())),
         maker(index, fileName) {}
 
@@ -163,7 +163,7 @@ class OrderReader {
   StringBase hdl;
   FileName ldxFile;
   std::shared_ptr<const StringBase> fileName;
-  const FileScanner* lines = nullptr;
+  std::unique_ptr<FileScanner> lines;
   AnalyseOrder order;
   SourceMaker maker;
 };
@@ -234,10 +234,10 @@ void OrderReader::TellCircle(OpenOrders::const_iterator first) const {
 void OrderReader::Parse() {
   TARVO_TRACE("  Parsing LDX File %s\n", *fileName);
   Port_Input input(*fileName);
-  FileScanner scanner = ScanFile(ldxFile, Codes::kMissingOrder);
-  lines = &scanner;
+  // NOLINTNEXTLINE(modernize-make-unique): made in place, since it can't be moved
+  lines.reset(new FileScanner(ScanFile(ldxFile, Codes::kMissingOrder)));
   std::string_view line;
-  for (unsigned lineNumber = 0; scanner.GetNextLine(line, lineNumber);) {
+  for (unsigned lineNumber = 0; lines->GetNextLine(line, lineNumber);) {
     if (line.empty()) continue;
     input.AtLine(lineNumber);
     open.back().entry = {lineNumber, 0, 0};
@@ -350,7 +350,7 @@ void OrderReader::AddSource(const LDXEntry& entry, const SourcePointer& source) 
 
 void OrderReader::TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const {
   Diagnosis::Add([&] {
-    const bool both = earlier.synthesis && earlier.simulation;
+    const bool both = earlier.synthesis != nullptr && earlier.simulation != nullptr;
     const char* const purpose = earlier.synthesis ? kSynthesis : kSimulation;
     const Source& first = *(earlier.synthesis ? earlier.synthesis : earlier.simulation);
     return Diagnosis::With(

@@ -212,7 +212,7 @@ void OrderChecker::CheckVersionsOf(const StringBase& top) {
 // At the entry that brings the older version in. Behind it the rest of the way to that version, and
 // then the way to the newer one, both backwards.
 void OrderChecker::TellVersions(const Steps& steps, const StringBase& top, const StringBase& older,
-                                const StringBase& newer) const {
+                                const StringBase& newer) {
   const auto way = [&](const StringBase& to, std::vector<KelRelatedPlace>& places) {
     for (StringBase at = to; at != top;) {
       const Step& step = steps.at(at);

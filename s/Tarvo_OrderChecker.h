@@ -60,8 +60,8 @@ class OrderChecker {
                                std::unordered_map<StringBase, Edges>& own);
   void CheckVersionsOf(const StringBase& top);
   Steps FindSteps(const StringBase& top, std::vector<StringBase>& met) const;
-  void TellVersions(const Steps& steps, const StringBase& top, const StringBase& older,
-                    const StringBase& newer) const;
+  static void TellVersions(const Steps& steps, const StringBase& top, const StringBase& older,
+                           const StringBase& newer);
 
   const Kel_Index& index;
   std::unordered_map<StringBase, bool> files;  // by name, and whether they are there

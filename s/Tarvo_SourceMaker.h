@@ -21,7 +21,7 @@ class SourceMaker {
 
   // Goes to the library of an entry. Throws AppException for one that is not in the index; then
   // that of the entry before stays.
-  void EnterLibrary(std::string_view library);
+  void EnterLibrary(std::string_view entered);
 
   // The source of that name, given as text too, in the library that was entered last.
   AnalyseOrder::Source Make(const StringBase& text, const Port::FileName& name,

@@ -142,7 +142,7 @@ void TableChecker::CheckHeader(Text line, bool isChosen) {
   }
   TellHeader(header, fault);
   for (const Text column : header.names) {
-    if (!isChosen && !FindParameter(StringBase(column))) return;
+    if (!isChosen && FindParameter(StringBase(column)) == nullptr) return;
     if (column != ",") columns.emplace_back(column);
   }
 }
@@ -151,7 +151,7 @@ void TableChecker::TellHeader(const TEWLine::Header& header, const LineFault& fa
   for (const Text column : header.names) {
     if (column == ",") {
       Tell(Codes::kBadHeader, column, "a comma is read as a name", "separate names by blanks only");
-    } else if (core.hasAllParameters && !FindParameter(StringBase(column))) {
+    } else if (core.hasAllParameters && FindParameter(StringBase(column)) == nullptr) {
       Diagnosis::Add([&] { return TellUnknownParameter(lines, column, parameters); });
     }
   }
