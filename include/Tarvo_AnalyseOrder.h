@@ -84,9 +84,9 @@ class AnalyseOrder {
 
   // A core whose whole order an entry takes in.
   struct Include {
-    Kel_Key from;        // whose file has the entry
-    StringBase library;  // as the entry names it
-    Kel_Key core;        // as the index has it
+    std::shared_ptr<const Kel_Key> from;  // whose file has the entry
+    StringBase library;                   // as the entry names it
+    std::shared_ptr<const Kel_Key> core;  // as the index has it
     std::shared_ptr<const StringBase> file;
     Mark mark;
   };

@@ -131,6 +131,7 @@ class OrderReader {
 
   StringBase LanguageOf(const Kel_Key& library) const;
 
+  void AddInclude(const StringBase& library, const Kel_Key& libKey);
   void KeepIncludes(const AnalyseOrder& taken);
   FileName FindOrder(const Kel_Key& library, std::string_view text) const;
   bool ReportMisplaced(const LDXEntry& entry, const HdlPlacement& placement) const;
@@ -418,7 +419,7 @@ bool OrderReader::AddLibrary(const LDXEntry& entry) {
     open.back().entry = MarkOf(entry.library);
     const StringBase language = LanguageOf(libKey);
     const FileName libFile = FindOrder(libKey, entry.library);
-    order.includes.push_back({core, library, Resolve(index, libKey), fileName, open.back().entry});
+    AddInclude(library, libKey);
     // Not on the stack, of which each level of a deep chain needs some.
     const auto nested =
         std::make_unique<OrderReader>(index, analysis, libKey, root, language, libFile);
@@ -428,6 +429,17 @@ bool OrderReader::AddLibrary(const LDXEntry& entry) {
     TraceKnown(known.synthesis, kSynthesis, libKey);
     TraceKnown(known.ForSimulation(), kSimulation, libKey);
   });
+}
+
+// Entries of one core mostly share both keys with the one before.
+void OrderReader::AddInclude(const StringBase& library, const Kel_Key& libKey) {
+  const bool isFirst = order.includes.empty();
+  const bool isSame = !isFirst && order.includes.back().library == library;
+  auto from = isFirst ? std::make_shared<const Kel_Key>(core) : order.includes.back().from;
+  auto target =
+      isSame ? order.includes.back().core : std::make_shared<const Kel_Key>(Resolve(index, libKey));
+  order.includes.push_back(
+      {std::move(from), library, std::move(target), fileName, open.back().entry});
 }
 
 void OrderReader::KeepIncludes(const AnalyseOrder& taken) {
@@ -574,7 +586,7 @@ std::vector<KelIncludeDirectory> LDXParser::GetVerilogIncludeDirectories() const
 std::vector<KelInclude> LDXParser::GetIncludes() const {
   std::vector<KelInclude> includes;
   for (const auto& entry : order.includes) {
-    includes.push_back({entry.library, entry.core, PlaceOf(*entry.file, entry.mark)});
+    includes.push_back({entry.library, *entry.core, PlaceOf(*entry.file, entry.mark)});
   }
   return includes;
 }

@@ -142,10 +142,10 @@ void OrderChecker::AddEdges(const AnalyseOrder& order, const Kel_Key& key) {
   std::unordered_map<StringBase, Kel_Key> cores = {{OrderFile(index, key).GetName(), key}};
   for (const auto* const includes : {&order.includes, &order.further}) {
     for (const AnalyseOrder::Include& include : *includes) {
-      cores.emplace(*include.file, include.from);
-      own[include.from.GetKey()].push_back(
-          {include.core, PlaceOf(*include.file, include.mark), true});
-      cores.emplace(OrderFile(index, include.core).GetName(), include.core);
+      cores.emplace(*include.file, *include.from);
+      own[include.from->GetKey()].push_back(
+          {*include.core, PlaceOf(*include.file, include.mark), true});
+      cores.emplace(OrderFile(index, *include.core).GetName(), *include.core);
     }
   }
   for (const auto* const list : {&order.GetSynthesis(), &order.GetSimulation()}) {
