@@ -377,9 +377,9 @@ void DescriptionChecker::TellMentions() const {
   for (const Mention& mention : mentions) {
     const std::pair key(mention.declaredBy, mention.name);
     if (declarations.contains(key) || bad.contains(mention.declaredBy)) continue;
-    const auto [known, isNew] = missing.try_emplace(key, At(*mention.code, {}, mention.text));
+    const auto [known, isNew] =
+        missing.try_emplace(key, Diagnosis::AtPlace(*mention.code, mention.place, mention.text));
     if (isNew) {
-      known->second.place = mention.place;
       known->second.hint = DidYouMean(mention.name.View(), DeclaredNames(mention.declaredBy));
     } else {
       known->second.related.push_back({mention.place, "named here too"});

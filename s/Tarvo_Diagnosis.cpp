@@ -59,12 +59,17 @@ KelPlace Here(Span span) {
 
 KelDiagnostic At(const KelDiagnosticCode& code, Span span, const StringBase& text,
                  const StringBase& hint) {
-  return {code.severity, code.code, text, hint, Here(span), {}};
+  return AtPlace(code, Here(span), text, hint);
+}
+
+KelDiagnostic AtPlace(const KelDiagnosticCode& code, const KelPlace& place, const StringBase& text,
+                      const StringBase& hint) {
+  return {code.severity, code.code, text, hint, place, {}};
 }
 
 KelDiagnostic Of(const KelDiagnosticCode& code, const StringBase& file, const StringBase& text,
                  const StringBase& hint) {
-  return {code.severity, code.code, text, hint, {file, 0, 0, 0}, {}};
+  return AtPlace(code, {file, 0, 0, 0}, text, hint);
 }
 
 KelDiagnostic Failed(bool isWarning, const StringBase& message) {

@@ -52,6 +52,10 @@ struct Span {
 KelDiagnostic At(const KelDiagnosticCode& code, Span span, const StringBase& text,
                  const StringBase& hint = {});
 
+// A fault at a place that was read before.
+KelDiagnostic AtPlace(const KelDiagnosticCode& code, const KelPlace& place, const StringBase& text,
+                      const StringBase& hint = {});
+
 // A fault of a file as a whole, whatever is being read.
 KelDiagnostic Of(const KelDiagnosticCode& code, const StringBase& file, const StringBase& text,
                  const StringBase& hint = {});

@@ -155,12 +155,10 @@ void CheckRun::CheckNetlists(const FileName& file, const Kel_Key& key, const Des
     for (const ListedNetlist& netlist : CheckTable(file, index, key, core)) {
       if (orders.IsThere(netlist.location)) continue;
       Diagnosis::Add([&] {
-        KelDiagnostic told =
-            Diagnosis::At(Codes::kMissingNetlist, {},
-                          Say({"netlist does not exist: ",
-                               ShortName(index, netlist.library, netlist.location).View()}));
-        told.place = netlist.place;
-        return told;
+        return Diagnosis::AtPlace(
+            Codes::kMissingNetlist, netlist.place,
+            Say({"netlist does not exist: ",
+                 ShortName(index, netlist.library, netlist.location).View()}));
       });
     }
   } catch (const AppException&) {  // told as it could not be read

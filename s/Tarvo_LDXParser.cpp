@@ -197,9 +197,8 @@ void OrderReader::CheckNesting() const {
   }
   if (open.size() < kDeepestLevel) return;
   Diagnosis::Add([&] {
-    KelDiagnostic told = Diagnosis::At(Codes::kIncludeTooDeep, {}, "includes nest too deep");
-    told.place = PlaceOf(open.back());
-    return told;
+    return Diagnosis::AtPlace(Codes::kIncludeTooDeep, PlaceOf(open.back()),
+                              "includes nest too deep");
   });
   throw Report::Told(Report::Exception(AppException::Failure,
                                        "LDX definition for %s nested below %d others\n",
@@ -218,10 +217,9 @@ void OrderReader::TellCircle(OpenOrders::const_iterator first) const {
     std::string cores;
     for (const OpenOrder& step : circle) cores += std::string(step.core.GetKey()) + ", ";
     KelDiagnostic told =
-        Diagnosis::At(Codes::kIncludeCircle, {},
-                      Say({"circle of includes: ", cores, circle[0].core.GetKey().View()}),
-                      "take one of the includes out");
-    told.place = PlaceOf(circle[0]);
+        Diagnosis::AtPlace(Codes::kIncludeCircle, PlaceOf(circle[0]),
+                           Say({"circle of includes: ", cores, circle[0].core.GetKey().View()}),
+                           "take one of the includes out");
     // Otherwise the includes are told as those that lead here.
     for (std::size_t i = 1; Diagnosis::GoesOn() && i < circle.size(); ++i) {
       const Kel_Key& next = circle[(i + 1) % circle.size()].core;

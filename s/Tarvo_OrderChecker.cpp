@@ -24,11 +24,7 @@ KelPlace PlaceOf(const StringBase& file, const AnalyseOrder::Mark& mark) {
 
 // A fault at a place that was read before.
 void Tell(const KelDiagnosticCode& code, const KelPlace& place, const StringBase& text) {
-  Diagnosis::Add([&] {
-    KelDiagnostic told = Diagnosis::At(code, {}, text);
-    told.place = place;
-    return told;
-  });
+  Diagnosis::Add([&] { return Diagnosis::AtPlace(code, place, text); });
 }
 
 FileName OrderFile(const Kel_Index& index, const Kel_Key& key) {
@@ -115,12 +111,12 @@ void OrderChecker::CheckNames(const AnalyseOrder::SourceList& sources) {
       if (isNew) continue;
       const AnalyseOrder::Source& other = *first->second;
       Diagnosis::Add([&] {
-        KelDiagnostic told =
-            Diagnosis::At(Codes::kDuplicateSource, {},
-                          Say({ShortName(index, *library.key, source->location).View(),
-                               " is listed already under another name"}));
-        told.place = PlaceOf(*source->origin->file, source->mark);
-        return Diagnosis::With(told, PlaceOf(*other.origin->file, other.mark), "first listed here");
+        return Diagnosis::With(
+            Diagnosis::AtPlace(Codes::kDuplicateSource,
+                               PlaceOf(*source->origin->file, source->mark),
+                               Say({ShortName(index, *library.key, source->location).View(),
+                                    " is listed already under another name"})),
+            PlaceOf(*other.origin->file, other.mark), "first listed here");
       });
     }
   }
@@ -223,11 +219,10 @@ void OrderChecker::TellVersions(const Steps& steps, const StringBase& top, const
   Diagnosis::Add([&] {
     std::vector<KelRelatedPlace> places;
     way(older == top ? newer : older, places);
-    KelDiagnostic told = Diagnosis::At(
-        Codes::kVersionConflict, {},
+    KelDiagnostic told = Diagnosis::AtPlace(
+        Codes::kVersionConflict, places.front().place,
         Say({older.View(), " and the newer ", newer.View(), " are both in one order"}),
         Say({"use ", newer.View(), " everywhere"}));
-    told.place = places.front().place;
     places.erase(places.begin());
     if (older != top) way(newer, places);
     told.related = std::move(places);
