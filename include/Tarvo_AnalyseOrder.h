@@ -9,6 +9,7 @@
 
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
+#include "Tarvo_KelDiagnostic.h"
 #include "Tarvo_Kel_Key.h"
 
 namespace Tarvo {
@@ -32,6 +33,8 @@ class AnalyseOrder {
   };
   // Where on its file an entry names what it adds.
   struct Mark {
+    KelPlace In(const StringBase& file) const { return {file, line, column, length}; }
+
     unsigned line;
     unsigned column;
     unsigned length;

@@ -22,6 +22,9 @@ using StringList = std::vector<StringBase>;
 using Property = std::pair<StringBase, StringBase>;
 using PropertyList = std::vector<Property>;
 
+// The name of the logger that the traces of the library go to; see Tarvo_DebugMessenger.h.
+inline constexpr char kLoggerName[] = "BaseIP";
+
 }  // namespace Tarvo
 
 #endif

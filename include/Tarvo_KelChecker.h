@@ -20,7 +20,7 @@ class KelLibrary;
 //       std::cout << found.place.file << ':' << found.place.line << ": " << found.text << '\n';
 //
 // It reads the same files by the same rules as the library does, but goes on behind a bad line. So
-// it finds the further faults too, and those of the analyse order and the table of netlists where
+// it finds the further faults too, and those of the analyse order and the netlist table where
 // the description is bad. It issues no messages, writes nothing, and changes no answer of the
 // library or of an instance; traces come as ever. Files are read anew by each call. While one runs,
 // a trace sink must not ask the library.

@@ -47,7 +47,7 @@ struct KelNetlist {
   Kel_Key library;
 };
 
-// A row of a table of netlists.
+// A row of a netlist table.
 struct KelNetlistRow {
   StringList values;  // one for each parameter of the table
   std::vector<KelNetlist> netlists;
@@ -56,7 +56,7 @@ struct KelNetlistRow {
   KelPlace place;
 };
 
-// A table of netlists: the parameters that choose among the rows, and the rows in their order.
+// A netlist table: the parameters that choose among the rows, and the rows in their order.
 struct KelNetlistTable {
   StringList parameters;
   std::vector<KelNetlistRow> rows;

@@ -29,11 +29,12 @@ class TARVO_EXPORT Kel_Index {
   //
   //     data/NAME_v2_1_0.qvr   core description      hdl/vhdl/      VHDL sources
   //     data/NAME_v2_1_0.ldx   analyse order         hdl/verilog/   Verilog sources
-  //     data/NAME_v2_1_0.tew   black-box list        netlist/       netlists
+  //     data/NAME_v2_1_0.tew   netlist table         netlist/       netlists
   //
   // NAME is the core's base name, and `_v2_1_0` the version of the family of data files, the same
   // for every core.
-  static const StringBase KEL_VERSION;
+  static const StringBase KEL_VERSIONS_SUBDIRECTORY;  // ipmods
+  static const StringBase KEL_VERSION;                // _v2_1_0
   static const StringBase KEL_QVR_EXTENSION;
   static const StringBase KEL_LDX_EXTENSION;
   static const StringBase KEL_TEW_EXTENSION;

@@ -11,9 +11,9 @@
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary_Utils.h"
-#include "Tarvo_LDXParser.h"
+#include "Tarvo_KnownProperties.h"
+#include "Tarvo_LDXParser_Hdl.h"
 #include "Tarvo_OptionScanner.h"
-#include "Tarvo_PropertyNames.h"
 #include "Tarvo_QVRParser.h"
 #include "Tarvo_QVRStatement.h"
 #include "Tarvo_RangeText.h"
@@ -39,7 +39,7 @@ struct Choice {
 };
 const Choice kChoices[] = {
     {QVRStatement::Option, false, "STYLE", {"HDL", "BLACKBOX", "MIX"}},
-    {QVRStatement::Option, false, "HDL", {"VHDL", "Verilog", "MIXED", "BOTH"}},
+    {QVRStatement::Option, false, kLanguageOption, {"VHDL", "Verilog", "MIXED", "BOTH"}},
     {QVRStatement::Parameter, false, "TYPE", {"HDL", "NON_HDL"}},
     {QVRStatement::Port, false, "DIR", {"I", "O", "IO"}},
     {QVRStatement::Port, false, "ENDIAN", {"BIG", "LITTLE"}},
@@ -54,11 +54,12 @@ struct Keys {
 
 const Keys& KeysOf(QVRStatement::Keyword keyword) {
   static const Keys none;
-  static const Keys options{{"NAME", "VERSION"}, PropertyNames::OfCores()};
-  static const Keys parameters{{"NAME", "VALUE", "DEFAULT_VALUE"}, PropertyNames::OfParameters()};
-  static const Keys ports{{"NAME", "DEFAULT"}, PropertyNames::OfPorts()};
-  static const Keys busInterfaces{{}, PropertyNames::OfBusInterfaces()};
-  static const Keys ioInterfaces{{}, PropertyNames::OfIoInterfaces()};
+  static const Keys options{{"NAME", "VERSION"}, NamesOf(KnownProperties::OfCores())};
+  static const Keys parameters{{"NAME", "VALUE", "DEFAULT_VALUE"},
+                               NamesOf(KnownProperties::OfParameters())};
+  static const Keys ports{{"NAME", "DEFAULT"}, NamesOf(KnownProperties::OfPorts())};
+  static const Keys busInterfaces{{}, NamesOf(KnownProperties::OfBusInterfaces())};
+  static const Keys ioInterfaces{{}, NamesOf(KnownProperties::OfIoInterfaces())};
   static const Keys* const keys[] = {&none,          &options,      &parameters,
                                      &busInterfaces, &ioInterfaces, &ports};
   return *keys[keyword];
@@ -140,7 +141,7 @@ class DescriptionChecker {
 };
 
 DescribedCore DescriptionChecker::Check() {
-  core.language = LDXParser::LDX_HDL_VHDL;
+  core.language = DefaultLanguage();
   Text line;
   for (unsigned number = 0; lines.GetNextLine(line, number);) {
     input.AtLine(number);
@@ -204,9 +205,10 @@ void DescriptionChecker::CheckOption(Text line) {
   CheckValue(QVRStatement::Option, whole);
   if (stated.first == KelIP::KEL_LANGUAGE_OPTION_NAME) core.language = stated.second;
   if (stated.first != KelIP::KEL_STYLE_OPTION_NAME) return;
-  const bool isMix = Matches(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_MIX);
-  core.hasSources = isMix || Matches(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_HDL);
-  core.hasNetlists = isMix || Matches(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX);
+  const bool isMix = EqualsIgnoringCase(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_MIX);
+  core.hasSources = isMix || EqualsIgnoringCase(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_HDL);
+  core.hasNetlists =
+      isMix || EqualsIgnoringCase(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX);
   core.isStyleKnown = core.hasSources || core.hasNetlists;
 }
 
@@ -305,7 +307,7 @@ void DescriptionChecker::CheckValue(QVRStatement::Keyword keyword, const Pair& p
   const StringBase value(pair.value);
   for (const Choice& choice : kChoices) {
     if (choice.keyword != keyword || pair.key != choice.key) continue;
-    const auto fits = [&](const char* known) { return Matches(value, known); };
+    const auto fits = [&](const char* known) { return EqualsIgnoringCase(value, known); };
     if (std::any_of(choice.values.begin(), choice.values.end(), fits)) return;
     const StringBase meant =
         FindMisspelt(pair.value, StringList(choice.values.begin(), choice.values.end()));

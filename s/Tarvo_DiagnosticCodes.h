@@ -17,14 +17,14 @@ inline constexpr Code kBadEntry{
     "An entry is 'lib LIBRARY FILE [LANGUAGE]', with synlib or simlib in place of lib for one "
     "purpose alone, 'lib LIBRARY all', or 'vlgincdir LIBRARY DIRECTORY'."};
 inline constexpr Code kBadHeader{
-    "bad-header", kError, "table of netlists has no header that can be read",
+    "bad-header", kError, "netlist table has no header that can be read",
     "The first line of a table names parameters of the core and ends in the word FILES."};
 inline constexpr Code kBadRange{
     "bad-range", kWarning, "range that can't be read",
     "A VEC is [LEFT:RIGHT]; a RANGE is (LOW:HIGH), or values with commas between. Each side is an "
     "expression of numbers and parameters."};
 inline constexpr Code kBadRow{
-    "bad-row", kError, "row of a table of netlists can't be read",
+    "bad-row", kError, "row of a netlist table can't be read",
     "A row has a value for each parameter of the header, and then one or more netlists with commas "
     "between."};
 inline constexpr Code kBadStatement{
@@ -90,7 +90,7 @@ inline constexpr Code kMissingSource{
     "missing-source", kError, "source does not exist",
     "Sources lie below hdl/vhdl and hdl/verilog of their library."};
 inline constexpr Code kMissingTable{
-    "missing-table", kError, "core without a table of netlists",
+    "missing-table", kError, "core without a netlist table",
     "A core whose option STYLE is BLACKBOX or MIX needs data/NAME_v2_1_0.tew."};
 inline constexpr Code kNoLanguage{"no-language", kError, "source without a language",
                                   "A name without the extension v or vhd needs a language behind "

@@ -17,6 +17,7 @@
 #include "Tarvo_Kel_Key.h"
 #include "Tarvo_OrderChecker.h"
 #include "Tarvo_TableChecker.h"
+#include "Tarvo_TellUnknown.h"
 
 namespace Tarvo {
 
@@ -26,8 +27,6 @@ using Port::FileName;
 namespace {
 
 namespace fs = boost::filesystem;
-
-const char* const kVersionsSubdirectory = "ipmods";
 
 auto Rank(const KelDiagnostic& diagnostic) {
   const KelPlace& place = diagnostic.place;
@@ -168,13 +167,13 @@ void CheckRun::CheckNetlists(const FileName& file, const Kel_Key& key, const Des
 
 void CheckRun::CheckRepositories() {
   for (const StringBase& repository : library.GetRepositories()) {
-    const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
+    const fs::path versions =
+        fs::path(repository.GetText()) / Kel_Index::KEL_VERSIONS_SUBDIRECTORY.GetText();
     boost::system::error_code error;
     const bool isThere = fs::is_directory(versions, error);
     Collect([&] {
       if (isThere) return CheckRepository(versions);
-      TellFile(Codes::kNotARepository, repository,
-               "this is no repository, it has no subdirectory ipmods");
+      Diagnosis::Add([&] { return TellNoRepository(repository); });
     });
   }
 }
@@ -183,7 +182,8 @@ void CheckRun::CheckRepository(const fs::path& versions) {
   ForEachEntry(versions, [&](const fs::directory_entry& entry) {
     const Kel_Key key(StringBase(entry.path().filename().c_str()));
     if (key.IsValid()) return;
-    const Existence data = LookForDirectory(DirectoryOf(entry.path() / "data"));
+    const Existence data =
+        LookForDirectory(DirectoryOf(entry.path() / Kel_Index::KEL_DATA_SUBDIRECTORY.GetText()));
     if (data == Existence::Yes) {
       TellFile(Codes::kNotAKey, entry.path().c_str(),
                "this directory is ignored: its name is not a key such as abc_v1_00_a");

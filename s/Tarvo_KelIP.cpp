@@ -6,7 +6,9 @@
 #include "Tarvo_Guard.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
+#include "Tarvo_KnownProperties.h"
 #include "Tarvo_LDXParser.h"
+#include "Tarvo_LDXParser_Hdl.h"
 #include "Tarvo_QVRParser.h"
 #include "Tarvo_Report.h"
 #include "Tarvo_TEWParser.h"
@@ -20,7 +22,7 @@ const StringBase KelIP::KEL_STYLE_OPTION_NAME = "STYLE";
 const StringBase KelIP::KEL_STYLE_OPTION_VALUE_HDL = "HDL";
 const StringBase KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX = "BLACKBOX";
 const StringBase KelIP::KEL_STYLE_OPTION_VALUE_MIX = "MIX";
-const StringBase KelIP::KEL_LANGUAGE_OPTION_NAME = "HDL";
+const StringBase KelIP::KEL_LANGUAGE_OPTION_NAME = kLanguageOption;
 const StringBase KelIP::KEL_HDL_LIBRARY_PROPERTY = "LIBRARY";
 const StringBase KelIP::KEL_HDL_LANGUAGE_PROPERTY = "LANGUAGE";
 const StringBase KelIP::KEL_HDL_FILENAME_HEAD_PROPERTY = "FILENAME_HEAD";
@@ -109,14 +111,15 @@ StringList KelIPImpl::ListProperties() const {
 // Whether the style is this one, or the one that has everything.
 bool KelIPImpl::HasStyle(const StringBase& style) const {
   const StringBase value = qvrParser->GetOptionValue(KelIP::KEL_STYLE_OPTION_NAME);
-  return Matches(value, style) || Matches(value, KelIP::KEL_STYLE_OPTION_VALUE_MIX);
+  return EqualsIgnoringCase(value, style) ||
+         EqualsIgnoringCase(value, KelIP::KEL_STYLE_OPTION_VALUE_MIX);
 }
 
 // Asked for only if it is stated, in this very letter case: a description has no default for it.
 StringBase KelIPImpl::GetLanguage() const {
   const StringList options = qvrParser->ListOptions();
   const auto stated = std::find(options.begin(), options.end(), KelIP::KEL_LANGUAGE_OPTION_NAME);
-  return stated == options.end() ? LDXParser::LDX_HDL_VHDL : qvrParser->GetOptionValue(*stated);
+  return stated == options.end() ? DefaultLanguage() : qvrParser->GetOptionValue(*stated);
 }
 
 const LDXParser* KelIPImpl::GetLDXParser() {
@@ -447,5 +450,45 @@ bool KelIP::GetNetlistTable(KelNetlistTable& table) const {
   return Guard(table, Failure(kModule, kNoNetlists, impl->key.GetKey()),
                [&] { return Answer(table, impl->GetTEWParser(), &TEWParser::GetTable); });
 }
+
+// Questions to an instance like the others, though their answers need none of it.
+// NOLINTBEGIN(readability-convert-member-functions-to-static)
+
+bool KelIP::ListAllParameterProperties(StringList& list) const {
+  list = NamesOf(KnownProperties::OfParameters());
+  return true;
+}
+
+bool KelIP::ListAllGenericProperties(StringList& list) const {
+  return ListAllParameterProperties(list);
+}
+
+bool KelIP::ListAllPortProperties(StringList& list) const {
+  list = NamesOf(KnownProperties::OfPorts());
+  return true;
+}
+
+bool KelIP::ListAllBusInterfaceProperties(StringList& list) const {
+  list = NamesOf(KnownProperties::OfBusInterfaces());
+  return true;
+}
+
+bool KelIP::ListAllIOInterfaceProperties(StringList& list) const {
+  list = NamesOf(KnownProperties::OfIoInterfaces());
+  return true;
+}
+
+bool KelIP::ListAllSourceProperties(StringList& list) const {
+  list = {KEL_HDL_LIBRARY_PROPERTY, KEL_HDL_LANGUAGE_PROPERTY, KEL_HDL_FILENAME_HEAD_PROPERTY,
+          KEL_HDL_FILENAME_TAIL_PROPERTY};
+  return true;
+}
+
+bool KelIP::ListAllNetlistProperties(StringList& list) const {
+  list = {KEL_NETLIST_LIBRARY_PROPERTY};
+  return true;
+}
+
+// NOLINTEND(readability-convert-member-functions-to-static)
 
 }  // namespace Tarvo

@@ -8,10 +8,11 @@
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
+#include "Tarvo_KnownProperties.h"
 #include "Tarvo_OptionScanner.h"
 #include "Tarvo_PropertyList.h"
-#include "Tarvo_PropertyNames.h"
 #include "Tarvo_Report.h"
+#include "Tarvo_TellUnknown.h"
 
 namespace Tarvo {
 
@@ -20,8 +21,6 @@ namespace fs = boost::filesystem;
 namespace {
 
 constexpr Report::Module kModule{"s/Tarvo_KelLibrary", "1.0"};
-
-const char* const kVersionsSubdirectory = "ipmods";
 
 // True for a directory, and for what can't be looked at, which the index then reports. False for
 // all else, as a file or a link that leads nowhere or back to itself.
@@ -72,12 +71,10 @@ bool KelLibraryImpl::RefreshLibrary() {
 
 bool KelLibraryImpl::AddRepository(const StringBase& repository) {
   TARVO_TRACE("KEL Library: Analysing repository %s\n", repository);
-  const fs::path versions = fs::path(repository.GetText()) / kVersionsSubdirectory;
+  const fs::path versions =
+      fs::path(repository.GetText()) / Kel_Index::KEL_VERSIONS_SUBDIRECTORY.GetText();
   if (!fs::is_directory(versions)) {
-    Diagnosis::Add([&] {
-      return Diagnosis::Of(Codes::kNotARepository, repository,
-                           "this is no repository, it has no subdirectory ipmods");
-    });
+    Diagnosis::Add([&] { return TellNoRepository(repository); });
     kModule.Warning("Unable to add directory %s to library\n", repository);
     return false;
   }
@@ -171,7 +168,7 @@ bool KelLibrary::ListAllIPKeys(StringList& list) const {
 // A question to the library like the others, though its answer needs none of it.
 // NOLINTNEXTLINE(readability-convert-member-functions-to-static)
 bool KelLibrary::ListAllIPProperties(StringList& list) const {
-  list = PropertyNames::OfCores();
+  list = NamesOf(KnownProperties::OfCores());
   return true;
 }
 

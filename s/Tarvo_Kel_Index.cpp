@@ -12,6 +12,7 @@ namespace Tarvo {
 
 using Port::FileName;
 
+const StringBase Kel_Index::KEL_VERSIONS_SUBDIRECTORY = "ipmods";
 const StringBase Kel_Index::KEL_VERSION = "_v2_1_0";
 const StringBase Kel_Index::KEL_QVR_EXTENSION = "qvr";
 const StringBase Kel_Index::KEL_LDX_EXTENSION = "ldx";

@@ -31,7 +31,7 @@ bool ReadLibraryEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
   }
   if (!ReadNeeded(tokens, entry.library, "missing library", fault)) return false;
   if (!ReadNeeded(tokens, entry.name, "missing file name or 'all'", fault)) return false;
-  if (Matches(entry.name, kWholeLibrary)) {
+  if (EqualsIgnoringCase(entry.name, kWholeLibrary)) {
     entry.kind = LDXEntry::WholeLibrary;
     return ReadEnd(tokens, "nothing may follow 'all'", fault);
   }
@@ -66,7 +66,7 @@ StringList LDXKeywords() {
 bool ReadLDXEntry(std::string_view line, LDXEntry& entry, LineFault& fault) {
   TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);
   entry = LDXEntry();
-  const bool isPath = Matches(FirstWord(line), kIncludeDirectory);
+  const bool isPath = EqualsIgnoringCase(FirstWord(line), kIncludeDirectory);
   return isPath ? ReadPathEntry(tokens, entry, fault) : ReadLibraryEntry(tokens, entry, fault);
 }
 

@@ -40,13 +40,8 @@ constexpr Report::Module kModule{"s/Tarvo_LDXParser", "1.0"};
 
 const char* const kSynthesis = "synthesis";
 const char* const kSimulation = "simulation";
-const char* const kLanguageOption = "HDL";
 
 constexpr unsigned kDeepestLevel = 1000;
-
-KelPlace PlaceOf(const StringBase& file, const Mark& mark) {
-  return {file, mark.line, mark.column, mark.length};
-}
 
 // A file that is being read, and the entry that it has come to.
 struct OpenOrder {
@@ -63,7 +58,7 @@ struct Analysis {
   std::set<StringBase> done;  // for a checker alone: the files that were read to their end
 };
 
-KelPlace PlaceOf(const OpenOrder& open) { return PlaceOf(*open.file, open.entry); }
+KelPlace PlaceOf(const OpenOrder& open) { return open.entry.In(*open.file); }
 
 bool IsBefore(const OpenOrder& left, const OpenOrder& right) {
   return std::tie(*left.file, left.entry.line) < std::tie(*right.file, right.entry.line);
@@ -134,7 +129,7 @@ class OrderReader {
   void AddInclude(const StringBase& library, const Kel_Key& libKey);
   void KeepIncludes(const AnalyseOrder& taken);
   FileName FindOrder(const Kel_Key& library, std::string_view text) const;
-  bool ReportMisplaced(const LDXEntry& entry, const HdlPlacement& placement) const;
+  bool ReportUnsettled(const LDXEntry& entry, const SourceLanguage& settled) const;
   void WarnOfSecond(const Source& source, const char* purpose) const;
   void TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const;
   KelDiagnostic TellBadEntry(const LineFault& fault) const;
@@ -289,25 +284,25 @@ bool OrderReader::AddFile(const LDXEntry& entry) {
     return false;
   }
   const FileName name(file);
-  const HdlPlacement placement = PlaceSource(hdl, StringBase(entry.language), name);
-  if (placement.assumed) {
+  const SourceLanguage settled = SettleLanguage(hdl, StringBase(entry.language), name);
+  if (settled.assumed) {
     TARVO_TRACE("HDL language not specified for file %s:%s when IP core is MIXED\n",
                 StringBase(entry.library), file);
   }
-  if (placement.verdict != HdlPlacement::Placed) return ReportMisplaced(entry, placement);
+  if (settled.verdict != SourceLanguage::Settled) return ReportUnsettled(entry, settled);
   AddSource(entry,
-            std::make_shared<const Source>(maker.Make(file, name, placement, MarkOf(entry.name))));
+            std::make_shared<const Source>(maker.Make(file, name, settled, MarkOf(entry.name))));
   return true;
 }
 
 // Says what is wrong with a file entry. True if that costs the entry alone.
-bool OrderReader::ReportMisplaced(const LDXEntry& entry, const HdlPlacement& placement) const {
+bool OrderReader::ReportUnsettled(const LDXEntry& entry, const SourceLanguage& settled) const {
   const StringBase file(entry.name);
   const std::string_view language = entry.language;
-  switch (placement.verdict) {
-    case HdlPlacement::Placed:
+  switch (settled.verdict) {
+    case SourceLanguage::Settled:
       return true;
-    case HdlPlacement::UnknownLanguage:
+    case SourceLanguage::UnknownLanguage:
       Diagnosis::Add([&] {
         return Diagnosis::At(
             Codes::kUnknownLanguage, SpanOf(language),
@@ -316,19 +311,18 @@ bool OrderReader::ReportMisplaced(const LDXEntry& entry, const HdlPlacement& pla
       });
       kModule.Error("Unknown HDL language specified\n");
       return true;
-    case HdlPlacement::LanguageOnBoth:
+    case SourceLanguage::LanguageOnBoth:
       Tell(Codes::kLanguageNotAllowed, language,
            [] { return "a core of HDL BOTH names no languages; the source is left out"; });
       kModule.Error("HDL language specified when IP core is BOTH\n");
       return true;
-    case HdlPlacement::AgainstExtension:
+    case SourceLanguage::AgainstExtension:
       Tell(Codes::kLanguageMismatch, language.empty() ? entry.name : language, [&] {
-        return Say(
-            {"'", entry.name, "' can't be ", placement.language.View(), " by its extension"});
+        return Say({"'", entry.name, "' can't be ", settled.language.View(), " by its extension"});
       });
-      kModule.Error("File %s declared to be %s\n", file, placement.language);
+      kModule.Error("File %s declared to be %s\n", file, settled.language);
       return false;
-    case HdlPlacement::NeitherLanguageNorExtension:
+    case SourceLanguage::NeitherLanguageNorExtension:
       Tell(Codes::kNoLanguage, entry.name, [&] {
         return Say({"the language of '", entry.name,
                     "' is unknown: it has no extension v or vhd, and no language is given"});
@@ -356,7 +350,7 @@ void OrderReader::TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier&
         Diagnosis::At(Codes::kDuplicateSource, SpanOf(entry.name),
                       Say({"'", entry.name, "' of ", first.origin->library->GetKey().View(),
                            " is listed already", both ? "" : " for ", both ? "" : purpose})),
-        PlaceOf(*first.origin->file, first.mark), "first listed here");
+        first.mark.In(*first.origin->file), "first listed here");
   });
 }
 
@@ -401,7 +395,7 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
       return Diagnosis::With(
           Diagnosis::At(Codes::kDuplicateIncludeDirectory, SpanOf(entry.library),
                         Say({"'", entry.library, "' has an include directory already"})),
-          PlaceOf(*known->file, known->mark), "first given here");
+          known->mark.In(*known->file), "first given here");
     });
     kModule.Warning("Library %s already has path %s defined\n", library, known->location.GetName());
     return false;
@@ -463,7 +457,7 @@ StringBase OrderReader::LanguageOf(const Kel_Key& library) const {
   } catch (const AppException& exception) {
     if (exception.level == AppException::NotFound) language = hdl;
   }
-  return language.GetLength() > 0 ? language : LDXParser::LDX_HDL_VHDL;
+  return language.GetLength() > 0 ? language : DefaultLanguage();
 }
 
 void OrderReader::TraceKnown(const AnalyseOrder::SourcePointers& sources, const char* purpose,
@@ -473,36 +467,6 @@ void OrderReader::TraceKnown(const AnalyseOrder::SourcePointers& sources, const 
                 source->origin->library->GetKey(), source->location.GetTail(), from.GetKey(),
                 purpose);
   }
-}
-
-std::vector<KelSource> DescribeSources(const AnalyseOrder::SourceList& list) {
-  std::vector<KelSource> sources;
-  for (const AnalyseOrder::Library& library : list.libraries) {
-    for (const SourcePointer& source : library.sources) {
-      const AnalyseOrder::Origin& origin = *source->origin;
-      sources.push_back({source->location.GetAbsolutePath(), *origin.library, origin.language,
-                         PlaceOf(*origin.file, source->mark)});
-    }
-  }
-  return sources;
-}
-
-StringList ListPaths(const AnalyseOrder::SourceList& list) {
-  StringList paths;
-  for (const AnalyseOrder::Library& library : list.libraries) {
-    for (const SourcePointer& source : library.sources) {
-      paths.push_back(source->location.GetAbsolutePath());
-    }
-  }
-  return paths;
-}
-
-StringList ListDirectories(const Kel_Index& index, const AnalyseOrder::SourceList& list) {
-  StringList directories;
-  for (const AnalyseOrder::Library& library : list.libraries) {
-    directories.push_back(index.GetIPLocation(*library.key).GetAbsolutePath());
-  }
-  return directories;
 }
 
 }  // namespace
@@ -524,69 +488,5 @@ LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const K
     : index(theIndex), order(ReadAnalyseOrder(ldxFile, theIndex, version, root, language)) {}
 
 LDXParser::~LDXParser() = default;
-
-// A question to the parser like the others, though its answer needs none of it.
-// NOLINTNEXTLINE(readability-convert-member-functions-to-static)
-StringBase LDXParser::GetFileLanguage(const FileName& file) const {
-  return LanguageByExtension(file);
-}
-
-Kel_Key LDXParser::GetFileLibrary(const FileName& file) const {
-  const StringBase fileKey = FileKey::OfLocation(file);
-  const Source* source = order.GetSynthesis().Find(fileKey);
-  if (!source) source = order.GetSimulation().Find(fileKey);
-  return source ? *source->origin->library : Kel_Key();
-}
-
-StringBase LDXParser::GetVerilogIncludeLocation(const StringBase& library) const {
-  const Kel_Key libKey(library);
-  const auto* const known = order.FindIncludeDirectory(libKey);
-  return (known ? known->location : index.GetIPLocation(libKey)).GetAbsolutePath();
-}
-
-StringList LDXParser::ListSynthesisLibraries() const {
-  return ListDirectories(index, order.GetSynthesis());
-}
-
-StringList LDXParser::ListSimulationLibraries() const {
-  return ListDirectories(index, order.GetSimulation());
-}
-
-StringList LDXParser::ListSynthesisAnalyseOrder() const { return ListPaths(order.GetSynthesis()); }
-
-StringList LDXParser::ListSimulationAnalyseOrder() const {
-  return ListPaths(order.GetSimulation());
-}
-
-StringList LDXParser::ListVerilogIncludeLibraryKeys() const {
-  StringList keys;
-  for (const auto& entry : order.includeDirectories) keys.push_back(entry.library.GetKey());
-  return keys;
-}
-
-std::vector<KelSource> LDXParser::GetSynthesisSources() const {
-  return DescribeSources(order.GetSynthesis());
-}
-
-std::vector<KelSource> LDXParser::GetSimulationSources() const {
-  return DescribeSources(order.GetSimulation());
-}
-
-std::vector<KelIncludeDirectory> LDXParser::GetVerilogIncludeDirectories() const {
-  std::vector<KelIncludeDirectory> directories;
-  for (const auto& entry : order.includeDirectories) {
-    directories.push_back({entry.library.GetKey(), entry.location.GetAbsolutePath(),
-                           PlaceOf(*entry.file, entry.mark)});
-  }
-  return directories;
-}
-
-std::vector<KelInclude> LDXParser::GetIncludes() const {
-  std::vector<KelInclude> includes;
-  for (const auto& entry : order.includes) {
-    includes.push_back({entry.library, *entry.core, PlaceOf(*entry.file, entry.mark)});
-  }
-  return includes;
-}
 
 }  // namespace Tarvo

@@ -21,10 +21,11 @@ struct Language {
 };
 const Language kVerilog{&LDXParser::LDX_HDL_VERILOG, "v", &Kel_Index::KEL_VERILOG_SUBDIRECTORY};
 const Language kVhdl{&LDXParser::LDX_HDL_VHDL, "vhd", &Kel_Index::KEL_VHDL_SUBDIRECTORY};
+const Language& kDefault = kVhdl;
 
 const Language* LanguageOf(const StringBase& text) {
   for (const Language* language : {&kVerilog, &kVhdl}) {
-    if (Matches(text, *language->name)) return language;
+    if (EqualsIgnoringCase(text, *language->name)) return language;
   }
   return nullptr;
 }
@@ -38,32 +39,35 @@ const Language* LanguageOf(const Port::FileName& file) {
 
 }  // namespace
 
-HdlPlacement PlaceSource(const StringBase& coreLanguage, const StringBase& language,
-                         const Port::FileName& file) {
-  HdlPlacement placement;
-  placement.language = language;
-  const auto refuse = [&](HdlPlacement::Verdict verdict) {
-    placement.verdict = verdict;
-    return placement;
+const StringBase& DefaultLanguage() { return *kDefault.name; }
+
+SourceLanguage SettleLanguage(const StringBase& coreLanguage, const StringBase& language,
+                              const Port::FileName& file) {
+  SourceLanguage result;
+  result.language = language;
+  const auto refuse = [&](SourceLanguage::Verdict verdict) {
+    result.verdict = verdict;
+    return result;
   };
   if (language.GetLength() > 0) {
-    if (!LanguageOf(language)) return refuse(HdlPlacement::UnknownLanguage);
-    if (Matches(coreLanguage, LDXParser::LDX_HDL_BOTH)) return refuse(HdlPlacement::LanguageOnBoth);
-  } else if (Matches(coreLanguage, LDXParser::LDX_HDL_MIXED)) {
-    placement.assumed = true;
-    placement.language = LDXParser::LDX_HDL_VHDL;
+    if (!LanguageOf(language)) return refuse(SourceLanguage::UnknownLanguage);
+    if (EqualsIgnoringCase(coreLanguage, LDXParser::LDX_HDL_BOTH))
+      return refuse(SourceLanguage::LanguageOnBoth);
+  } else if (EqualsIgnoringCase(coreLanguage, LDXParser::LDX_HDL_MIXED)) {
+    result.assumed = true;
+    result.language = *kDefault.name;
   } else if (LanguageOf(coreLanguage)) {
-    placement.language = coreLanguage;
+    result.language = coreLanguage;
   }
-  const Language* const declared = LanguageOf(placement.language);
+  const Language* const declared = LanguageOf(result.language);
   const Language* const shown = LanguageOf(file);
-  if (declared && shown && declared != shown) return refuse(HdlPlacement::AgainstExtension);
-  if (!declared && !shown) return refuse(HdlPlacement::NeitherLanguageNorExtension);
+  if (declared && shown && declared != shown) return refuse(SourceLanguage::AgainstExtension);
+  if (!declared && !shown) return refuse(SourceLanguage::NeitherLanguageNorExtension);
   const Language& settled = shown ? *shown : *declared;
-  if (!declared) placement.language = *settled.name;
-  placement.subdirectory = *settled.subdirectory;
-  if (!file.HasExtension()) placement.missingExtension = settled.extension;
-  return placement;
+  if (!declared) result.language = *settled.name;
+  result.subdirectory = *settled.subdirectory;
+  if (!file.HasExtension()) result.missingExtension = settled.extension;
+  return result;
 }
 
 StringBase LanguageByExtension(const Port::FileName& file) {

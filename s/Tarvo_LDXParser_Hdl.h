@@ -6,23 +6,29 @@
 
 namespace Tarvo {
 
+// The option of a core description that states the core's language.
+inline constexpr char kLanguageOption[] = "HDL";
+
+// The language of a core that states none, and of a source of a mixed core that gives none.
+const StringBase& DefaultLanguage();
+
 // What the language of a core, and the language and name that a file entry gives, say about the
-// file: its language, and its place below the `hdl` directory of its library.
-struct HdlPlacement {
+// file: its language, and the directory of that language.
+struct SourceLanguage {
   enum Verdict {
-    Placed,
+    Settled,
     UnknownLanguage,   // the entry's language is none
     LanguageOnBoth,    // the entry gives one although extensions alone decide in this core
     AgainstExtension,  // the file's extension is that of the other language
     NeitherLanguageNorExtension
   };
 
-  Verdict verdict = Placed;
-  // The core is a mixed one and the entry gives no language, so that VHDL was taken.
+  Verdict verdict = Settled;
+  // The core is a mixed one and the entry gives no language, so that the default was taken.
   bool assumed = false;
   // As the entry or the core writes it.
   StringBase language;
-  // The language's subdirectory, and the extension that the file's name lacks. For a placed file.
+  // The language's subdirectory, and the extension that the file's name lacks. For a settled file.
   StringBase subdirectory;
   StringBase missingExtension;
 };
@@ -36,8 +42,8 @@ struct HdlPlacement {
 //     MIXED      VHDL                         that one
 //     BOTH       by the file's extension      refused
 //     other      by the file's extension      that one
-HdlPlacement PlaceSource(const StringBase& coreLanguage, const StringBase& language,
-                         const Port::FileName& file);
+SourceLanguage SettleLanguage(const StringBase& coreLanguage, const StringBase& language,
+                              const Port::FileName& file);
 
 // The language that a file's extension tells, or empty.
 StringBase LanguageByExtension(const Port::FileName& file);

@@ -5,7 +5,7 @@
 
 #include "Port_Input.h"
 #include "Tarvo_FileScanner.h"
-#include "Tarvo_OptionDefaults.h"
+#include "Tarvo_KnownProperties.h"
 #include "Tarvo_PropertyList.h"
 #include "Tarvo_QVRStatement.h"
 #include "Tarvo_Report.h"
@@ -24,12 +24,6 @@ const StringBase OptionScanner::QVR_OPTION_STYLE = "STYLE";
 const StringBase OptionScanner::QVR_OPTION_STYLE_HDL = "HDL";
 const StringBase OptionScanner::QVR_OPTION_USAGE_LEVEL = "USAGE_LEVEL";
 const StringBase OptionScanner::QVR_OPTION_USAGE_LEVEL_ADVANCED = "ADVANCED_USER";
-
-const DefaultRow kOptionDefaults[4] = {
-    {&OptionScanner::QVR_OPTION_IMP_NETLIST, &OptionScanner::QVR_FALSE},
-    {&OptionScanner::QVR_OPTION_RUN_TRAMFOLD, &OptionScanner::QVR_FALSE},
-    {&OptionScanner::QVR_OPTION_STYLE, &OptionScanner::QVR_OPTION_STYLE_HDL},
-    {&OptionScanner::QVR_OPTION_USAGE_LEVEL, &OptionScanner::QVR_OPTION_USAGE_LEVEL_ADVANCED}};
 
 namespace {
 
@@ -74,8 +68,10 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
     kModule.Error("QVR unparsable OPTION: %s line %d, %s\n", name, lineNumber, StringBase(line));
     ok = false;
   }
-  ForEachMissing(options, kOptionDefaults,
-                 [&](const DefaultRow& row) { options.emplace_back(*row.name, *row.value); });
+  ForEachMissing(options, KnownProperties::OfCores(),
+                 [&](const StringBase& option, const StringBase& value) {
+                   options.emplace_back(option, value);
+                 });
   if (ok) return;
   throw Report::Told(Report::Exception(AppException::Failure, "Unable to parse QVR %s\n", name));
 }

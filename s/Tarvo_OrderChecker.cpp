@@ -18,10 +18,6 @@ using Port::FileName;
 
 namespace {
 
-KelPlace PlaceOf(const StringBase& file, const AnalyseOrder::Mark& mark) {
-  return {file, mark.line, mark.column, mark.length};
-}
-
 // A fault at a place that was read before.
 void Tell(const KelDiagnosticCode& code, const KelPlace& place, const StringBase& text) {
   Diagnosis::Add([&] { return Diagnosis::AtPlace(code, place, text); });
@@ -93,7 +89,7 @@ void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
     for (const auto& source : library.sources) {
       isNormal = isNormal && IsNormal(source->fileKey.View());
       if (IsThere(source->location)) continue;
-      Tell(Codes::kMissingSource, PlaceOf(*source->origin->file, source->mark),
+      Tell(Codes::kMissingSource, source->mark.In(*source->origin->file),
            Say({"source does not exist: ",
                 ShortName(index, *library.key, source->location).View()}));
     }
@@ -112,11 +108,10 @@ void OrderChecker::CheckNames(const AnalyseOrder::SourceList& sources) {
       const AnalyseOrder::Source& other = *first->second;
       Diagnosis::Add([&] {
         return Diagnosis::With(
-            Diagnosis::AtPlace(Codes::kDuplicateSource,
-                               PlaceOf(*source->origin->file, source->mark),
+            Diagnosis::AtPlace(Codes::kDuplicateSource, source->mark.In(*source->origin->file),
                                Say({ShortName(index, *library.key, source->location).View(),
                                     " is listed already under another name"})),
-            PlaceOf(*other.origin->file, other.mark), "first listed here");
+            other.mark.In(*other.origin->file), "first listed here");
       });
     }
   }
@@ -126,7 +121,7 @@ void OrderChecker::CheckIncludeDirectories(const AnalyseOrder& order, const Kel_
   for (const AnalyseOrder::IncludeDirectory& directory : order.includeDirectories) {
     includeDirectories.insert(Normal(directory.location));
     if (IsDirectory(directory.location)) continue;
-    Tell(Codes::kMissingIncludeDirectory, PlaceOf(*directory.file, directory.mark),
+    Tell(Codes::kMissingIncludeDirectory, directory.mark.In(*directory.file),
          Say({"include directory is not a directory: ",
               ShortName(index, key, directory.location).View()}));
   }
@@ -139,8 +134,7 @@ void OrderChecker::AddEdges(const AnalyseOrder& order, const Kel_Key& key) {
   for (const auto* const includes : {&order.includes, &order.further}) {
     for (const AnalyseOrder::Include& include : *includes) {
       cores.emplace(*include.file, *include.from);
-      own[include.from->GetKey()].push_back(
-          {*include.core, PlaceOf(*include.file, include.mark), true});
+      own[include.from->GetKey()].push_back({*include.core, include.mark.In(*include.file), true});
       cores.emplace(OrderFile(index, *include.core).GetName(), *include.core);
     }
   }
@@ -162,7 +156,7 @@ void OrderChecker::AddSingleSources(const AnalyseOrder::Library& library,
     if (!seen.insert(&file).second) continue;
     const auto core = cores.find(file);
     if (core == cores.end() || core->second == *library.key) continue;
-    own[core->second.GetKey()].push_back({*library.key, PlaceOf(file, source->mark), false});
+    own[core->second.GetKey()].push_back({*library.key, source->mark.In(file), false});
   }
 }
 

@@ -9,16 +9,31 @@
 
 namespace Tarvo {
 
-// What all users of a PropertyList share: the first match, the names, and rows of defaults.
+// What all users of a PropertyList share: the first match, the names, and rows of known properties.
 
-// A row of a table of defaults, and what the properties must show for it to apply, if anything. It
-// points at exported constants, so that no table depends on the order in which modules load.
-struct DefaultRow {
-  const StringBase* name;
-  const StringBase* value;
-  bool (*applies)(const PropertyList& properties) = nullptr;
+// A property that means something to tools: its name, and the default that it has where it is not
+// stated, if there is one. A default may count for some records alone.
+//
+// A row points at exported constants, so that no table depends on the order in which modules load.
+struct KnownProperty {
+  using Condition = bool (*)(const PropertyList& record);
+
+  constexpr KnownProperty(const char* name) : literal(name) {}
+  constexpr KnownProperty(const StringBase& name, const StringBase* defaultValue = nullptr,
+                          Condition hasDefault = nullptr)
+      : constant(&name), value(defaultValue), condition(hasDefault) {}
+
+  StringBase GetName() const { return constant ? *constant : StringBase(literal); }
+  bool HasDefault(const PropertyList& record) const {
+    return value != nullptr && (condition == nullptr || condition(record));
+  }
+
+  const char* literal = nullptr;
+  const StringBase* constant = nullptr;  // the name of every property that has a default
+  const StringBase* value = nullptr;     // the default, or null
+  Condition condition = nullptr;         // null for a default that always counts
 };
-using DefaultRows = std::span<const DefaultRow>;
+using KnownPropertyRows = std::span<const KnownProperty>;
 
 // The value of the first entry with exactly that name, or null.
 inline const StringBase* FindValue(const PropertyList& properties, const StringBase& name) {
@@ -35,24 +50,30 @@ inline StringList NamesOf(const PropertyList& properties) {
   return names;
 }
 
-inline bool Applies(const DefaultRow& row, const PropertyList& properties) {
-  return row.applies == nullptr || row.applies(properties);
+inline StringList NamesOf(KnownPropertyRows rows) {
+  StringList names;
+  names.reserve(rows.size());
+  for (const KnownProperty& row : rows) names.push_back(row.GetName());
+  return names;
 }
 
 // The default of that name, in either letter case, or null.
-inline const StringBase* FindDefault(const PropertyList& properties, DefaultRows defaults,
+inline const StringBase* FindDefault(const PropertyList& record, KnownPropertyRows known,
                                      const StringBase& name) {
-  const auto found = std::find_if(defaults.begin(), defaults.end(), [&](const DefaultRow& row) {
-    return Matches(name, *row.name) && Applies(row, properties);
+  const auto found = std::find_if(known.begin(), known.end(), [&](const KnownProperty& row) {
+    return row.value != nullptr && EqualsIgnoringCase(name, *row.constant) &&
+           row.HasDefault(record);
   });
-  return found == defaults.end() ? nullptr : found->value;
+  return found == known.end() ? nullptr : found->value;
 }
 
-// Gives `add` each row that applies and whose name is missing, in their order.
+// Gives `add` the name and value of each default whose property is not stated, in their order.
 template <class Add>
-void ForEachMissing(const PropertyList& properties, DefaultRows defaults, const Add& add) {
-  for (const DefaultRow& row : defaults) {
-    if (!FindValue(properties, *row.name) && Applies(row, properties)) add(row);
+void ForEachMissing(const PropertyList& record, KnownPropertyRows known, const Add& add) {
+  for (const KnownProperty& row : known) {
+    if (row.value != nullptr && !FindValue(record, *row.constant) && row.HasDefault(record)) {
+      add(*row.constant, *row.value);
+    }
   }
 }
 

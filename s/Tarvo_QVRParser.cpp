@@ -10,7 +10,7 @@
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
-#include "Tarvo_OptionDefaults.h"
+#include "Tarvo_KnownProperties.h"
 #include "Tarvo_PropertyList.h"
 #include "Tarvo_QVRStatement.h"
 #include "Tarvo_Report.h"
@@ -64,48 +64,18 @@ using Records = std::vector<QVRRecord>;
 
 constexpr Report::Module kModule{"s/Tarvo_QVRParser", "1.0"};
 
-bool IsVector(const PropertyList& port) {
-  const StringBase* const range = FindValue(port, Q::QVR_PORT_VEC);
-  return range != nullptr && range->GetLength() > 0;
-}
-
-bool IsInterrupt(const PropertyList& port) {
-  const StringBase* const signal = FindValue(port, Q::QVR_PORT_SIGIS);
-  return signal != nullptr && Matches(*signal, Q::QVR_PORT_SIGIS_INTERRUPT);
-}
-
-const DefaultRow kParameterDefaults[] = {{&Q::QVR_ASSIGNMENT, &Q::QVR_ASSIGNMENT_OPTIONAL},
-                                         {&Q::QVR_ISVALID, &Q::QVR_TRUE},
-                                         {&Q::QVR_PERMIT, &Q::QVR_PERMIT_ADVANCED_USER},
-                                         {&Q::QVR_PARAMETER_TYPE, &Q::QVR_PARAMETER_TYPE_HDL}};
-
-const DefaultRow kBusInterfaceDefaults[] = {
-    {&Q::QVR_ISVALID, &Q::QVR_TRUE},
-    {&Q::QVR_BUS_INTERFACE_SHARES_ADDR, &Q::QVR_BUS_INTERFACE_SHARES_ADDR_ALL}};
-
-const DefaultRow kIoInterfaceDefaults[] = {{&Q::QVR_ISVALID, &Q::QVR_TRUE}};
-
-const DefaultRow kPortDefaults[] = {
-    {&Q::QVR_ASSIGNMENT, &Q::QVR_ASSIGNMENT_OPTIONAL},
-    {&Q::QVR_PORT_ENABLE, &Q::QVR_PORT_ENABLE_SINGLE},
-    {&Q::QVR_PORT_ENDIAN, &Q::QVR_PORT_ENDIAN_BIG, IsVector},
-    {&Q::QVR_PORT_INITIALVAL, &Q::QVR_PORT_INITIALVAL_GND},
-    {&Q::QVR_PORT_INTERRUPT_PRIORITY, &Q::QVR_PORT_INTERRUPT_PRIORITY_MEDIUM, IsInterrupt},
-    {&Q::QVR_ISVALID, &Q::QVR_TRUE},
-    {&Q::QVR_PERMIT, &Q::QVR_PERMIT_ADVANCED_USER}};
-
-// What the kinds of records differ in: how messages call one, its defaults, and for an interface
-// the key that names it and that ties its members to it.
+// What the kinds of records differ in: how messages call one, its known properties, and for an
+// interface the key that names it and that ties its members to it.
 struct Kind {
   const char* noun;
-  DefaultRows defaults;
+  KnownPropertyRows (*known)();
   const StringBase* key = nullptr;
 };
-const Kind kParameter{"Parameter", kParameterDefaults};
-const Kind kGeneric{"Generic", kParameterDefaults};
-const Kind kBusInterface{"Bus Interface", kBusInterfaceDefaults, &Q::QVR_BUS_IF_NAME};
-const Kind kIoInterface{"I/O Interface", kIoInterfaceDefaults, &Q::QVR_IO_IF_NAME};
-const Kind kPort{"Port", kPortDefaults};
+const Kind kParameter{"Parameter", KnownProperties::OfParameters};
+const Kind kGeneric{"Generic", KnownProperties::OfParameters};
+const Kind kBusInterface{"Bus Interface", KnownProperties::OfBusInterfaces, &Q::QVR_BUS_IF_NAME};
+const Kind kIoInterface{"I/O Interface", KnownProperties::OfIoInterfaces, &Q::QVR_IO_IF_NAME};
+const Kind kPort{"Port", KnownProperties::OfPorts};
 
 // A record that its first pair names. That pair's value stands under each of the value keys, behind
 // the name and in front of the other pairs.
@@ -128,7 +98,7 @@ QVRRecord MakeNamedByKey(const QVRStatement::List& list, const StringBase& key) 
   record.properties.reserve(list.pairs.size() + 1);
   for (const QVRStatement::Pair& pair : list.pairs) {
     Property property{StringBase(pair.key), StringBase(pair.value)};
-    if (Matches(property.first, key)) {
+    if (EqualsIgnoringCase(property.first, key)) {
       record.name = property.second;
       record.properties.emplace_back(Q::QVR_PROPERTY_NAME, property.second);
     }
@@ -140,8 +110,8 @@ QVRRecord MakeNamedByKey(const QVRStatement::List& list, const StringBase& key) 
 bool IsGeneric(const QVRRecord& parameter) {
   return std::none_of(parameter.properties.begin(), parameter.properties.end(),
                       [](const Property& property) {
-                        return Matches(property.first, Q::QVR_PARAMETER_TYPE) &&
-                               Matches(property.second, Q::QVR_PARAMETER_TYPE_NON_HDL);
+                        return EqualsIgnoringCase(property.first, Q::QVR_PARAMETER_TYPE) &&
+                               EqualsIgnoringCase(property.second, Q::QVR_PARAMETER_TYPE_NON_HDL);
                       });
 }
 
@@ -162,29 +132,31 @@ auto& Find(AnyRecords& records, const Kind& kind, const StringBase& name) {
 }
 
 // What the Get of a property and the List of them share, for options too: the same rows.
-const StringBase* FindStatedOrDefault(const PropertyList& properties, DefaultRows defaults,
+const StringBase* FindStatedOrDefault(const PropertyList& properties, KnownPropertyRows known,
                                       const StringBase& name) {
   const StringBase* const stated = FindValue(properties, name);
-  return stated ? stated : FindDefault(properties, defaults, name);
+  return stated ? stated : FindDefault(properties, known, name);
 }
 
-StringList ListStatedAndDefault(const PropertyList& properties, DefaultRows defaults) {
+StringList ListStatedAndDefault(const PropertyList& properties, KnownPropertyRows known) {
   StringList names = NamesOf(properties);
-  ForEachMissing(properties, defaults, [&](const DefaultRow& row) { names.push_back(*row.name); });
+  ForEachMissing(properties, known, [&](const StringBase& name, const StringBase& /*value*/) {
+    names.push_back(name);
+  });
   return names;
 }
 
 StringBase GetProperty(const Records& records, const Kind& kind, const StringBase& name,
                        const StringBase& property) {
   const QVRRecord& record = Find(records, kind, name);
-  const StringBase* const value = FindStatedOrDefault(record.properties, kind.defaults, property);
+  const StringBase* const value = FindStatedOrDefault(record.properties, kind.known(), property);
   if (value) return *value;
   throw Report::Exception(AppException::NotFound, "Cannot find %s %s Property %s\n", kind.noun,
                           name, property);
 }
 
 StringList ListProperties(const Records& records, const Kind& kind, const StringBase& name) {
-  return ListStatedAndDefault(Find(records, kind, name).properties, kind.defaults);
+  return ListStatedAndDefault(Find(records, kind, name).properties, kind.known());
 }
 
 void SetProperty(Records& records, const Kind& kind, const StringBase& name,
@@ -295,7 +267,9 @@ bool QVRParser::AddInterface(const QVRStatement::List& list, unsigned number, co
   return true;
 }
 
-StringList QVRParser::ListOptions() const { return ListStatedAndDefault(options, kOptionDefaults); }
+StringList QVRParser::ListOptions() const {
+  return ListStatedAndDefault(options, KnownProperties::OfCores());
+}
 
 StringList QVRParser::ListParameters() const { return RecordNames(parameters); }
 
@@ -308,7 +282,7 @@ StringList QVRParser::ListIoInterfaces() const { return RecordNames(ioInterfaces
 StringList QVRParser::ListPorts() const { return RecordNames(ports); }
 
 StringBase QVRParser::GetOptionValue(const StringBase& option) const {
-  const StringBase* const value = FindStatedOrDefault(options, kOptionDefaults, option);
+  const StringBase* const value = FindStatedOrDefault(options, KnownProperties::OfCores(), option);
   if (value) return *value;
   throw Report::Exception(AppException::NotFound, "Cannot find option %s\n", option);
 }

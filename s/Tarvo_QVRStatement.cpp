@@ -109,7 +109,7 @@ bool FindName(const List& list, const StringBase& key, std::size_t& position, Li
   bool isNamed = false;
   bool isFound = false;
   for (std::size_t i = 0; i < list.pairs.size(); ++i) {
-    if (!Matches(StringBase(list.pairs[i].key), key)) continue;
+    if (!EqualsIgnoringCase(StringBase(list.pairs[i].key), key)) continue;
     if (isNamed) {
       fault = {list.pairs[i].key, "the interface has two names"};
       return false;

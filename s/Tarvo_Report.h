@@ -126,7 +126,7 @@ inline AppException Told(AppException exception) {
 }
 
 inline DebugMessenger& Logger() {
-  static DebugMessenger& logger = *DebugMessengerFactory::GetLogger("BaseIP");
+  static DebugMessenger& logger = *DebugMessengerFactory::GetLogger(kLoggerName);
   return logger;
 }
 

@@ -20,17 +20,17 @@ void SourceMaker::EnterLibrary(std::string_view entered) {
   origin.reset();
 }
 
-void SourceMaker::EnterDirectory(const HdlPlacement& placement) {
-  if (!origin || origin->language != placement.language) {
+void SourceMaker::EnterDirectory(const SourceLanguage& settled) {
+  if (!origin || origin->language != settled.language) {
     origin = std::make_shared<const AnalyseOrder::Origin>(
-        AnalyseOrder::Origin{library, file, placement.language});
+        AnalyseOrder::Origin{library, file, settled.language});
   }
-  if (subdirectory == placement.subdirectory) return;
+  if (subdirectory == settled.subdirectory) return;
   FileName hdl = location;
   hdl.SetBase("");
   hdl.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
-  hdl.PushPathEnd(placement.subdirectory);
-  subdirectory = placement.subdirectory;
+  hdl.PushPathEnd(settled.subdirectory);
+  subdirectory = settled.subdirectory;
   directory = hdl.GetHead();
   fileKeyPrefix = FileKey::OfLocation(hdl);
 }
@@ -38,14 +38,14 @@ void SourceMaker::EnterDirectory(const HdlPlacement& placement) {
 // A name with levels may lead to another directory of a language, so its file key is read off the
 // whole location.
 AnalyseOrder::Source SourceMaker::Make(const StringBase& text, const FileName& name,
-                                       const HdlPlacement& placement,
+                                       const SourceLanguage& settled,
                                        const AnalyseOrder::Mark& mark) {
-  EnterDirectory(placement);
+  EnterDirectory(settled);
   AnalyseOrder::Source source{origin, name, fileKeyPrefix, {}, mark};
   const StringBase levels = name.GetPath();
   source.location.SetHead(directory);
-  if (placement.missingExtension.GetLength() > 0) {
-    source.location.SetExtension(placement.missingExtension);
+  if (settled.missingExtension.GetLength() > 0) {
+    source.location.SetExtension(settled.missingExtension);
   }
   if (levels.GetLength() > 0) {
     source.location.PushPathEnd(levels);
@@ -53,7 +53,7 @@ AnalyseOrder::Source SourceMaker::Make(const StringBase& text, const FileName& n
   } else {
     source.fileKey.Append(source.location.GetTail());
   }
-  source.entryKey = FileKey::OfEntry(*library, text, placement.missingExtension);
+  source.entryKey = FileKey::OfEntry(*library, text, settled.missingExtension);
   if (source.entryKey == source.fileKey) source.entryKey.Empty();
   return source;
 }

@@ -25,10 +25,10 @@ class SourceMaker {
 
   // The source of that name, given as text too, in the library that was entered last.
   AnalyseOrder::Source Make(const StringBase& text, const Port::FileName& name,
-                            const HdlPlacement& placement, const AnalyseOrder::Mark& mark);
+                            const SourceLanguage& settled, const AnalyseOrder::Mark& mark);
 
  private:
-  void EnterDirectory(const HdlPlacement& placement);
+  void EnterDirectory(const SourceLanguage& settled);
 
   const Kel_Index& index;
   std::shared_ptr<const StringBase> file;

@@ -32,7 +32,7 @@ bool ReadHeader(std::string_view line, Header& header, LineFault& fault) {
   header = Header();
   std::string_view field;
   if (!ReadNeeded(tokens, field, "missing name", fault)) return false;
-  while (!Matches(field, kEndOfHeader)) {
+  while (!EqualsIgnoringCase(field, kEndOfHeader)) {
     header.names.push_back(field);
     if (!ReadNeeded(tokens, field, "missing FILES after the names", fault)) return true;
   }

@@ -8,7 +8,7 @@
 #include "Tarvo_Export.h"
 #include "Tarvo_LineFault.h"
 
-// The lines of a table of netlists: a header that names parameters, and rows with a value for each
+// The lines of a netlist table: a header that names parameters, and rows with a value for each
 // of them and netlists. Values may be quoted.
 //
 //     MODE WIDTH FILES

@@ -19,7 +19,7 @@ struct ListedNetlist {
   KelPlace place;
 };
 
-// Tells all that is wrong with the table of netlists of a core, to the collector of this thread.
+// Tells all that is wrong with the netlist table of a core, to the collector of this thread.
 // Gives the netlists that it lists; whether they exist is not looked at.
 std::vector<ListedNetlist> CheckTable(const Port::FileName& file, const Kel_Index& index,
                                       const Kel_Key& key, const DescribedCore& core);

@@ -50,7 +50,7 @@ StringBase FindMisspelt(std::string_view text, const StringList& words) {
   const auto fits = [&](const StringBase& word) {
     const bool isAsLong =
         word.GetLength() + 1 >= text.size() && text.size() + 1 >= word.GetLength();
-    return Matches(asked, word) || (text.size() >= 3 && isAsLong);
+    return EqualsIgnoringCase(asked, word) || (text.size() >= 3 && isAsLong);
   };
   const auto found = std::find_if(near.begin(), near.end(), fits);
   return found == near.end() ? StringBase() : *found;
@@ -68,6 +68,12 @@ KelDiagnostic TellUnknownParameter(const FileScanner& lines, std::string_view na
   return Diagnosis::At(Codes::kUnknownParameter, SpanOf(lines, name),
                        Diagnosis::Say({"the core has no parameter '", name, "'"}),
                        DidYouMean(name, parameters));
+}
+
+KelDiagnostic TellNoRepository(const StringBase& directory) {
+  return Diagnosis::Of(Codes::kNotARepository, directory,
+                       Diagnosis::Say({"this is no repository, it has no subdirectory ",
+                                       Kel_Index::KEL_VERSIONS_SUBDIRECTORY.View()}));
 }
 
 }  // namespace Tarvo

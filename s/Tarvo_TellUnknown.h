@@ -27,6 +27,9 @@ KelDiagnostic TellUnknownLibrary(const FileScanner& lines, const Kel_Index& inde
 KelDiagnostic TellUnknownParameter(const FileScanner& lines, std::string_view name,
                                    const StringList& parameters);
 
+// A directory without a subdirectory for versions was given as a repository.
+KelDiagnostic TellNoRepository(const StringBase& directory);
+
 }  // namespace Tarvo
 
 #endif

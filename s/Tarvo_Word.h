@@ -9,14 +9,14 @@ namespace Tarvo {
 
 // How a word from a file is tested against a fixed word of its format: in either letter case. Names
 // that a file gives are compared exactly instead.
-inline bool Matches(const StringBase& text, const StringBase& word) noexcept {
+inline bool EqualsIgnoringCase(const StringBase& text, const StringBase& word) noexcept {
   return text.GetLength() == word.GetLength() &&
          text.Compare(word, StringBase::CompareIgnoreCase) == 0;
 }
 
 // The same for a part of a line, of which no text is made unless it is as long as the word.
-inline bool Matches(std::string_view text, std::string_view word) {
-  return text.size() == word.size() && Matches(StringBase(text), StringBase(word));
+inline bool EqualsIgnoringCase(std::string_view text, std::string_view word) {
+  return text.size() == word.size() && EqualsIgnoringCase(StringBase(text), StringBase(word));
 }
 
 }  // namespace Tarvo

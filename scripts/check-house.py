@@ -21,19 +21,20 @@ RANKS = [
     (1, r"include/Tarvo_Export\.h"),
     (2, r"include/Tarvo_KelDiagnostic\.h"),
     (2, r"s/Tarvo_(Word|Existence|LineFault|RangeText)\..*"),
-    (3, r"s/Tarvo_(DiagnosticCodes|PropertyNames)\.h"),
+    (3, r"s/Tarvo_DiagnosticCodes\.h"),
     (4, r"s/Tarvo_Diagnosis\..*"),
     (5, r"s/Tarvo_(Report|PropertyList|TokenReader)\..*"),
     (6, r"(include|s)/Tarvo_(Kel_Key|KelLibrary_Utils|FileScanner)\..*"),
     (7, r"(include|s)/Tarvo_(KelRecords|TellFault)\..*"),
-    (8, r"s/Tarvo_(Guard|QVRStatement|LDXEntry|TEWLine|OptionDefaults)\..*"),
+    (13, r"s/Tarvo_KnownProperties\.cpp"),  # its rows point at constants of the readers
+    (8, r"s/Tarvo_(Guard|QVRStatement|LDXEntry|TEWLine|KnownProperties)\..*"),
     (9, r"(include|s)/Tarvo_OptionScanner\..*"),
     (10, r"(include|s)/Tarvo_Kel_Index\..*"),
     (11, r"(include|s)/Tarvo_(QVRParser|AnalyseOrder|FileKey|TellUnknown)\..*"),
     (12, r"s/Tarvo_(AnalyseOrderReader|LDXParser_Hdl)\.h"),
     (13, r"s/Tarvo_SourceMaker\..*"),
-    (14, r"(include|s)/Tarvo_(LDXParser(_Hdl)?|TEWParser)\..*"),
-    (15, r"(include|s)/Tarvo_KelIP(_Catalogues)?\..*"),
+    (14, r"(include|s)/Tarvo_(LDXParser(_Hdl|_Answers)?|TEWParser)\..*"),
+    (15, r"(include|s)/Tarvo_KelIP\..*"),
     (16, r"(include|s)/Tarvo_KelLibrary\..*"),
     (17, r"s/Tarvo_(DescriptionChecker|OrderChecker)\..*"),
     (18, r"s/Tarvo_TableChecker\..*"),
@@ -58,7 +59,7 @@ def rank_of(path):
     """The rank and the module of a file, or None for one that the table does not know."""
     for rank, pattern in RANKS:
         if re.fullmatch(pattern, path):
-            stem = re.sub("_(Hdl|Catalogues)$", "", pathlib.Path(path).stem)  # second sources
+            stem = re.sub("_(Hdl|Answers)$", "", pathlib.Path(path).stem)  # second sources
             module = path.split("/")[0] if rank in (0, 21, 22) else stem
             return rank, module
     return None

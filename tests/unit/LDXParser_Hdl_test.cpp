@@ -10,20 +10,20 @@ using namespace Tarvo;
 
 // What becomes of a file entry: its language, place and missing extension, or the verdict.
 std::string Place(const char* core, const char* language, const char* file) {
-  const HdlPlacement placement = PlaceSource(core, language, Port::FileName(file));
+  const SourceLanguage placement = SettleLanguage(core, language, Port::FileName(file));
   std::string text = placement.assumed ? "assumed " : "";
   switch (placement.verdict) {
-    case HdlPlacement::Placed:
+    case SourceLanguage::Settled:
       text += std::string(placement.language) + " " + placement.subdirectory.GetText();
       return text + (placement.missingExtension.GetLength() ? " ." : "") +
              placement.missingExtension.GetText();
-    case HdlPlacement::UnknownLanguage:
+    case SourceLanguage::UnknownLanguage:
       return text + "unknown";
-    case HdlPlacement::LanguageOnBoth:
+    case SourceLanguage::LanguageOnBoth:
       return text + "on both";
-    case HdlPlacement::AgainstExtension:
+    case SourceLanguage::AgainstExtension:
       return text + "against " + placement.language.GetText();
-    case HdlPlacement::NeitherLanguageNorExtension:
+    case SourceLanguage::NeitherLanguageNorExtension:
       return text + "neither";
   }
   return "";
