@@ -1,3 +1,7 @@
+// Merging is what an analysis spends its time on, so nothing here copies a source: lists hold
+// shared pointers, tables hold views of texts that the sources own, and synthesis and simulation
+// are one list until they differ.
+
 #include "Tarvo_AnalyseOrder.h"
 
 #include <algorithm>
@@ -19,6 +23,7 @@ const AnalyseOrder::Source* AnalyseOrder::SourceList::Add(const SourcePointer& s
 void AnalyseOrder::SourceList::AppendSource(const SourcePointer& source) {
   const std::shared_ptr<const Kel_Key>& library = source->origin->library;
   std::size_t position = libraries.size() - 1;
+  // The pointers are compared: sources that are made one after another share the key.
   if (libraries.empty() || libraries.back().key != library) {
     const auto [known, isNew] =
         libraryIndex.try_emplace(library->GetKey().View(), libraries.size());
@@ -37,6 +42,7 @@ AnalyseOrder::SourcePointers AnalyseOrder::SourceList::Append(SourceList& other)
     return known;
   }
   if (other.isKeyedByLocation) sourcesByKey.merge(other.sourcesByKey);
+  // Nothing of the other list is here yet, so its libraries come over whole.
   const bool allNew = other.isKeyedByLocation && other.sourcesByKey.empty();
   for (Library& library : other.libraries) {
     if (allNew && libraryIndex.try_emplace(library.key->GetKey().View(), libraries.size()).second) {

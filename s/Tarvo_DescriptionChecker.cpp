@@ -1,3 +1,7 @@
+// Goes through a description line by line, with the functions for a line that the readers use.
+// Faults of one line are told at once; what depends on other lines, as an interface that is
+// declared further down, waits for the end.
+
 #include "Tarvo_DescriptionChecker.h"
 
 #include <algorithm>
@@ -53,6 +57,7 @@ struct Keys {
 };
 
 const Keys& KeysOf(QVRStatement::Keyword keyword) {
+  // Made at the first call: exported constants are there by then.
   static const Keys none;
   static const Keys options{{"NAME", "VERSION"}, NamesOf(KnownProperties::OfCores())};
   static const Keys parameters{{"NAME", "VALUE", "DEFAULT_VALUE"},
@@ -153,6 +158,7 @@ DescribedCore DescriptionChecker::Check() {
 }
 
 void DescriptionChecker::CheckLine(Text line) {
+  // The walk comes first: a line that is bad for it costs the core all options.
   if (!CheckScanned(line)) return;
   const QVRStatement::Keyword keyword = QVRStatement::KeywordOf(line);
   if (keyword == QVRStatement::None) return CheckKeyword(line);
@@ -171,6 +177,7 @@ void DescriptionChecker::CheckKeyword(Text line) {
   const StringList near =
       KelLibrary_Utils::ListNear(StringBase(word), QVRStatement::ListKeywords());
   if (near.empty()) return;
+  // What the line would have declared is not to be told as undeclared.
   bad.insert(QVRStatement::KeywordOf(Say({near.front().View(), " "}).View()));
   Tell(Codes::kUnknownKeyword, word, "unknown keyword; the line is ignored",
        Say({"did you mean ", near.front().View(), "?"}));
@@ -197,6 +204,7 @@ void DescriptionChecker::CheckOption(Text line) {
   if (!Declare(QVRStatement::Option, option.pair.key)) return;
   CheckKey(QVRStatement::Option, {option.pair}, 0, 1);
   const Property stated = QVRStatement::MakeOption(option);
+  // A choice is judged by all that the option holds, as in HDL = VHDL 2008.
   Pair whole = option.pair;
   if (!option.tail.empty()) {
     whole.value =
@@ -249,6 +257,7 @@ void DescriptionChecker::CheckEnd(const QVRStatement::List& list) {
   Text written(last.key.data(), static_cast<std::size_t>(list.rest.data() - last.key.data()));
   written = written.substr(0, written.find_last_not_of(" ;") + 1);
   const StringBase mended = Say({written, ", ", list.rest});
+  // Would a comma have made it whole? That is tried on a statement of its own.
   const StringBase line = Say({"PORT ", mended.View()});
   QVRStatement::List read;
   LineFault fault;
@@ -365,6 +374,7 @@ bool DescriptionChecker::Declare(QVRStatement::Keyword keyword, Text declared) {
 
 void DescriptionChecker::AddParameter(const QVRStatement::List& list) {
   DescribedParameter parameter{StringBase(list.pairs.front().key), {}, {}};
+  // From the last to the first, so that the first of several stays.
   for (std::size_t i = list.pairs.size() - 1; i > 0; --i) {
     if (list.pairs[i].key == "RANGE") parameter.range = StringBase(list.pairs[i].value);
     if (list.pairs[i].key == "VALUES") parameter.values = StringBase(list.pairs[i].value);

@@ -1,3 +1,6 @@
+// Two stacks of each thread meet here: the collectors, which say who wants diagnostics, and the
+// inputs (see Port_Input), which say what is being read.
+
 #include "Tarvo_Diagnosis.h"
 
 #include <memory>
@@ -10,6 +13,7 @@ namespace Tarvo {
 
 namespace {
 
+// Each collector remembers the one that it was made in, so that they form a stack.
 thread_local DiagnosticCollector* innermost = nullptr;
 
 KelPlace PlaceOf(const Port_Input& input, Diagnosis::Span span = {}) {
@@ -74,6 +78,7 @@ KelDiagnostic Of(const KelDiagnosticCode& code, const StringBase& file, const St
 
 KelDiagnostic Failed(bool isWarning, const StringBase& message) {
   StringBase lines = message;
+  // Messages end in a line end, diagnostics don't.
   lines.Trim("\n", StringBase::TrimEnd);
   KelDiagnostic failed = At(Codes::kFailed, {}, lines);
   if (isWarning) failed.severity = KelDiagnostic::Warning;

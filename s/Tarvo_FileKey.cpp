@@ -1,3 +1,6 @@
+// Views are cut from both ends of a path instead of making its levels one by one: this runs for
+// every source.
+
 #include "Tarvo_FileKey.h"
 
 #include <algorithm>
@@ -31,6 +34,7 @@ void AppendLevels(StringBase& text, std::string_view path) {
   while (!path.empty()) {
     const std::size_t end = std::min(path.find('/'), path.size());
     text.Append(path.data(), static_cast<unsigned>(end));
+    // A doubled slash is no level, so it doesn't show in a key.
     if (end > 0) text.Append("/");
     path.remove_prefix(std::min(end + 1, path.size()));
   }
@@ -44,6 +48,8 @@ void AppendExtension(StringBase& name, const StringBase& extension) {
 
 }  // namespace
 
+// Upwards from the file to the directory of a language. Above that stands `hdl`, whatever it is
+// called, and above that the version.
 StringBase OfLocation(const Port::FileName& location) {
   const StringBase directory = location.GetPath();
   std::string_view rest = directory.View();

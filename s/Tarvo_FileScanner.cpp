@@ -1,3 +1,6 @@
+// A file is read in one piece and cleaned line by line within it. Readers get views of that piece,
+// so a line that states nothing costs no memory at all.
+
 #include "Tarvo_FileScanner.h"
 
 #include <memory>
@@ -55,6 +58,7 @@ FileScanner::FileScanner(const Port::FileName& file) : fileName(file.GetName()) 
   TARVO_TRACE("Opening File %s\n", fileName);
   OpenStream stream = Open(fileName);
   text = stream->TakeRest();
+  // A search through the whole text, for a trace alone.
   if (Report::IsTracing() && HasTabs(text)) TARVO_TRACE("  Tabs found in file %s\n", fileName);
   if (!Port::File::close(stream.release())) {
     throw Report::Exception(AppException::Failure, "Cannot close file %s\n", fileName);
@@ -72,6 +76,8 @@ std::string_view FileScanner::FindLine(std::size_t& next) {
   next = text.size() - rest.size();
   const std::string_view cleaned = WithoutBlanks(line.substr(0, line.find(kComment)));
   const auto start = static_cast<std::size_t>(cleaned.data() - text.data());
+  // In the text itself, so that no line is copied. A line that is handed out a second time is clean
+  // already, and views of it stay what they were.
   for (std::size_t tab = 0; (tab = cleaned.find(kTab, tab)) != std::string_view::npos;) {
     text[start + tab] = ' ';
   }
@@ -95,6 +101,7 @@ bool FileScanner::GetNextLine(StringBase& line) {
 bool FileScanner::GetNextLine(StringBase& line, unsigned int& lineNumber) {
   std::size_t next = position;
   const std::string_view found = FindLine(next);
+  // The step comes last: if memory runs out for the copy, the line is still the next one.
   line.Assign(found.data(), static_cast<unsigned>(found.size()));
   return StepTo(next, lineNumber);
 }
@@ -110,6 +117,7 @@ unsigned int FileScanner::GetColumn(std::string_view part) const noexcept {
   return static_cast<unsigned>(offset - lastPosition + 1);
 }
 
+// Cleaning leaves the comment in the text.
 bool FileScanner::HasComment() const noexcept {
   const std::string_view line = std::string_view(text).substr(lastPosition);
   return line.substr(0, line.find('\n')).find(kComment) != std::string_view::npos;

@@ -1,3 +1,7 @@
+// Cores are checked one after another, each within a collector of its own, so that one core's
+// faults say nothing of another. What needs all cores, versions that clash and files that nobody
+// lists, comes last.
+
 #include "Tarvo_KelChecker.h"
 
 #include <algorithm>
@@ -93,6 +97,7 @@ template <class Work>
 bool CheckRun::Collect(const Work& work) {
   DiagnosticCollector collector(DiagnosticCollector::InsteadOfMessages);
   work();
+  // A check that lost something must not pass for a clean one.
   if (collector.isIncomplete) throw std::bad_alloc();
   const bool isGood = std::none_of(collector.found.begin(), collector.found.end(), IsError);
   std::move(collector.found.begin(), collector.found.end(), std::back_inserter(found));
@@ -105,6 +110,7 @@ void CheckRun::CheckCores(const StringList& keys, const KelChecker::Progress& pr
     if (!Collect([&] { CheckCore(key); })) faulty.insert(key);
     if (progress) progress(++done, keys.size());
   }
+  // Behind all cores, when all ways between them are known.
   Collect([&] { orders.CheckVersions(); });
 }
 
@@ -182,6 +188,7 @@ void CheckRun::CheckRepository(const fs::path& versions) {
   ForEachEntry(versions, [&](const fs::directory_entry& entry) {
     const Kel_Key key(StringBase(entry.path().filename().c_str()));
     if (key.IsValid()) return;
+    // A stray directory is nobody's fault. One with data was meant for a version.
     const Existence data =
         LookForDirectory(DirectoryOf(entry.path() / Kel_Index::KEL_DATA_SUBDIRECTORY.GetText()));
     if (data == Existence::Yes) {
@@ -209,6 +216,7 @@ void CheckRun::FindUnlisted(const StringList& keys) {
 
 // Without extensions, any file counts. Links to directories are not followed.
 void CheckRun::FindUnlistedIn(const fs::path& directory, const std::set<std::string>& extensions) {
+  // Compilers find include files by themselves, so orders don't list them.
   if (orders.IsIncludeDirectory(DirectoryOf(directory))) return;
   ForEachEntry(directory, [&](const fs::directory_entry& entry) {
     boost::system::error_code error;
@@ -228,6 +236,7 @@ void CheckRun::FindUnlistedIn(const fs::path& directory, const std::set<std::str
 std::vector<KelDiagnostic> CheckRun::Finish() {
   std::stable_sort(found.begin(), found.end(),
                    [](const auto& left, const auto& right) { return Rank(left) < Rank(right); });
+  // Both purposes of an order may tell the same.
   const auto last =
       std::unique(found.begin(), found.end(),
                   [](const auto& left, const auto& right) { return Rank(left) == Rank(right); });

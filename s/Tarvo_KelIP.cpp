@@ -1,3 +1,6 @@
+// Each operation is a guarded row: the output, the failure in its own words, and the question to a
+// parser. Parsers are made at the first question that needs them.
+
 #include "Tarvo_KelIP.h"
 
 #include <algorithm>
@@ -49,6 +52,7 @@ constexpr char kNoNetlists[] = "Unable to list netlists for IP %s\n%s\n";
 // Empty for a source that is not listed, if that is needed, and for an unknown property.
 StringBase SourceProperty(const LDXParser& order, const StringBase& source,
                           const StringBase& property) {
+  // Sources are known by absolute paths, and callers may give others.
   const Port::FileName file(Port::FileName(source).GetAbsolutePath());
   if (property == KelIP::KEL_HDL_LIBRARY_PROPERTY) return order.GetFileLibrary(file).GetKey();
   if (property == KelIP::KEL_HDL_LANGUAGE_PROPERTY) return order.GetFileLanguage(file);
@@ -97,6 +101,7 @@ KelIPImpl::KelIPImpl(const Kel_Index& theIndex, const StringBase& text)
 }
 
 StringBase KelIPImpl::GetProperty(const StringBase& name) const {
+  // Those of the version, whatever the description states for them.
   if (name == KelIP::KEL_IP_NAME) return key.GetName();
   if (name == KelIP::KEL_IP_VERSION) return key.GetVersion();
   return qvrParser->GetOptionValue(name);
@@ -156,6 +161,7 @@ bool KelIP::GetIPProperty(const StringBase& name, StringBase& value) const {
           .With(ForUnknown::EmptyText),
       [&] {
         value = impl->GetProperty(name);
+        // An empty option is no answer, but nothing went wrong either: no message.
         return value.GetLength() > 0;
       });
 }

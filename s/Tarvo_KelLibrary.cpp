@@ -1,3 +1,6 @@
+// The walk, and rows of guarded operations. The walk keeps to one rule: a version that is bad in
+// any way costs nobody else an answer.
+
 #include "Tarvo_KelLibrary.h"
 
 #include <boost/filesystem.hpp>
@@ -64,6 +67,7 @@ bool KelLibraryImpl::RefreshLibrary() {
               }
               return all;
             });
+  // Behind a failure too: what was found until then stays.
   TARVO_TRACE("  Detected %d valid cores (%d all versions)\n", index.GetBaseIPCount(),
               index.GetFullIPCount());
   return complete;
@@ -80,6 +84,7 @@ bool KelLibraryImpl::AddRepository(const StringBase& repository) {
   }
   bool all = true;
   for (const fs::directory_entry& entry : fs::directory_iterator(versions)) {
+    // In this order of operands, so that a bad version keeps no other out.
     all = AddVersion(entry) && all;
   }
   return all;
@@ -111,6 +116,7 @@ bool KelLibrary::SetRepositoryPath(const StringBase& path) {
       Failure(kModule, "Unable to set repository path to %s\n%s\n", path).With(ForUnknown::CutOff),
       [&] {
         TARVO_TRACE("KEL Library: Reading repository path %s\n", path);
+        // Throws for a path with a bad piece, before anything is forgotten.
         impl->repositories = KelLibrary_Utils::GetPathVector(path);
         const bool complete = impl->RefreshLibrary();
         TARVO_TRACE("KEL Library: repository path set to %s\n", path);
@@ -127,6 +133,7 @@ StringBase KelLibrary::GetLocation(const StringBase& key) const {
 
 StringBase KelLibrary::GetLatestIPKey(const StringBase& key) const {
   return GuardText(Failure(kModule, "Unable to get latest IP key for IP %s\n%s\n", key), [&] {
+    // By the bare name, so that the key of an old version leads to the newest too.
     const Kel_Key core(Kel_Key(key).GetName());
     return impl->index.GetIPKey(core).GetKey();
   });

@@ -1,3 +1,5 @@
+// Small lists in one text, and texts that are near to each other.
+
 #include "Tarvo_KelLibrary_Utils.h"
 
 #include <algorithm>
@@ -16,6 +18,7 @@ namespace {
 const char* const kPathDelimiter = ";";
 const char* const kInterfaceDelimiter = ":";
 
+// Empty pieces are dropped.
 StringList Split(const StringBase& list, const char* delimiter) {
   const std::string text(list.View());
   const boost::tokenizer<boost::char_separator<char>> pieces(
@@ -36,6 +39,8 @@ bool IsDirectory(const StringBase& path) {
 // text of the other.
 std::size_t Distance(std::string_view left, std::string_view right) {
   using Row = std::vector<std::size_t>;
+  // Of the table of distances between all beginnings of both texts, only three rows are needed at a
+  // time.
   Row before;
   Row above(right.size() + 1);
   std::iota(above.begin(), above.end(), 0U);
@@ -56,6 +61,7 @@ std::size_t Distance(std::string_view left, std::string_view right) {
 // word is refused before letters are compared.
 bool IsNear(std::string_view text, std::string_view word) {
   if (text.size() < 2) return false;
+  // Who wrote the beginning of a word meant that word, however long it is.
   if (word.substr(0, text.size()) == text) return true;
   const std::size_t most = std::max<std::size_t>(1, text.size() / 3);
   if (text.size() > word.size() + most || word.size() > text.size() + most) return false;
@@ -79,6 +85,7 @@ StringList KelLibrary_Utils::ListNear(const StringBase& text, const StringList& 
 }
 
 StringList KelLibrary_Utils::GetPathVector(const StringBase& path) {
+  // All or none: with one piece left out, a tool would go on with other versions than it was told.
   StringList directories = Split(path, kPathDelimiter);
   for (const StringBase& directory : directories) {
     if (!IsDirectory(directory)) {

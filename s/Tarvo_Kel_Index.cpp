@@ -1,3 +1,6 @@
+// Two tables, one of locations and one of options, each by base name and then by version, newest
+// first. A version whose description is bad stands in the first alone.
+
 #include "Tarvo_Kel_Index.h"
 
 #include <algorithm>
@@ -27,6 +30,7 @@ namespace {
 
 constexpr Report::Module kModule{"s/Tarvo_Kel_Index", "1.0"};
 
+// Room for the cores of a usual library, so that the tables seldom grow.
 constexpr std::size_t kBucketHint = 100;
 
 // The keys of the entries that `gather` adds from each list, sorted, each once.
@@ -59,6 +63,8 @@ auto Find(const Table& table, const Kel_Key& key) {
   const auto core = table.find(key.GetName());
   if (core == table.end()) return entry;
   const auto& versions = core->second;
+  // A bare name stands for the front of the list. A full key never stands for another version,
+  // however much newer that is.
   const auto found = key.IsValid() ? FindKey(versions, key) : versions.begin();
   if (found != versions.end()) entry = &*found;
   return entry;
@@ -109,6 +115,7 @@ FileName Kel_Index::GetDataFile(const FileName& location, const Kel_Key& key,
   base.Append(KEL_VERSION);
   FileName file = location;
   file.PushPathEnd(KEL_DATA_SUBDIRECTORY);
+  // In this order: setting the base takes an extension away.
   file.SetBase(base);
   file.SetExtension(extension);
   return file;
@@ -135,6 +142,7 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
   if (!inserted.isNew) {
     TARVO_TRACE("Duplicate IP index entry %s at %s\nPrecedence given to %s\n", key.GetKey(),
                 location.GetName(), inserted.entry->second.GetName());
+    // No lookup sees it; it is kept for who asks what is hidden.
     hidden.emplace_back(key, location);
   } else if (described == Existence::No) {
     TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
@@ -146,6 +154,8 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
   return true;
 }
 
+// The reader throws for a bad description. The version is in `locations` by then, and stays there
+// without options.
 void Kel_Index::AddIPOptions(const Kel_Key& key, const FileName& description) {
   PropertyList taken = OptionScanner(key, description).TakeOptions();
   const auto first = std::make_move_iterator(taken.begin());
@@ -182,6 +192,7 @@ std::vector<FileName> Kel_Index::GetHiddenLocations(const Kel_Key& key) const {
   std::vector<FileName> found;
   const auto* const entry = Find(locations, key);
   if (!entry) return found;
+  // Few versions are hidden, so one list for all is enough.
   for (const auto& [hiddenKey, location] : hidden) {
     if (hiddenKey == entry->first) found.push_back(location);
   }

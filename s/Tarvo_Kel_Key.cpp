@@ -1,3 +1,6 @@
+// One expression tells a key from a bare name. What it finds is cut up by place, since each part
+// but the first has a fixed length.
+
 #include "Tarvo_Kel_Key.h"
 
 #include <algorithm>

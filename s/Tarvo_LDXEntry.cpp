@@ -1,3 +1,6 @@
+// The grammar of an analyse order. A line is an entry, is ignored, or is bad; there is nothing
+// between.
+
 #include "Tarvo_LDXEntry.h"
 
 #include "Tarvo_TokenReader.h"
@@ -8,6 +11,7 @@ namespace Tarvo {
 namespace {
 
 const char* const kDelimiters = " \"'";
+// These three count in small letters only; `all` counts in any.
 const char* const kBoth = "lib";
 const char* const kSynthesisOnly = "synlib";
 const char* const kSimulationOnly = "simlib";
@@ -66,6 +70,8 @@ StringList LDXKeywords() {
 bool ReadLDXEntry(std::string_view line, LDXEntry& entry, LineFault& fault) {
   TokenReader tokens(line, kDelimiters, TokenReader::WithGroups);
   entry = LDXEntry();
+  // In any letter case, though only small letters make an entry of it. So VLGINCDIR is ignored,
+  // where it would be an unknown keyword otherwise.
   const bool isPath = EqualsIgnoringCase(FirstWord(line), kIncludeDirectory);
   return isPath ? ReadPathEntry(tokens, entry, fault) : ReadLibraryEntry(tokens, entry, fault);
 }

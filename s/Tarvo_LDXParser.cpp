@@ -1,3 +1,6 @@
+// The reader of analyse orders. A reader takes one file and makes a further one for each core that
+// is included whole; all of them share an Analysis.
+
 #include "Tarvo_LDXParser.h"
 
 #include <algorithm>
@@ -41,6 +44,7 @@ constexpr Report::Module kModule{"s/Tarvo_LDXParser", "1.0"};
 const char* const kSynthesis = "synthesis";
 const char* const kSimulation = "simulation";
 
+// Far above what libraries need, and far below what the stack of a thread has room for.
 constexpr unsigned kDeepestLevel = 1000;
 
 // A file that is being read, and the entry that it has come to.
@@ -78,6 +82,7 @@ const Kel_Key& CheckRoot(const Kel_Key& key, const Kel_Key& root) {
 FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   FileName file =
       Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION);
+  // A file that can't be looked at is opened all the same: then the error says why.
   if (MayExist(file)) return file;
   Diagnosis::Add([&] {
     return Diagnosis::Of(Codes::kMissingOrder, file.GetName(), "the file does not exist");
@@ -85,6 +90,7 @@ FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", file.GetName()));
 }
 
+// A file may be read for a core that is in no index.
 // The key as the index stores it, or as it is if the index does not know it.
 Kel_Key Resolve(const Kel_Index& index, const Kel_Key& key) {
   try {
@@ -104,6 +110,7 @@ class OrderReader {
         open(analysis.open),
         key(version),
         core(Resolve(theIndex, version)),
+        // Without a root this reader is the outermost one, and its version the root of all below.
         root(theRoot.IsValid() ? theRoot : version),
         isRoot(theRoot.IsValid() && version == theRoot),
         hdl(std::move(language)),
@@ -164,6 +171,7 @@ class OrderReader {
   SourceMaker maker;
 };
 
+// The list of open files is the same for all readers of an analysis, so a failed one leaves it too.
 // For a checker, what a file read before has was told, and taken over by what leads to it.
 AnalyseOrder OrderReader::Read() {
   CheckNesting();
@@ -295,6 +303,8 @@ bool OrderReader::AddFile(const LDXEntry& entry) {
   return true;
 }
 
+// A language that can't count costs the source that it stands behind. Where nobody knows what a
+// source is, compiling the others would only hide that.
 // Says what is wrong with a file entry. True if that costs the entry alone.
 bool OrderReader::ReportUnsettled(const LDXEntry& entry, const SourceLanguage& settled) const {
   const StringBase file(entry.name);
@@ -337,6 +347,7 @@ void OrderReader::AddSource(const LDXEntry& entry, const SourcePointer& source) 
   const AnalyseOrder::Earlier earlier = order.Add(source, entry.forSynthesis, entry.forSimulation);
   if (!earlier.synthesis && !earlier.simulation) return;
   TellSecond(entry, earlier);
+  // Two warnings where it stands in both: who works for one purpose looks for that one.
   if (earlier.synthesis) WarnOfSecond(*source, kSynthesis);
   if (earlier.simulation) WarnOfSecond(*source, kSimulation);
 }
@@ -377,6 +388,7 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
   const StringBase library(entry.library);
   const StringBase directory(entry.name);
   const Kel_Key libKey(library);
+  // Below the version whose file this is, whatever library the entry names.
   FileName location = index.GetIPLocation(key);
   location.PushPathEnd(directory);
   if (!Exists(location)) {  // as the system resolves it, links and all
@@ -406,6 +418,8 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
 
 bool OrderReader::AddLibrary(const LDXEntry& entry) {
   const StringBase library(entry.library);
+  // Guarded like an exported operation, so that a fault far below is followed by one message at
+  // each level up to the file that was asked for.
   return Guard(NoOutput(), Failure(kModule, "Unable to analyse library %s\n%s\n", library), [&] {
     const Kel_Key libKey(library);
     open.back().entry = MarkOf(entry.library);

@@ -54,6 +54,7 @@ StringBase LDXParser::GetFileLanguage(const FileName& file) const {
 Kel_Key LDXParser::GetFileLibrary(const FileName& file) const {
   const StringBase fileKey = FileKey::OfLocation(file);
   const AnalyseOrder::Source* source = order.GetSynthesis().Find(fileKey);
+  // A source for one purpose stands in one list alone.
   if (!source) source = order.GetSimulation().Find(fileKey);
   return source ? *source->origin->library : Kel_Key();
 }

@@ -1,3 +1,6 @@
+// Which language a source is in. A table of two rows and a few rules, apart from files and
+// messages.
+
 #include "Tarvo_LDXParser_Hdl.h"
 
 #include "Tarvo_Kel_Index.h"
@@ -30,6 +33,7 @@ const Language* LanguageOf(const StringBase& text) {
   return nullptr;
 }
 
+// Exactly, unlike texts of languages: on disk a.VHD is another file than a.vhd.
 const Language* LanguageOf(const Port::FileName& file) {
   for (const Language* language : {&kVerilog, &kVhdl}) {
     if (file.HasExtension(language->extension)) return language;
@@ -61,8 +65,11 @@ SourceLanguage SettleLanguage(const StringBase& coreLanguage, const StringBase& 
   }
   const Language* const declared = LanguageOf(result.language);
   const Language* const shown = LanguageOf(file);
+  // Declared is what the entry or the core says, shown what the extension does. They must agree, or
+  // one of them be silent, but not both.
   if (declared && shown && declared != shown) return refuse(SourceLanguage::AgainstExtension);
   if (!declared && !shown) return refuse(SourceLanguage::NeitherLanguageNorExtension);
+  // An extension that belongs to no language stays, so that the listed name is that of the file.
   const Language& settled = shown ? *shown : *declared;
   if (!declared) result.language = *settled.name;
   result.subdirectory = *settled.subdirectory;

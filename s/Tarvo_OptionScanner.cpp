@@ -1,3 +1,6 @@
+// What a walk reads of each description. Only lines that begin with the keyword are cut into
+// tokens.
+
 #include "Tarvo_OptionScanner.h"
 
 #include <string_view>
@@ -57,6 +60,7 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
   TARVO_TRACE("  Parsing QVR File %s\n", name);
   Port_Input input(name);
   FileScanner lines = ScanFile(file, Codes::kMissingDescription);
+  // In front of what the file states, so that the first match gives those of the version.
   options = {{QVR_OPTION_NAME, key.GetName()}, {QVR_OPTION_VERSION, key.GetVersion()}};
   bool ok = true;
   std::string_view line;
@@ -68,6 +72,7 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
     kModule.Error("QVR unparsable OPTION: %s line %d, %s\n", name, lineNumber, StringBase(line));
     ok = false;
   }
+  // Behind them for the same reason: what is stated counts.
   ForEachMissing(options, KnownProperties::OfCores(),
                  [&](const StringBase& option, const StringBase& value) {
                    options.emplace_back(option, value);

@@ -1,3 +1,6 @@
+// The reader tells what is wrong in a file. Here the result is judged: sources that are not there
+// or stand twice under two names, and cores that one order takes in two versions.
+
 #include "Tarvo_OrderChecker.h"
 
 #include <algorithm>
@@ -53,7 +56,9 @@ void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringB
   } catch (const AppException&) {  // told as the reader met it
     return;
   }
+  // An order that is empty only because its entries are bad is told for those.
   const bool isGood = DiagnosticCollector::GetCurrent()->found.size() == before;
+  // Mostly the same list twice. What is found twice is told once, at the end of the check.
   CheckSources(order.GetSynthesis());
   CheckSources(order.GetSimulation());
   CheckIncludeDirectories(order, key);
@@ -68,6 +73,7 @@ void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringB
   }
 }
 
+// Cores share sources, and a look at the disk may be slow: one for each name.
 bool OrderChecker::IsThere(const FileName& file) {
   const auto [known, isNew] = files.try_emplace(file.GetName(), false);
   if (isNew) {
@@ -143,6 +149,7 @@ void OrderChecker::AddEdges(const AnalyseOrder& order, const Kel_Key& key) {
       AddSingleSources(library, cores, own);
     }
   }
+  // What is known from another top stays: it comes from the same file.
   edges.merge(own);
 }
 
@@ -171,6 +178,7 @@ OrderChecker::Steps OrderChecker::FindSteps(const StringBase& top,
   met = {top};
   std::vector<StringBase> wholes = {top};
   std::unordered_set<StringBase> queued = {top};
+  // Near cores first, so that the way which is told is a short one.
   for (std::size_t i = 0; i < wholes.size(); ++i) {
     const StringBase from = wholes[i];
     const auto own = edges.find(from);

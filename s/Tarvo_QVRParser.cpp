@@ -1,3 +1,7 @@
+// Records are lists of properties, as stated. Defaults are never stored: they are looked up behind
+// what is stated, so that a list of a record's properties and a question for one of them can't
+// differ.
+
 #include "Tarvo_QVRParser.h"
 
 #include <algorithm>
@@ -107,6 +111,7 @@ QVRRecord MakeNamedByKey(const QVRStatement::List& list, const StringBase& key) 
   return record;
 }
 
+// Each TYPE counts, not the first alone: NON_HDL anywhere keeps a parameter from the generics.
 bool IsGeneric(const QVRRecord& parameter) {
   return std::none_of(parameter.properties.begin(), parameter.properties.end(),
                       [](const Property& property) {
@@ -161,6 +166,8 @@ StringList ListProperties(const Records& records, const Kind& kind, const String
 
 void SetProperty(Records& records, const Kind& kind, const StringBase& name,
                  const StringBase& property, const StringBase& value) {
+  // Of several entries of one name the first is the one that counts, so that is the one to change.
+  // A new one goes behind all others.
   PropertyList& properties = Find(records, kind, name).properties;
   const auto stated =
       std::find_if(properties.begin(), properties.end(),
@@ -175,6 +182,7 @@ void SetProperty(Records& records, const Kind& kind, const StringBase& name,
 // Whether the property ties its record to that interface.
 bool Ties(const Property& property, const StringBase& key, const StringBase& interface) {
   if (property.first != key) return false;
+  // A record may belong to several interfaces, with colons between their names.
   const StringList names = KelLibrary_Utils::GetInterfaceVector(property.second);
   return std::find(names.begin(), names.end(), interface) != names.end();
 }
@@ -182,6 +190,7 @@ bool Ties(const Property& property, const StringBase& key, const StringBase& int
 // The names of the records that belong to a declared interface.
 StringList ListMembers(const Records& interfaces, const Kind& kind, const StringBase& interface,
                        const Records& records) {
+  // Who asks for the members of an interface that is not declared should hear of it.
   Find(interfaces, kind, interface);
   StringList names;
   for (const QVRRecord& record : records) {
@@ -212,6 +221,7 @@ QVRParser::QVRParser(const Port::FileName& file) : fileName(file.GetName()) {
     Diagnosis::Add([&] { return TellFault(Codes::kBadStatement, lines, fault); });
     kModule.Error("QVR unparsable %s: %s line %d, %s\n", StringBase(FirstWord(line)), fileName,
                   lineNumber, StringBase(line));
+    // A description that was read in part would give wrong answers.
     throw Report::Told(Report::Exception(AppException::Failure, "Invalid QVR %s\n", fileName));
   }
   TARVO_TRACE("  Parse successful\n");
@@ -247,6 +257,7 @@ bool QVRParser::ReadOption(std::string_view line, unsigned number, LineFault& fa
       QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option, fault);
   if (result != QVRStatement::Read) return false;
   options.push_back(QVRStatement::MakeOption(option));
+  // Beside the options, which callers get as plain pairs.
   optionLines.push_back(number);
   return true;
 }
@@ -254,6 +265,7 @@ bool QVRParser::ReadOption(std::string_view line, unsigned number, LineFault& fa
 void QVRParser::AddParameter(const QVRStatement::List& list, unsigned number) {
   QVRRecord record = MakeNamedByFirst(list, {&QVR_PROPERTY_VALUE, &QVR_PROPERTY_DEFAULT});
   record.line = number;
+  // A copy: setting a generic leaves the parameter as it is, and the other way round.
   if (IsGeneric(record)) generics.push_back(record);
   parameters.push_back(std::move(record));
 }

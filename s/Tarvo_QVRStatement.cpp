@@ -1,3 +1,6 @@
+// The grammar of a core description, for three readers. A statement is read whole or not at all;
+// what becomes of a bad one is the caller's business.
+
 #include "Tarvo_QVRStatement.h"
 
 #include <algorithm>
@@ -18,6 +21,7 @@ namespace {
 constexpr std::string_view kKeywords[] = {"OPTION", "PARAMETER", "BUS_INTERFACE", "IO_INTERFACE",
                                           "PORT"};
 
+// The fault is the current token, or the place behind the last one.
 bool Refuse(TokenReader& tokens, const char* text, LineFault& fault) {
   const bool isEnd = !tokens.MoreTokens();
   if (isEnd) tokens.ReadValue();  // for the place alone
@@ -57,12 +61,14 @@ StringList ListKeywords() {
   return keywords;
 }
 
+// A line without a blank has no first word, so a keyword alone on its line is none.
 Keyword KeywordOf(std::string_view line) {
   const auto* const found = std::find(std::begin(kKeywords), std::end(kKeywords), FirstWord(line));
   if (found == std::end(kKeywords)) return None;
   return static_cast<Keyword>(found - std::begin(kKeywords) + 1);
 }
 
+// The walk asks this of every line of a library, so no tokens are made for it.
 bool BeginsWith(std::string_view line, const StringBase& keyword, const char* delimiters) {
   if (!line.starts_with(keyword.View())) return false;
   const std::string_view behind = line.substr(keyword.GetLength(), 1);
@@ -80,6 +86,8 @@ Result ReadOption(std::string_view line, const char* delimiters, OptionText& opt
   return Read;
 }
 
+// Blanks are tokens too, so value and tail together are the text as it stands in the line; only the
+// quotes of a quoted value are gone.
 Property MakeOption(const OptionText& option) {
   StringBase value(option.pair.value);
   value.Append(option.tail.data(), static_cast<unsigned>(option.tail.size()));
@@ -97,6 +105,7 @@ bool ReadList(std::string_view line, List& list, LineFault& fault) {
     list.pairs.push_back(pair);
     tokens.Step();
     if (!tokens.MoreTokens()) return true;
+    // A comma belongs to the rest, unless something stands behind it.
     list.rest = tokens.GetRest();
     if (tokens.GetToken() != ",") return true;
     tokens.Step();
@@ -114,6 +123,7 @@ bool FindName(const List& list, const StringBase& key, std::size_t& position, Li
       fault = {list.pairs[i].key, "the interface has two names"};
       return false;
     }
+    // A name that is empty counts only if no other follows.
     isFound = true;
     isNamed = !list.pairs[i].value.empty();
     position = i;

@@ -1,3 +1,6 @@
+// Ranges as descriptions write them. The reader is lenient on purpose: what it gives is for a
+// checker, which must not find fault with what some tool understands.
+
 #include "Tarvo_RangeText.h"
 
 #include <algorithm>
@@ -10,6 +13,7 @@ namespace {
 using Text = std::string_view;
 
 constexpr std::string_view kBlanks = " \t";
+// So that no file can use up the stack.
 constexpr int kDeepestBracket = 50;
 
 bool IsDigit(char c) { return c >= '0' && c <= '9'; }
@@ -126,6 +130,8 @@ std::optional<RangeText> ReadVector(std::string_view text) {
   const bool isRead = expression.Pass('[') && ReadItem(expression, true, range) &&
                       expression.Pass(']') && expression.IsAtEnd();
   if (isRead) return range;
+  // What the grammar doesn't cover, as a call of a function, may be good for a tool that knows
+  // more. Only what is surely wrong is told.
   const std::size_t colon = text.find(':');
   const bool isFramed = text.size() > 4 && text.front() == '[' && text.back() == ']' && colon > 1 &&
                         colon + 2 < text.size() && text.find(':', colon + 1) == Text::npos;
@@ -148,6 +154,7 @@ std::optional<long long> ReadNumber(std::string_view text) {
   const bool isHex = text.substr(0, 2) == "0x" || text.substr(0, 2) == "0X";
   if (isHex) text.remove_prefix(2);
   long long number = 0;
+  // The whole text or nothing.
   const auto [end, error] =
       std::from_chars(text.data(), text.data() + text.size(), number, isHex ? 16 : 10);
   const bool isRead = error == std::errc() && end == text.data() + text.size() && !text.empty();
@@ -158,6 +165,7 @@ std::vector<std::string_view> ReadValues(std::string_view text) {
   std::vector<std::string_view> words;
   if (text.size() < 2 || text.front() != '(' || text.back() != ')') return words;
   text = text.substr(1, text.size() - 2);
+  // Both separators are in use. What stands behind "=" or ":" is the value's name for people.
   const char separator = text.find(';') == std::string_view::npos ? ',' : ';';
   while (!text.empty()) {
     const std::string_view part = text.substr(0, text.find(separator));

@@ -1,3 +1,6 @@
+// The sources of one core lie in one or two directories, so what they share is worked out at the
+// first of them and kept.
+
 #include "Tarvo_SourceMaker.h"
 
 #include <utility>
@@ -10,12 +13,14 @@ namespace Tarvo {
 using Port::FileName;
 
 void SourceMaker::EnterLibrary(std::string_view entered) {
+  // Texts are compared, so that no key is made for an entry like the one before.
   if (library && libraryText.View() == entered) return;
   const StringBase asked(entered);
   auto key = std::make_shared<const Kel_Key>(index.GetIPKey(Kel_Key(asked)));
   location = index.GetIPLocation(*key);
   libraryText = asked;
   library = std::move(key);
+  // What was worked out for the library before counts no more.
   subdirectory.Empty();
   origin.reset();
 }
@@ -54,6 +59,7 @@ AnalyseOrder::Source SourceMaker::Make(const StringBase& text, const FileName& n
     source.fileKey.Append(source.location.GetTail());
   }
   source.entryKey = FileKey::OfEntry(*library, text, settled.missingExtension);
+  // They differ for odd names alone; see AnalyseOrder.
   if (source.entryKey == source.fileKey) source.entryKey.Empty();
   return source;
 }

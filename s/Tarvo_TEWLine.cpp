@@ -1,3 +1,6 @@
+// The grammar of a netlist table. Values and netlists are words or quoted texts; how many values a
+// row has, its header says.
+
 #include "Tarvo_TEWLine.h"
 
 #include "Tarvo_TokenReader.h"
@@ -10,10 +13,12 @@ namespace {
 const char* const kDelimiters = " ,\"'";
 constexpr std::string_view kEndOfHeader = "FILES";
 
+// Without groups, since a value may begin with a bracket that nothing closes.
 TokenReader Cut(std::string_view line) {
   return TokenReader(line, kDelimiters, TokenReader::WithoutGroups);
 }
 
+// A comma that nothing follows is left to the rest, for who tells of it.
 // Goes behind a comma that something follows. False at the end of a row's netlists.
 bool NextNetlist(TokenReader& tokens, Row& row) {
   if (!tokens.MoreTokens()) return false;
@@ -34,6 +39,7 @@ bool ReadHeader(std::string_view line, Header& header, LineFault& fault) {
   if (!ReadNeeded(tokens, field, "missing name", fault)) return false;
   while (!EqualsIgnoringCase(field, kEndOfHeader)) {
     header.names.push_back(field);
+    // A line of names alone is no header, but its names count; see docs/decisions.
     if (!ReadNeeded(tokens, field, "missing FILES after the names", fault)) return true;
   }
   header.isEnded = true;
@@ -45,6 +51,7 @@ Result ReadRow(std::string_view line, std::size_t columns, Row& row, LineFault& 
   row = Row();
   std::string_view field;
   if (!ReadNeeded(tokens, field, "missing value", fault)) return StatesNothing;
+  // A netlist follows the last value, so each step has read one field ahead.
   while (row.values.size() < columns) {
     row.values.push_back(field);
     const bool isLast = row.values.size() == columns;
@@ -60,6 +67,7 @@ Result ReadRow(std::string_view line, std::size_t columns, Row& row, LineFault& 
 }
 
 Netlist SplitNetlist(std::string_view text) {
+  // The first colon: a file may have more in its name, a library has none.
   const std::size_t colon = text.find(':');
   if (colon == std::string_view::npos) return {false, {}, text};
   return {true, text.substr(0, colon), text.substr(colon + 1)};

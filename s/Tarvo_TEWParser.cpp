@@ -1,3 +1,6 @@
+// The table is read once and never changes. Which rows apply is found out anew for each question,
+// from the parameters as they are then.
+
 #include "Tarvo_TEWParser.h"
 
 #include <algorithm>
@@ -50,6 +53,7 @@ void TEWParser::Parse(const FileName& file, const Kel_Key& key) {
   TARVO_TRACE("  Parsing TEW File for %s\n", key.GetKey());
   Port_Input input(tewFile);
   FileScanner lines = ScanFile(file, Codes::kMissingTable);
+  // Once, since the header may take several tries.
   const StringList names = ListParameters();
   const NameSet parameters(names.begin(), names.end());
   std::string_view line;
@@ -108,6 +112,7 @@ bool TEWParser::ParseRow(const FileScanner& lines, std::string_view line, const 
   const unsigned number = Port_Input::GetCurrent()->GetLine();
   Row row{{}, {}, StringBase(text.rest), number};
   for (const std::string_view value : text.values) row.values.emplace_back(value);
+  // Before the row is judged: a library that is unknown is told first, as what stands further left.
   for (const std::string_view netlist : text.netlists) {
     row.netlists.push_back(MakeNetlist(lines, netlist, key));
   }
@@ -141,6 +146,7 @@ StringList TEWParser::ListParameters() const {
   return qvrParser ? qvrParser->ListParameters() : StringList();
 }
 
+// Asked anew for each question, since a parameter may be set in between.
 StringList TEWParser::GetParameterValues() const {
   StringList values;
   if (!qvrParser) return values;
@@ -154,6 +160,7 @@ std::vector<const TEWParser::Netlist*> TEWParser::Select() const {
   const StringList values = GetParameterValues();
   std::vector<const Netlist*> selected;
   for (const Row& row : rows) {
+    // Texts are compared, byte by byte: 016 is not 16.
     if (row.values != values) continue;
     for (const Netlist& netlist : row.netlists) selected.push_back(&netlist);
   }
@@ -187,6 +194,7 @@ StringList TEWParser::ListLibraries() const {
   for (const Netlist* const netlist : Select()) {
     libraries.push_back(index.GetIPLocation(netlist->library).GetAbsolutePath());
   }
+  // Rows say nothing of an order among libraries.
   std::sort(libraries.begin(), libraries.end());
   libraries.erase(std::unique(libraries.begin(), libraries.end()), libraries.end());
   return libraries;

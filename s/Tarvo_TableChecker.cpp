@@ -1,3 +1,6 @@
+// A table is read twice: first to find the line that is its header, then to judge each line. So
+// rows are checked also below a header with a misspelt name.
+
 #include "Tarvo_TableChecker.h"
 
 #include <algorithm>
@@ -27,6 +30,8 @@ using Text = std::string_view;
 // A value against what its parameter takes: false only where that is sure.
 bool MayTake(const DescribedParameter& parameter, Text value) {
   const std::vector<Text> words = ReadValues(parameter.values.View());
+  // A list of words is exact. A range is judged only where everything is a number: a bound may be
+  // an expression.
   if (!words.empty()) return std::find(words.begin(), words.end(), value) != words.end();
   const auto range = ReadRange(parameter.range.View());
   const auto number = ReadNumber(value);
@@ -171,6 +176,7 @@ void TableChecker::CheckRow(Text line) {
   if (TEWLine::ReadRow(line, columns.size(), row, fault) != TEWLine::Read) {
     Diagnosis::Add([&] { return TellFault(Codes::kBadRow, lines, fault); });
   }
+  // What stands in front of a fault is looked at all the same.
   if (CheckCommas(row)) return;
   CheckValues(row);
   StringList values;
@@ -194,6 +200,7 @@ bool TableChecker::CheckCommas(const TEWLine::Row& row) const {
 void TableChecker::CheckValues(const TEWLine::Row& row) const {
   for (std::size_t i = 0; i < row.values.size(); ++i) {
     const Text value = row.values[i];
+    // A parameter may head two columns. A row with two values for it can't apply.
     const auto first = std::find(columns.begin(), columns.end(), columns[i]);
     const Text before = row.values[static_cast<std::size_t>(first - columns.begin())];
     const DescribedParameter* const parameter = FindParameter(columns[i]);
@@ -225,6 +232,7 @@ void TableChecker::CheckNetlist(const StringList& values, Text text) {
   }
   netlist.location.PushPathEnd(Kel_Index::KEL_NETLIST_SUBDIRECTORY);
   netlist.location.SetTail(StringBase(split.name));
+  // The same netlist for the same values adds nothing.
   const auto [first, isNew] = rows.try_emplace({values, netlist.location.GetName()}, netlist.place);
   if (!isNew) {
     Diagnosis::Add([&, place = first->second] {
@@ -245,6 +253,7 @@ void TableChecker::CheckEnd(Text line, const TEWLine::Row& row) const {
   const Text word = row.rest.substr(0, row.rest.find_first_of(" ,"));
   Text last = row.netlists.back();
   const auto start = static_cast<std::size_t>(last.data() - line.data());
+  // Some write a semicolon where a comma is wanted. Whether a comma mends the row is tried.
   last = last.substr(0, last.find_last_not_of(';') + 1);
   const StringBase mended = Say({line.substr(0, start), last, ", ", row.rest});
   TEWLine::Row read;

@@ -1,3 +1,5 @@
+// Diagnostics of names that are not there, with those that may be meant.
+
 #include "Tarvo_TellUnknown.h"
 
 #include <algorithm>
@@ -47,6 +49,7 @@ StringBase FindMisspelt(std::string_view text, const StringList& words) {
   const StringBase asked(text);
   if (std::find(words.begin(), words.end(), asked) != words.end()) return {};
   const StringList near = KelLibrary_Utils::ListNear(asked, words);
+  // Stricter than for a hint: a property that somebody made up must not pass for a misspelt one.
   const auto fits = [&](const StringBase& word) {
     const bool isAsLong =
         word.GetLength() + 1 >= text.size() && text.size() + 1 >= word.GetLength();

@@ -1,3 +1,6 @@
+// A cursor over the tokens of a line. All that it gives are parts of the line, so that whoever
+// finds a fault knows its column.
+
 #include "Tarvo_TokenReader.h"
 
 namespace Tarvo {
@@ -7,6 +10,7 @@ std::string_view FirstWord(std::string_view line) {
   return blank == std::string_view::npos ? std::string_view() : line.substr(0, blank);
 }
 
+// Each delimiter is a token, blanks among them, so that all tokens together are the line.
 TokenReader::TokenReader(std::string_view wholeLine, const char* delimiters, Groups withGroups)
     : line(wholeLine),
       groups(withGroups),
@@ -28,6 +32,7 @@ void TokenReader::Step() {
 }
 
 TokenReader::Value TokenReader::ReadValue() {
+  // For who tells a fault: where the value begins, or the end of the line if there is none.
   tried = line.size();
   if (!MoreTokens()) return {{}, false};
   const std::string_view first = GetToken();
@@ -38,6 +43,7 @@ TokenReader::Value TokenReader::ReadValue() {
   return {first, true};
 }
 
+// Of a value that is not whole nothing is passed over.
 bool TokenReader::ReadField(std::string_view& text) {
   const Value value = ReadValue();
   if (!value.whole) return false;
@@ -50,6 +56,7 @@ bool TokenReader::ReadField(std::string_view& text) {
 TokenReader::Value TokenReader::ReadQuoted() {
   const std::string_view quote = GetToken();
   const std::size_t start = PositionOf(quote) + 1;
+  // A quote of the other kind, a bracket and a comma are letters in here.
   for (Step(); !token.at_end(); ++token) {
     if (GetToken() == quote) return {line.substr(start, PositionOf(GetToken()) - start), true};
   }
@@ -60,6 +67,7 @@ TokenReader::Value TokenReader::ReadQuoted() {
 TokenReader::Value TokenReader::ReadGroup(std::string_view closing) {
   const std::string_view opening = GetToken();
   const std::size_t start = PositionOf(opening);
+  // Brackets of the other kind, and quotes, are letters in here.
   std::size_t depth = 1;
   for (Step(); !token.at_end(); ++token) {
     if (GetToken() == opening) ++depth;

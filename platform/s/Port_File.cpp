@@ -1,3 +1,6 @@
+// A file is read whole when it is opened, and only if it is a plain one: no pipe or device can hold
+// up a reader, and no other program's changes can reach it afterwards.
+
 #include "Port_File.h"
 
 #include <fcntl.h>

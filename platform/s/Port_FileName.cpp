@@ -1,3 +1,6 @@
+// Names are texts in three parts: directory, base, extension. The disk is not asked, but for the
+// current directory.
+
 #include "Port_FileName.h"
 
 #include <algorithm>
@@ -53,6 +56,7 @@ FileName::~FileName() = default;
 
 void FileName::Split(std::string_view tail) {
   const std::size_t dot = tail.find_last_of('.');
+  // A name that begins with its only dot has no extension, nor has one that ends in it.
   const bool extended = dot != std::string_view::npos && dot > 0 && dot + 1 < tail.size();
   base = String(tail.substr(0, extended ? dot : tail.size()));
   extension = String(extended ? tail.substr(dot + 1) : std::string_view());
@@ -62,6 +66,7 @@ String FileName::GetName() const { return Join(head.View(), GetTail().View()); }
 
 String FileName::GetAbsolutePath(bool /*reserved*/) const {
   String name = GetName();
+  // Steps and links stay as they are: callers compare these texts.
   if (IsAbsolute(name.View())) return name;
   return Join(std::filesystem::current_path().native(), name.View());
 }
@@ -100,6 +105,7 @@ void FileName::PushPathEnd(const char* levels) {
 
 String FileName::PopPathEnd() {
   const auto [rest, level] = SplitLast(WithoutTrailing(head.View()));
+  // The root has no level to take off.
   if (level.empty()) return {};
   String popped(level);
   head = String(Directory(rest));

@@ -2,6 +2,7 @@
 
 namespace {
 
+// The inputs of a thread form a stack, and live on the thread's own.
 thread_local const Port_Input* innermost = nullptr;
 
 }  // namespace

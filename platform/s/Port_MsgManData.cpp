@@ -1,3 +1,6 @@
+// Messages must come through when memory has run out, while the program ends, and when a handler
+// throws. So nothing on their way needs the heap unless a text is long.
+
 #include "Port_MsgManData.h"
 
 #include <algorithm>
@@ -47,6 +50,7 @@ class Text {
  public:
   Text(const char* format, std::va_list arguments) noexcept PORT_PRINTF(2, 0) {
     std::va_list again;
+    // A list of arguments can be read once.
     va_copy(again, arguments);
     const int length = std::vsnprintf(brief.data(), brief.size(), format, arguments);
     if (length < 0 || static_cast<std::size_t>(length) >= brief.size()) {
@@ -84,6 +88,7 @@ class Text {
 
 Port_MsgManData& Port_MsgManData::createObject(const char* domain, const char* file, int line,
                                                const char* revision) noexcept {
+  // One for each thread, since making a message and issuing it are two calls.
   thread_local Port_MsgManData object;
   const Port_Input* const input = Port_Input::GetCurrent();
   object.message = {

@@ -16,6 +16,7 @@ struct Free {
   void operator()(pcre2_match_data* data) const noexcept { pcre2_match_data_free(data); }
 };
 
+// With DOLLAR_ENDONLY "$" is the very end, and not the place before a last line end too.
 std::unique_ptr<pcre2_code, Free> CompileCode(const std::string& pattern) {
   int error = 0;
   PCRE2_SIZE position = 0;
@@ -63,6 +64,7 @@ Port_Range Port_Regexp::GetRangeOfMatch(const char* text, unsigned start) const 
                                  start, 0, data.get(), nullptr);
   if (result == PCRE2_ERROR_NOMATCH) return {};
   if (result == PCRE2_ERROR_NOMEMORY) throw std::bad_alloc();
+  // One of the engine's limits: a text that would take too long is an error and no wait.
   if (result < 0) throw std::runtime_error("Unable to match " + program->pattern);
 
   const PCRE2_SIZE* const match = pcre2_get_ovector_pointer(data.get());

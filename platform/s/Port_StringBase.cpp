@@ -1,3 +1,6 @@
+// A Standard Library string with lengths of 32 bits, as the interfaces have them. Each way to make
+// a longer one is closed by an exception.
+
 #include "Port_StringBase.h"
 
 #include <algorithm>
@@ -109,6 +112,7 @@ unsigned String::ReplaceChars(char from, char to) noexcept {
 }
 
 void String::Trim(const char* set, TrimType type) noexcept {
+  // Where no other character is found, the place is npos, and npos + 1 the beginning.
   if (type != TrimStart) text.erase(text.find_last_not_of(set) + 1);
   if (type != TrimEnd) text.erase(0, text.find_first_not_of(set));
 }

@@ -2,6 +2,7 @@
 
 namespace Tarvo {
 
+// Defined here, so that one library holds what catchers in all others compare types by.
 AppException::AppException(Level exceptionLevel, const Port::StringBase<char>& text)
     : std::runtime_error(text), level(exceptionLevel) {}
 

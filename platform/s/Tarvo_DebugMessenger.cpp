@@ -1,3 +1,5 @@
+// Loggers are made once for each name and kept for ever; a channel each does the work.
+
 #include "Tarvo_DebugMessenger.h"
 
 #include <mutex>
