@@ -8,7 +8,7 @@ usage: mutate.py draw COUNT FILE [--seed N] [--jobs N]   draws changes, tries th
 
 A change is one operator, condition, constant, statement or text of a source of the library, the platform
 layer or the command. One that does not compile is not counted. Each worker has a copy of the committed
-tree in build/mutate, so the work tree is left alone. A change is told by its line and the line above it,
+tree in build/mutate, so the work tree is left alone. A FILE that is there already is gone on with. A change is told by its line and the line above it,
 and so is found again after others have moved it; `again` says which are gone.
 """
 
@@ -94,16 +94,16 @@ def place(change, root):
 class Worker:
     """A copy of the tree with a build of its own, in which one change after the other is tried."""
 
-    def __init__(self, number):
+    def __init__(self, number, commit):
         self.root = COPIES / str(number)
         self.build = self.root / "build/tests"
-        if self.root.exists():
-            self.call("git", "fetch", "-q", "origin", "HEAD", check=True)
-            self.call("git", "reset", "-q", "--hard", "FETCH_HEAD", check=True)
-        else:
+        if not self.root.exists():
             subprocess.run(["git", "clone", "-q", ROOT, self.root], check=True)
+        self.call("git", "fetch", "-q", "origin", check=True)
+        self.call("git", "checkout", "-q", "--force", commit, check=True)
         self.call("cmake", "-S", ".", "-B", self.build, "-GNinja", "-DCMAKE_BUILD_TYPE=",
-                  "-DCMAKE_CXX_FLAGS=-O0", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON", "-DKEL_BUILD_TESTS=ON", check=True)
+                  "-DCMAKE_CXX_FLAGS=-O0", "-DCMAKE_LINK_DEPENDS_NO_SHARED=ON",
+                  "-DKEL_BUILD_TESTS=ON", "-DKEL_PRECOMPILE=ON", check=True)
         if not self.make():
             sys.exit(f"{self.root} does not build")
         if self.finders():
@@ -181,9 +181,13 @@ def closing(line, start):
 
 def try_all(changes, count, file, jobs):
     """Tries changes until `count` of them compiled, and writes each result as soon as it is there."""
-    waiting, results, lock = queue.SimpleQueue(), [], threading.Lock()
+    waiting, lock = queue.SimpleQueue(), threading.Lock()
+    file = pathlib.Path(file)
+    results = json.loads(file.read_text()) if file.exists() else []  # of a run that was ended
+    tried = {key(result) for result in results}
     for change in changes:
-        waiting.put(change)
+        if key(change) not in tried:
+            waiting.put(change)
 
     def work(worker):
         while len(results) < count and not waiting.empty():
@@ -192,11 +196,12 @@ def try_all(changes, count, file, jobs):
             with lock:
                 if found is not None and len(results) < count:
                     results.append({**change, "found_by": found})
-                    pathlib.Path(file).write_text(json.dumps(results, indent=1, ensure_ascii=False))
+                    file.write_text(json.dumps(results, indent=1, ensure_ascii=False))
                     print(f"{len(results)}/{count} {change['path']}: {change['kind']}: "
                           f"{' '.join(found[:3]) or 'NOT FOUND'}", flush=True)
 
-    workers = [Worker(number) for number in range(jobs)]
+    commit = subprocess.run(["git", "rev-parse", "HEAD"], cwd=ROOT, check=True, capture_output=True, text=True).stdout
+    workers = [Worker(number, commit.strip()) for number in range(jobs)]
     threads = [threading.Thread(target=work, args=(worker,)) for worker in workers]
     for thread in threads:
         thread.start()
