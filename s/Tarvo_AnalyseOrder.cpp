@@ -83,6 +83,7 @@ AnalyseOrder::Earlier AnalyseOrder::Add(const SourcePointer& source, bool forSyn
 }
 
 AnalyseOrder::Known AnalyseOrder::Append(AnalyseOrder&& other) {
+  // One list for both purposes goes on only while neither side has told them apart.
   if (simulation || other.simulation) {
     PartLists();
     other.PartLists();

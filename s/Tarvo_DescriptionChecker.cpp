@@ -232,6 +232,7 @@ void DescriptionChecker::CheckList(QVRStatement::Keyword keyword, Text line) {
     bad.insert(keyword);
     return TellBad(fault);
   }
+  // An interface is named by the value of its key, all else by the key of the first pair.
   Declare(keyword, isInterface ? list.pairs[position].value : list.pairs.front().key);
   CheckPairs(keyword, list, isInterface ? 0 : 1);
   CheckEnd(list);
@@ -295,6 +296,8 @@ void DescriptionChecker::CheckKey(QVRStatement::Keyword keyword, const std::vect
                              Diagnosis::Here(SpanOf(lines, pairs[i].key)), "first given here");
     });
   }
+  // Cores may state properties of their own, so an unknown one is told only if it is nearly a known
+  // one.
   if (Contains(keys.known, key)) return;
   const StringBase meant = FindMisspelt(key, keys.known);
   if (meant.GetLength() == 0) return;
@@ -336,6 +339,7 @@ void DescriptionChecker::CheckVector(const Pair& pair) {
                 "write [LEFT:RIGHT]");
   }
   for (const Text used : range->names) {
+    // A bound may name parameters, and those may be declared further down.
     mentions.push_back({QVRStatement::Parameter, &Codes::kBadRange, StringBase(used),
                         Diagnosis::Here(SpanOf(lines, used)),
                         Say({"the core has no parameter '", used, "'"})});
@@ -351,6 +355,7 @@ void DescriptionChecker::CheckInterfaces(QVRStatement::Keyword keyword, const Pa
     const Text piece = rest.substr(0, rest.find(':'));
     rest.remove_prefix(std::min(piece.size() + 1, rest.size()));
     if (piece.empty()) continue;
+    // Judged at the end: the interface may be declared further down.
     mentions.push_back({isBus ? QVRStatement::BusInterface : QVRStatement::IoInterface,
                         &Codes::kUndeclaredInterface, StringBase(piece),
                         Diagnosis::Here(SpanOf(lines, piece)),

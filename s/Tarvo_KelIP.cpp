@@ -368,6 +368,7 @@ bool KelIP::GetSourceProperty(const StringBase& source, const StringBase& proper
                        source, impl->key.GetKey()),
                [&] {
                  const LDXParser* const order = impl->GetLDXParser();
+                 // Without an order there is no source to ask for: false, but nothing to tell.
                  if (order) value = SourceProperty(*order, source, property);
                  return order != nullptr && value.GetLength() > 0;
                });
@@ -379,6 +380,8 @@ bool KelIP::ListSourceProperties(const StringBase& source, StringList& list) con
                        impl->key.GetKey()),
                [&] {
                  StringBase library;
+                 // First of all, so that an order that can't be read is told in the words of this
+                 // question.
                  if (!impl->GetLDXParser()) return false;
                  if (!GetSourceProperty(source, KEL_HDL_LIBRARY_PROPERTY, library)) return false;
                  return ListAllSourceProperties(list);
@@ -404,6 +407,7 @@ bool KelIP::GetNetlistProperty(const StringBase& netlist, const StringBase& prop
                        property, impl->key.GetKey()),
                [&] {
                  const TEWParser* const table = impl->GetTEWParser();
+                 // The only property that netlists have.
                  if (!table || property != KEL_NETLIST_LIBRARY_PROPERTY) return false;
                  value = table->GetFileLibrary(Port::FileName(netlist)).GetKey();
                  return true;

@@ -96,6 +96,7 @@ bool KelLibraryImpl::AddVersion(const fs::directory_entry& entry) {
   const Kel_Key key(StringBase(entry.path().filename().c_str()));
   if (!key.IsValid() || !MayBeVersion(entry)) return true;
   Port::FileName location;
+  // The whole path as a directory: a name with a dot is not to be split.
   location.SetHead(entry.path().c_str());
   try {
     return index.AddIP(key, location);

@@ -1,5 +1,3 @@
-// Small lists in one text, and texts that are near to each other.
-
 #include "Tarvo_KelLibrary_Utils.h"
 
 #include <algorithm>

@@ -56,6 +56,7 @@ Kel_Key::~Kel_Key() = default;
 // The new key is built apart, since the text may be a part of this one and memory may run out.
 bool Kel_Key::ExtractVersion(const StringBase& text) {
   const Port_Range suffix = FindSuffix(text);
+  // A text that is nothing but a version leaves a valid key as it is.
   const bool onlySuffix = !suffix.IsEmpty() && suffix.first == 0;
   if (onlySuffix && valid) return true;
   Kel_Key read;
@@ -73,6 +74,7 @@ bool Kel_Key::ReadSuffix(const StringBase& text, const Port_Range& suffix) {
     return false;
   }
   name = text.Extract({0, suffix.first - 1});
+  // A key is written with a small version whatever its text was, so that one version has one key.
   StringBase lowered = text.Extract({suffix.first + 1, suffix.last});
   lowered.MakeLower();
   key = name;

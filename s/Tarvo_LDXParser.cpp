@@ -257,6 +257,7 @@ void OrderReader::ReadLine(std::string_view line) {
   const char* const kind = entry.kind == LDXEntry::IncludeDirectory ? "path" : "library";
   kModule.Error("LDX unparsable %s entry: %s line %d, %s\n", kind, *fileName,
                 open.back().entry.line, StringBase(line));
+  // The first bad line ends the reading of all files that are open; a checker wants the others too.
   if (Diagnosis::GoesOn()) return;
   throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", *fileName));
 }
@@ -284,6 +285,7 @@ bool OrderReader::AddEntry(const LDXEntry& entry) {
 bool OrderReader::AddFile(const LDXEntry& entry) {
   const StringBase file(entry.name);
   try {
+    // The library first: whatever its language, a source needs a place.
     maker.EnterLibrary(entry.library);
   } catch (const AppException& exception) {
     TellUnknown(entry.library);
@@ -458,6 +460,7 @@ FileName OrderReader::FindOrder(const Kel_Key& library, std::string_view text) c
   try {
     return GetLdxFile(index, library);
   } catch (AppException& exception) {
+    // What was not told yet is that the index has no such core.
     if (!exception.told) TellUnknown(text);
     throw Report::Told(exception);
   }

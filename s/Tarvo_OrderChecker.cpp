@@ -160,6 +160,7 @@ void OrderChecker::AddSingleSources(const AnalyseOrder::Library& library,
   std::unordered_set<const StringBase*> seen;
   for (const auto& source : library.sources) {
     const StringBase& file = *source->origin->file;
+    // Sources of one file share its name, so the pointer tells them apart.
     if (!seen.insert(&file).second) continue;
     const auto core = cores.find(file);
     if (core == cores.end() || core->second == *library.key) continue;
@@ -225,6 +226,7 @@ void OrderChecker::TellVersions(const Steps& steps, const StringBase& top, const
         Codes::kVersionConflict, places.front().place,
         Say({older.View(), " and the newer ", newer.View(), " are both in one order"}),
         Say({"use ", newer.View(), " everywhere"}));
+    // The first step is where the diagnostic itself stands.
     places.erase(places.begin());
     if (older != top) way(newer, places);
     told.related = std::move(places);

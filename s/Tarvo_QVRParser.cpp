@@ -359,6 +359,7 @@ StringList QVRParser::ListIoInterfacePorts(const StringBase& interface) const {
   return ListMembers(ioInterfaces, kIoInterface, interface, ports);
 }
 
+// Kept by kind; here they are sorted back into the order of the file.
 std::vector<KelStatement> QVRParser::GetStatements() const {
   std::vector<KelStatement> statements;
   const auto add = [&](KelStatement::Kind kind, const StringBase& name, unsigned line) {

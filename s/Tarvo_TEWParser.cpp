@@ -92,6 +92,7 @@ bool TEWParser::ParseHeader(const FileScanner& lines, std::string_view line,
   const std::string_view* const unknown = FindUnknown(header, parameters);
   for (const std::string_view& name : header.names) {
     if (&name == unknown) break;
+    // Of a line that turns out to be no header, the names in front of the fault stay.
     headerNames.emplace_back(name);
   }
   if (header.isEnded && !unknown) return true;
@@ -128,6 +129,7 @@ bool TEWParser::ParseRow(const FileScanner& lines, std::string_view line, const 
 TEWParser::Netlist TEWParser::MakeNetlist(const FileScanner& lines, std::string_view text,
                                           const Kel_Key& key) const {
   const TEWLine::Netlist split = TEWLine::SplitNetlist(text);
+  // A netlist without a library is the core's own.
   const std::string_view library = split.hasLibrary ? split.library : key.GetKey().View();
   try {
     Netlist netlist{index.GetIPKey(Kel_Key(StringBase(library))), {}};
