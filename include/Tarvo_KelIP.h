@@ -122,8 +122,8 @@ class TARVO_EXPORT KelIP {
   // case. Any other core has none: false without a message. The analyse order is read by the first
   // question that needs it (see LDXParser); if that fails, the next question tries again.
   //
-  // Absolute paths of the sources in analyse order, and absolute directories of the libraries that
-  // they belong to, in the same order.
+  // Absolute paths of the sources in analyse order (compile order), and absolute directories of the
+  // libraries that they belong to, in the same order.
   bool ListSynthesisSources(StringList& list) const;
   bool ListSimulationSources(StringList& list) const;
   bool ListSynthesisLibraries(StringList& list) const;
@@ -162,7 +162,7 @@ class TARVO_EXPORT KelIP {
   //
   // All statements of the description, in the order of the file.
   bool GetStatements(std::vector<KelStatement>& statements) const;
-  // The sources in analyse order.
+  // The sources in analyse order (compile order).
   bool GetSynthesisSources(std::vector<KelSource>& sources) const;
   bool GetSimulationSources(std::vector<KelSource>& sources) const;
   bool GetVerilogIncludeDirectories(std::vector<KelIncludeDirectory>& directories) const;

@@ -20,7 +20,7 @@ struct KelStatement {
   KelPlace place;  // file and line
 };
 
-// A source of an analyse order.
+// A source of an analyse order (compile order).
 struct KelSource {
   StringBase path;      // absolute
   Kel_Key library;      // as the index has it
