@@ -1,16 +1,17 @@
+// Options, from the scanner to the library. How their statements are read is among the cases of
+// Readers_test.
+
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
-#include <sys/stat.h>
 
 #include <filesystem>
 #include <string>
 
+#include "IndexedRepository.h"
 #include "MessageRecorder.h"
 #include "OrdinaryUser.h"
-#include "RepositoryBuilder.h"
-#include "Tarvo_AppException.h"
+#include "Outcome.h"
 #include "Tarvo_KelLibrary.h"
-#include "Tarvo_Kel_Index.h"
 #include "Tarvo_OptionScanner.h"
 
 namespace {
@@ -20,65 +21,18 @@ namespace fs = std::filesystem;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-std::string Dump(const PropertyList& options) {
-  std::string text;
-  for (const auto& [name, value] : options) {
-    text += std::string(name) + "=" + value.GetText() + ";";
-  }
-  return text;
-}
-
-// The options that a description gives for abc_v1_00_a, or what is thrown.
-std::string Scan(const std::string& description) {
-  RepositoryBuilder directory;
-  directory.File("f", description);
-  try {
-    return Dump(
-        OptionScanner(Kel_Key(StringBase("abc_v1_00_a")), Port::FileName((directory / "f").c_str()))
-            .GetOptions());
-  } catch (const AppException& exception) {
-    return std::to_string(exception.level) + " " + std::string(exception.what()).substr(0, 20);
-  }
-}
-
-TEST(OptionScanner, AddsNamesAndDefaults) {
-  MessageRecorder recorder;
-  const std::string own = "NAME=abc;VERSION=1.00.a;";
-  EXPECT_EQ(Scan(""),
-            own + "IMP_NETLIST=FALSE;RUN_TRAMFOLD=FALSE;STYLE=HDL;USAGE_LEVEL=ADVANCED_USER;");
-  EXPECT_EQ(Scan("OPTION STYLE = MIX\nPORT bad\nOPTION\nOPTION NAME = x\nOPTION style = y\n"
-                 "OPTION STYLE = z"),
-            own +
-                "STYLE=MIX;NAME=x;style=y;STYLE=z;IMP_NETLIST=FALSE;RUN_TRAMFOLD=FALSE;"
-                "USAGE_LEVEL=ADVANCED_USER;");
-  EXPECT_THAT(recorder.Take(), IsEmpty());
-}
-
-TEST(OptionScanner, ReportsEachBadStatement) {
-  MessageRecorder recorder;
-  EXPECT_EQ(Scan("OPTION A = b\n OPTION\tB # =\n\nOPTION C = \"x # y\"\n"),
-            "1 Unable to parse QVR ");
-  const auto messages = recorder.Take();
-  ASSERT_EQ(messages.size(), 2U);
-  EXPECT_THAT(messages[0],
-              testing::MatchesRegex(
-                  "error s/Tarvo_OptionScanner: QVR unparsable OPTION: /.*/f line 2, OPTION B\n"));
-  EXPECT_THAT(messages[1], testing::EndsWith("/f line 4, OPTION C = \"x\n"));
-  try {
-    const OptionScanner scanner(Kel_Key(StringBase("abc")), Port::FileName("nowhere"));
-    FAIL();
-  } catch (const AppException& exception) {
-    EXPECT_STREQ(exception.what(), "Invalid IP key abc for file nowhere\n");
-    EXPECT_EQ(exception.level, AppException::Failure);
-  }
-}
-
 TEST(OptionScanner, TakesAnyBytes) {
-  MessageRecorder recorder;
-  EXPECT_THAT(Scan(std::string(1000, '\0') + "\nOPTION A = \xFF\xC3("),
-              testing::HasSubstr("A=\xFF\xC3(;"));
-  EXPECT_THAT(Scan("OPTION A = " + std::string(3000000, '(') + std::string(3000000, ')')),
-              testing::EndsWith("USAGE_LEVEL=ADVANCED_USER;"));
+  RepositoryBuilder directory;
+  const Port::FileName file((directory / "f").c_str());
+  const auto last = [&](const char* key) {
+    return Outcome([&] { return OptionScanner(Kel_Key(key), file).GetOptions().at(2).second; });
+  };
+  directory.File("f", std::string(1000, '\0') + "\nOPTION A = \xFF\xC3(");
+  EXPECT_EQ(last("abc_v1_00_a"), "\xFF\xC3(");
+  EXPECT_EQ(last("abc"), "failure: Invalid IP key abc for file " + directory / "f" + "\n");
+  const std::string deep = std::string(3000000, '(') + std::string(3000000, ')');
+  directory.File("f", "OPTION A = " + deep);
+  EXPECT_EQ(last("abc_v1_00_a"), deep);
 }
 
 TEST(OptionScanner, FindsTheFirstValueAndTracesAMiss) {
@@ -90,23 +44,17 @@ TEST(OptionScanner, FindsTheFirstValueAndTracesAMiss) {
   EXPECT_THAT(recorder.Take(), ElementsAre("trace: Cannot find option a on IP n version \n"));
 }
 
-class Options : public testing::Test {
+class Options : public testing::Test, protected IndexedRepository {
  protected:
-  std::string Ask(const char* key, const char* property) {
-    StringBase value = "untouched";
-    const bool found = library.GetIPProperty(key, property, value);
-    return (found ? "" : "no ") + std::string(value);
-  }
   std::string Keys() {
     StringList keys;
     EXPECT_TRUE(library.ListAllIPKeys(keys));
-    std::string text;
-    for (const StringBase& key : keys) text += std::string(key) + " ";
-    return text;
+    return Join(keys);
   }
   bool Walk() { return library.SetRepositoryPath(repo.Path().c_str()); }
+  // The messages of the library itself, behind what all of them begin with.
+  static std::string Unable(const std::string& text) { return "error s/Tarvo_KelLibrary: " + text; }
 
-  RepositoryBuilder repo;
   MessageRecorder recorder;
   KelLibrary library;
 };
@@ -117,81 +65,64 @@ TEST_F(Options, AreAnsweredByTheLibrary) {
   repo.Core("abc_v20_00_a");
   repo.Core("Abc_v2_00_a").Qvr("");
   EXPECT_TRUE(Walk());
-  EXPECT_EQ(Keys(), "Abc_v2_00_a abc_v10_00_a abc_v1_00_a ");
-  EXPECT_EQ(Ask("abc", "DESC"), "ten");
-  EXPECT_EQ(Ask("abc_v1_00_a", "DESC"), "one");
-  EXPECT_EQ(Ask("abc", "NONE"), "");
+  EXPECT_EQ(Keys(), "Abc_v2_00_a, abc_v10_00_a, abc_v1_00_a");
   EXPECT_EQ(library.GetVersion("abc"), "20.00.a");
+  const char* const rows[][3] = {{"abc", "DESC", "ten"},
+                                 {"abc_v1_00_a", "DESC", "one"},
+                                 {"abc", "NONE", ""},
+                                 {"abc_v20_00_a", "DESC", "refused"}};
+  for (const auto& [key, option, expected] : rows) {
+    EXPECT_THAT(recorder.Take(), IsEmpty());
+    StringBase value = "refused";
+    EXPECT_EQ(library.GetIPProperty(key, option, value), *expected != 'r');
+    EXPECT_EQ(value, expected);
+  }
   StringList list = {"old"};
-  EXPECT_TRUE(library.ListIPProperties("abc_v1_00_a", list));
-  EXPECT_THAT(list, ElementsAre("NAME", "VERSION", "DESC", "IMP_NETLIST", "RUN_TRAMFOLD", "STYLE",
-                                "USAGE_LEVEL"));
-  EXPECT_TRUE(library.ListAllIPProperties(list));
-  EXPECT_THAT(list,
-              ElementsAre("NAME", "VERSION", "ALERT", "ARCH_SUPPORT", "ARCH_SUPPORT_MAP", "BUS_STD",
-                          "CORE_STATE", "DESC", "EARLY_ACCESS_ARCH_SUPPORT", "HDL", "IMP_NETLIST",
-                          "IP_GROUP", "IPLEVEL_DRC_PROC", "IPTYPE", "LAST_UPDATED", "LONG_DESC",
-                          "MAX_MASTERS", "MAX_SLAVES", "RUN_TRAMFOLD", "SPECIAL", "STYLE",
-                          "SYSLEVEL_DRC_PROC", "TCL_FILE", "USAGE_LEVEL"));
-  EXPECT_THAT(recorder.Take(), IsEmpty());
-
-  EXPECT_EQ(Ask("abc_v20_00_a", "DESC"), "no untouched");
   EXPECT_FALSE(library.ListIPProperties("x%s", list));
   EXPECT_THAT(list, IsEmpty());
-  const std::string error = "error s/Tarvo_KelLibrary: Unable to access IP ";
-  EXPECT_THAT(
-      recorder.Take(),
-      ElementsAre(
-          error + "abc_v20_00_a property DESC\nCannot find IP index entry for abc_v20_00_a\n\n",
-          error + "x%s properties\nCannot find IP index entry for x%s\n\n"));
+  EXPECT_THAT(recorder.Take(),
+              ElementsAre(Unable("Unable to access IP abc_v20_00_a property DESC\n"
+                                 "Cannot find IP index entry for abc_v20_00_a\n\n"),
+                          Unable("Unable to access IP x%s properties\n"
+                                 "Cannot find IP index entry for x%s\n\n")));
 }
 
 TEST_F(Options, CountInTheIndex) {
-  Kel_Index index;
   const auto add = [&](const std::string& key) {
-    Port::FileName location;
-    location.SetHead(repo.Core(key).Qvr("OPTION A = " + key).Location().c_str());
-    index.AddIP(Kel_Key(StringBase(key.c_str())), location);
+    repo.Core(key).Qvr("OPTION A = " + key);
+    Add(key);
   };
   add("abc_v2_00_a");
-  const PropertyList& options = index.GetIPOptions(Kel_Key(StringBase("abc")));
+  const PropertyList& options = index.GetIPOptions(Kel_Key("abc"));
   for (const char* key : {"abc_v1_00_a", "abc_v3_00_a", "xyz_v1_00_a", "abc_v1_00_a"}) add(key);
   EXPECT_EQ(OptionScanner::GetOptionValue(options, "A"), "abc_v2_00_a");
   EXPECT_EQ(index.GetBaseIPCount(), 2U);
   EXPECT_EQ(index.GetFullIPCount(), 4U);
-  EXPECT_THAT(index.GetLatestIPKeys(), ElementsAre("abc_v3_00_a", "xyz_v1_00_a"));
+  EXPECT_EQ(Join(index.GetLatestIPKeys()), "abc_v3_00_a, xyz_v1_00_a");
 }
 
 // Descriptions that are refused cost the versions that they belong to their options, and no more.
 TEST_F(Options, AreLostOnlyToTheBadVersion) {
   repo.Core("good_v1_00_a").Qvr("OPTION A = 1");
   repo.Core("bad_v1_00_a").Qvr("OPTION A");
-  const auto file = [&](const std::string& core) {
-    return repo.Core(core + "_v1_00_a").Location() + "/data/" + core + "_v2_1_0.qvr";
-  };
-  fs::create_directories(file("dir"));
-  fs::create_directories(fs::path(file("pipe")).parent_path());
-  ASSERT_EQ(::mkfifo(file("pipe").c_str(), 0644), 0);
-  repo.Core("shut_v1_00_a").Qvr("OPTION A = 1");
-  fs::permissions(fs::path(file("shut")).parent_path(), fs::perms::none);
+  const std::string shut = repo.Core("shut_v1_00_a").Qvr("OPTION A = 1").Location() + "/data";
+  fs::permissions(shut, fs::perms::none);
   {
     const OrdinaryUser user;
     EXPECT_TRUE(Walk());
   }
-  fs::permissions(fs::path(file("shut")).parent_path(), fs::perms::all);
-  const auto invalid = [&](const std::string& core, const std::string& why) {
-    return "error s/Tarvo_KelLibrary: Invalid IP index entry " + core + "_v1_00_a at " +
-           repo.Core(core + "_v1_00_a").Location() + "\n" + why + file(core) + "\n\n";
-  };
-  EXPECT_THAT(recorder.Take(),
-              testing::UnorderedElementsAre(
-                  "error s/Tarvo_OptionScanner: QVR unparsable OPTION: " + file("bad") +
-                      " line 1, OPTION A\n",
-                  invalid("bad", "Unable to parse QVR "), invalid("dir", "Cannot read file "),
-                  invalid("pipe", "Cannot read file "), invalid("shut", "Cannot read file ")));
-  EXPECT_EQ(Keys(), "good_v1_00_a ");
-  for (const char* core : {"bad", "dir", "pipe", "shut"})
-    EXPECT_EQ(library.GetVersion(core), "1.00.a");
+  fs::permissions(shut, fs::perms::all);
+  std::vector<std::string> messages = recorder.Take();
+  for (std::string& message : messages) message = Shorten(message);
+  EXPECT_THAT(messages, testing::UnorderedElementsAre(
+                            "error s/Tarvo_OptionScanner: QVR unparsable OPTION: "
+                            "bad_v1_00_a/data/bad_v2_1_0.qvr line 1, OPTION A\n",
+                            Unable("Invalid IP index entry bad_v1_00_a at bad_v1_00_a\n"
+                                   "Unable to parse QVR bad_v1_00_a/data/bad_v2_1_0.qvr\n\n"),
+                            Unable("Invalid IP index entry shut_v1_00_a at shut_v1_00_a\n"
+                                   "Cannot read file shut_v1_00_a/data/shut_v2_1_0.qvr\n\n")));
+  EXPECT_EQ(Keys(), "good_v1_00_a");
+  for (const char* core : {"bad", "shut"}) EXPECT_EQ(library.GetVersion(core), "1.00.a");
 }
 
 }  // namespace

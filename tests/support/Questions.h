@@ -22,6 +22,7 @@ using ParserGet = StringBase (QVRParser::*)(const StringBase&, const StringBase&
 // The questions for one kind of element, to an instance and to its description.
 struct Kind {
   const char* name;
+  const char* noun;  // what messages call one
   List list;
   ListOf listProperties;
   Get get;
@@ -31,20 +32,20 @@ struct Kind {
   ParserGet parserGet;
 };
 inline const Kind kKinds[] = {
-    {"parameter", &KelIP::ListParameters, &KelIP::ListParameterProperties,
+    {"parameter", "Parameter", &KelIP::ListParameters, &KelIP::ListParameterProperties,
      &KelIP::GetParameterProperty, &KelIP::ListAllParameterProperties, &QVRParser::ListParameters,
      &QVRParser::ListParameterProperties, &QVRParser::GetParameterProperty},
-    {"generic", &KelIP::ListGenerics, &KelIP::ListGenericProperties, &KelIP::GetGenericProperty,
-     &KelIP::ListAllGenericProperties, &QVRParser::ListGenerics, &QVRParser::ListGenericProperties,
-     &QVRParser::GetGenericProperty},
-    {"port", &KelIP::ListPorts, &KelIP::ListPortProperties, &KelIP::GetPortProperty,
+    {"generic", "Generic", &KelIP::ListGenerics, &KelIP::ListGenericProperties,
+     &KelIP::GetGenericProperty, &KelIP::ListAllGenericProperties, &QVRParser::ListGenerics,
+     &QVRParser::ListGenericProperties, &QVRParser::GetGenericProperty},
+    {"port", "Port", &KelIP::ListPorts, &KelIP::ListPortProperties, &KelIP::GetPortProperty,
      &KelIP::ListAllPortProperties, &QVRParser::ListPorts, &QVRParser::ListPortProperties,
      &QVRParser::GetPortProperty},
-    {"bus", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceProperties,
+    {"bus", "Bus Interface", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceProperties,
      &KelIP::GetBusInterfaceProperty, &KelIP::ListAllBusInterfaceProperties,
      &QVRParser::ListBusInterfaces, &QVRParser::ListBusInterfaceProperties,
      &QVRParser::GetBusInterfaceProperty},
-    {"io", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceProperties,
+    {"io", "I/O Interface", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceProperties,
      &KelIP::GetIOInterfaceProperty, &KelIP::ListAllIOInterfaceProperties,
      &QVRParser::ListIoInterfaces, &QVRParser::ListIoInterfaceProperties,
      &QVRParser::GetIoInterfaceProperty}};
@@ -53,12 +54,18 @@ struct Members {
   const char* name;
   List interfaces;
   ListOf list;
+  StringList (QVRParser::*parserInterfaces)() const;
+  ParserListOf parserList;
 };
 inline const Members kMembers[] = {
-    {"bus parameters", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceParameters},
-    {"bus ports", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfacePorts},
-    {"io parameters", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceParameters},
-    {"io ports", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfacePorts}};
+    {"bus parameters", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceParameters,
+     &QVRParser::ListBusInterfaces, &QVRParser::ListBusInterfaceParameters},
+    {"bus ports", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfacePorts,
+     &QVRParser::ListBusInterfaces, &QVRParser::ListBusInterfacePorts},
+    {"io parameters", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceParameters,
+     &QVRParser::ListIoInterfaces, &QVRParser::ListIoInterfaceParameters},
+    {"io ports", &KelIP::ListIOInterfaces, &KelIP::ListIOInterfacePorts,
+     &QVRParser::ListIoInterfaces, &QVRParser::ListIoInterfacePorts}};
 
 }  // namespace Questions
 
