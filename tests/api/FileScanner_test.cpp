@@ -4,8 +4,8 @@
 #include <string>
 
 #include "MessageRecorder.h"
+#include "Outcome.h"
 #include "RepositoryBuilder.h"
-#include "Tarvo_AppException.h"
 #include "Tarvo_FileScanner.h"
 
 namespace {
@@ -57,13 +57,8 @@ TEST(FileScanner, TellsOfFilesAndTabs) {
   directory.File("f", "a # b\tc\n#\t\n");
   scanner = FileScanner(Port::FileName(name.c_str()));
   EXPECT_EQ(recorder.Take().size(), 2U);
-  try {
-    scanner = FileScanner(Port::FileName((name + "%s").c_str()));
-    FAIL();
-  } catch (const AppException& exception) {
-    EXPECT_EQ(exception.level, AppException::Failure);
-    EXPECT_EQ(exception.what(), "Cannot read file " + name + "%s\n");
-  }
+  EXPECT_EQ(Outcome([&] { FileScanner(Port::FileName((name + "%s").c_str())); }),
+            "failure: Cannot read file " + name + "%s\n");
   EXPECT_THAT(recorder.Take(), ElementsAre("trace: Opening File " + name + "%s\n"));
 }
 

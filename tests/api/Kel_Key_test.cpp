@@ -2,7 +2,6 @@
 
 #include <limits>
 #include <string>
-#include <vector>
 
 #include "Tarvo_Kel_Key.h"
 
@@ -25,11 +24,7 @@ std::string Bare(const std::string& text) {
 }
 
 TEST(Kel_Key, ReadsVersions) {
-  struct Row {
-    const char* text;
-    const char* fields;
-  };
-  const Row rows[] = {
+  const char* const rows[][2] = {
       {"abc_v1_00_a", "key=abc_v1_00_a name=abc version=1.00.a 1 0 a"},
       {"Abc_V12_34_B", "key=Abc_v12_34_b name=Abc version=12.34.b 12 34 b"},
       {"abc_v007_05_c", "key=abc_v007_05_c name=abc version=7.05.c 7 5 c"},
@@ -38,8 +33,8 @@ TEST(Kel_Key, ReadsVersions) {
       {"a b.c_v4294967295_99_z",
        "key=a b.c_v4294967295_99_z name=a b.c version=4294967295.99.z 4294967295 99 z"},
       {"__v1_00_a", "key=__v1_00_a name=_ version=1.00.a 1 0 a"}};
-  for (const Row& row : rows) {
-    EXPECT_EQ(Dump(Kel_Key(StringBase(row.text))), std::string("valid ") + row.fields);
+  for (const auto& [text, fields] : rows) {
+    EXPECT_EQ(Dump(Kel_Key(text)), std::string("valid ") + fields);
   }
 }
 
@@ -68,16 +63,6 @@ TEST(Kel_Key, ReadsAnewIntoTheSameKey) {
   EXPECT_EQ(Dump(key), Bare("_v2_00_b"));
 }
 
-std::vector<Kel_Key> SomeKeys() {
-  std::vector<Kel_Key> keys;
-  for (const char* text :
-       {"", "abc", "xyz", "abc_v1_00_a", "xyz_v1_00_a", "abc_v01_00_a", "abc_V1_00_A",
-        "abc_v1_00_b", "abc_v1_99_z", "abc_v2_00_a", "abc_v9_00_a", "abc_v10_00_a", "_v1_00_a"}) {
-    keys.emplace_back(StringBase(text));
-  }
-  return keys;
-}
-
 // The version as one number; whatever has none comes last.
 long Rank(const Kel_Key& key) {
   if (!key.IsValid()) return std::numeric_limits<long>::max();
@@ -85,8 +70,22 @@ long Rank(const Kel_Key& key) {
 }
 
 TEST(Kel_Key, OrdersByVersionAlone) {
-  for (const Kel_Key& a : SomeKeys()) {
-    for (const Kel_Key& b : SomeKeys()) {
+  const char* const keys[] = {"",
+                              "abc",
+                              "xyz",
+                              "abc_v1_00_a",
+                              "xyz_v1_00_a",
+                              "abc_v01_00_a",
+                              "abc_V1_00_A",
+                              "abc_v1_00_b",
+                              "abc_v1_99_z",
+                              "abc_v2_00_a",
+                              "abc_v9_00_a",
+                              "abc_v10_00_a",
+                              "_v1_00_a"};
+  for (const char* left : keys) {
+    for (const char* right : keys) {
+      const Kel_Key a(left), b(right);
       SCOPED_TRACE(Dump(a) + " against " + Dump(b));
       EXPECT_EQ(a < b, Rank(a) < Rank(b));
       EXPECT_EQ(a > b, Rank(a) > Rank(b));
