@@ -3,275 +3,219 @@
 #include <CLI/CLI.hpp>
 #include <algorithm>
 #include <iostream>
+#include <utility>
 
-#include "Codes.h"
-#include "Describe.h"
-#include "Formats.h"
-#include "Nearby.h"
+#include "Suggestions.h"
 #include "Tarvo_Version.h"
 #include "Text.h"
 
 namespace {
-
-const char* const kKeyHelp =
-    "A key such as abc_v1_00_a, or a core's bare name for its newest version";
-const char* const kGlobHelp = "A key or name, in which * ? [...] stand for any text";
 
 const char* const kFooter =
     "Exit status: 0 success, 1 an error or warning was found or a key is unknown, 2 usage error,\n"
     "3 no repository can be read. 'kel help VERB' shows an example, and 'kel help diagnostics'\n"
     "what check may report.\n";
 
-const std::vector<std::string> kVerbNames = {"list",     "which", "show", "sources",
-                                             "netlists", "check", "help"};
+Choices Colors() { return {{"auto"}, {"always"}, {"never"}}; }
 
-// A verb, with an example of its use.
-CLI::App* AddVerb(CLI::App& app, Call& call, const char* name, const char* help,
-                  const char* example) {
-  CLI::App* const verb = app.add_subcommand(name, help);
-  verb->group("Verbs");
-  verb->footer(std::string("Every verb takes -L, --json, --trace, --quiet and --color too; see "
-                           "'kel help'.\nExample: kel -L examples/repository ") +
-               example + "\n");
-  verb->callback([&call, name] { call.verb = name; });
-  return verb;
+bool IsClosed(const Word& word) {
+  return word.choices != nullptr && word.fault == nullptr && word.IsOption();
 }
 
-void AddKey(CLI::App* verb, Call& call) { verb->add_option("KEY", call.key, kKeyHelp)->required(); }
-
-void AddRelativeTo(CLI::App* verb, Call& call) {
-  verb->add_option("--relative-to", call.relativeTo, "Write paths relative to this directory")
-      ->type_name("DIR");
+std::string FaultOf(const Word& word, const std::string& value) {
+  if (word.fault != nullptr) return word.fault(value);
+  if (!IsClosed(word)) return "";
+  const std::vector<std::string> names = NamesOf(word.choices());
+  const bool isOne = std::find(names.begin(), names.end(), value) != names.end();
+  return isOne ? "" : value + " not in {" + Join(names, ",") + "}";
 }
 
-void DescribeList(CLI::App& app, Call& call) {
-  CLI::App* const list =
-      AddVerb(app, call, "list",
-              "Lists the newest version of each core: key, style, language, location, description",
-              "list 'pulse*' --all");
-  list->add_option("GLOB", call.key, kGlobHelp);
-  list->add_flag("--all", call.allVersions, "List every version");
+std::string NamesFor(const Word& word) {
+  return word.letter.empty() ? word.name : word.letter + "," + word.name;
 }
 
-void DescribeWhich(CLI::App& app, Call& call) {
-  CLI::App* const which =
-      AddVerb(app, call, "which", "Tells key, name, version and location of each core",
-              "which word_fifo pulse_counter_v1_00_a");
-  which->add_option("KEY", call.keys, kKeyHelp)->required();
+// What the help says of an option with choices: they stand beside the name of the value, or have a
+// line each if they have a help.
+void DescribeChoices(const Choices& choices, std::string& value, std::string& help) {
+  if (choices.front().help.empty()) value += ":{" + Join(NamesOf(choices), ",") + "}";
+  for (const auto& [name, meaning] : choices) {
+    if (!meaning.empty()) help.append("\n  ").append(name).append(": ").append(meaning);
+  }
 }
 
-void DescribeShow(CLI::App& app, Call& call) {
-  CLI::App* const show = AddVerb(
-      app, call, "show", "Shows all about a core: place, options, parameters, ports, interfaces",
-      "show event_station --section ports");
-  AddKey(show, call);
-  show->add_option("--section", call.sections, "Show this section only; may be repeated")
-      ->check(CLI::IsMember(SectionNames()))
-      ->allow_extra_args(false);
+void AddValued(CLI::App& app, const Word& word) {
+  std::string value = word.value;
+  std::string help = word.help;
+  if (IsClosed(word)) DescribeChoices(word.choices(), value, help);
+  CLI::Option* const option = app.add_option(NamesFor(word), std::as_const(help));
+  option->type_name(value)->required(word.isRequired)->default_str(word.byDefault);
+  if (word.isRepeated) option->expected(1, CLI::detail::expected_max_vector_size);
+  option->allow_extra_args(word.isRepeated && !word.IsOption());
+  option->check([&word](const std::string& given) { return FaultOf(word, given); });
 }
 
-void DescribeSources(CLI::App& app, Call& call) {
-  CLI::App* const sources =
-      AddVerb(app, call, "sources", "Lists the HDL sources of a core in analyse order",
-              "sources event_station --for simulation --format ghdl");
-  AddKey(sources, call);
-  sources->add_option("--for", call.purpose, "What the sources are for")
-      ->check(CLI::IsMember({"synthesis", "simulation"}))
-      ->required();
-  sources
-      ->add_option("--format", call.format,
-                   "Output format: list (a path on a line), json, f (file list for Verilog\n"
-                   "tools), ghdl (script for GHDL), edam (for flow generators), vhdl_ls (for the\n"
-                   "VHDL language server) or tcl")
-      ->check(CLI::IsMember(FormatNames()))
-      ->default_str("list");
-  AddRelativeTo(sources, call);
+void AddWord(CLI::App& app, const Word& word) {
+  if (word.name == "--help") {
+    app.set_help_flag(NamesFor(word), word.help);
+  } else if (word.name == "--version") {
+    app.set_version_flag(word.name, std::string("kel ") + Tarvo::GetLibraryVersion(), word.help);
+  } else if (word.IsFlag()) {
+    app.add_flag(word.name, word.help);
+  } else {
+    AddValued(app, word);
+  }
 }
 
-std::string CheckSetting(const std::string& setting) {
-  const std::size_t equals = setting.find('=');
-  const bool good = equals != std::string::npos && equals > 0;
-  return good ? std::string() : "'" + setting + "' is not NAME=VALUE";
+void AddVerb(CLI::App& app, const Verb& verb) {
+  CLI::App* const added = app.add_subcommand(verb.name, verb.help);
+  added->group("Verbs");
+  const std::string more =
+      "Every verb takes -L, --json, --trace, --quiet and --color too; see "
+      "'kel help'.\nExample: kel -L examples/repository ";
+  added->footer((verb.reads == Verb::Nothing ? "Example: kel " : more) + verb.example + "\n");
+  for (const Word& word : verb.words) AddWord(*added, word);
 }
 
-void DescribeNetlists(CLI::App& app, Call& call) {
-  CLI::App* const netlists =
-      AddVerb(app, call, "netlists", "Lists the netlists of a core that apply",
-              "netlists crc_unit --set WIDTH=16 --set MODE=FAST");
-  AddKey(netlists, call);
-  netlists->add_option("--set", call.settings, "Sets a parameter first; may be repeated")
-      ->type_name("NAME=VALUE")
-      ->check(CheckSetting)
-      ->allow_extra_args(false);
-  netlists->add_flag("--table", call.wholeTable,
-                     "List all of them with their values; * marks those that apply");
-}
-
-std::string CheckWarning(const std::string& choice) {
-  std::vector<std::string> choices = {"error"};
-  for (const auto& code : Codes()) choices.push_back(std::string("no-") + code.code);
-  if (std::find(choices.begin(), choices.end(), choice) != choices.end()) return "";
-  return "'" + choice + "' is neither error nor no-CODE" + DidYouMean(choices, choice);
-}
-
-void DescribeCheck(CLI::App& app, Call& call) {
-  CLI::App* const check =
-      AddVerb(app, call, "check", "Lists what is wrong with the cores, at its file and line",
-              "check 'pulse*' -W error");
-  check->add_option("GLOB", call.keys, kGlobHelp);
-  check
-      ->add_option("--format", call.format,
-                   "Output format: text, json or sarif (for code hosts and editors)")
-      ->check(CLI::IsMember({"text", "json", "sarif"}))
-      ->default_str("text");
-  check->add_flag("--excerpts", call.withExcerpts,
-                  "Show lines, help and related places, as on a terminal");
-  check
-      ->add_option("-W", call.warnings,
-                   "error: warnings count as errors; no-CODE: leave out this code; may be repeated")
-      ->type_name("CHOICE")
-      ->check(CheckWarning)
-      ->allow_extra_args(false);
-  AddRelativeTo(check, call);
-}
-
-void DescribeHelp(CLI::App& app, Call& call) {
-  CLI::App* const help =
-      AddVerb(app, call, "help", "Shows this help, that of a verb, or what a diagnostic means", "");
-  help->footer("Examples: kel help list, kel help list-ends\n");
-  help->add_option("TOPIC", call.key,
-                   "A verb, a code of a diagnostic, or diagnostics for all codes");
-}
-
-void DescribeCall(CLI::App& app, Call& call) {
+void DescribeCommand(CLI::App& app) {
   app.name("kel");
   app.description("Answers questions about repositories of IP cores.");
   app.get_formatter()->label("SUBCOMMAND", "VERB");
-  app.set_version_flag("--version", std::string("kel ") + Tarvo::GetLibraryVersion());
-  app.add_option("-L,--library", call.libraries,
-                 "A repository, or several with ';' between; may be repeated, the first wins")
-      ->type_name("DIR")
-      ->allow_extra_args(false);
-  app.add_flag("--json", call.asJson, "Write a JSON document");
-  app.add_flag("--trace", call.withTraces, "Show on standard error what is read");
-  app.add_flag("--quiet", call.quiet, "Leave out messages and notes; see the exit status");
-  app.add_option("--color", call.color, "Whether messages are coloured")
-      ->check(CLI::IsMember({"auto", "always", "never"}))
-      ->default_str("auto");
+  for (const Word& word : CommonOptions()) AddWord(app, word);
   app.require_subcommand(0, 1);
   app.fallthrough();
   app.allow_extras();
   app.footer(kFooter);
-  for (const auto describe : {DescribeList, DescribeWhich, DescribeShow, DescribeSources,
-                              DescribeNetlists, DescribeCheck, DescribeHelp}) {
-    describe(app, call);
-  }
+  for (const Verb& verb : Verbs()) AddVerb(app, verb);
 }
 
 std::string NoVerb(const std::string& word) {
-  const std::string question = DidYouMean(kVerbNames, word);
+  const std::vector<std::string> names = NamesOf(ChoicesOf(Verbs()));
+  const std::string question = DidYouMean(names, word);
   return "unknown verb '" + word + "'" +
-         (question.empty() ? "; the verbs are " + Join(kVerbNames) : question);
+         (question.empty() ? "; the verbs are " + Join(names) : question);
 }
 
-// What is wrong with a call that parsed, or an empty text.
-std::string Fault(const CLI::App& app, const Call& call) {
+// What is wrong with a command line that parsed, or an empty text.
+std::string Fault(const CLI::App& app, const Request& request) {
   const std::vector<std::string> extras = app.remaining(true);
-  if (call.verb.empty() && !extras.empty() && extras.front().front() != '-') {
+  const Verb* const verb = FindVerb(request.verb);
+  if (verb == nullptr && !extras.empty() && !extras.front().starts_with('-')) {
     return NoVerb(extras.front());
   }
   if (!extras.empty()) return "unexpected argument '" + extras.front() + "'";
-  if (call.verb.empty()) return "a verb is required: " + Join(kVerbNames);
-  if (call.asJson && !call.format.empty() && call.format != "json") {
-    return "--json and --format " + call.format + " can't be used together";
+  if (verb == nullptr) return "a verb is required: " + Join(NamesOf(ChoicesOf(Verbs())));
+  const std::string format = request.Value("--format");
+  if (request.Has("--json") && !format.empty() && format != "json") {
+    return "--json and --format " + format + " can't be used together";
   }
-  if (call.libraries.empty()) return "-L DIR is required; it names a repository";
-  const bool empty = std::any_of(
-      call.libraries.begin(), call.libraries.end(),
-      [](const std::string& path) { return path.find_first_not_of(';') == std::string::npos; });
-  return empty ? "-L needs the name of a directory" : "";
-}
-
-Status Refuse(const std::string& fault, const std::string& verb) {
-  const std::string help = verb.empty() ? "kel --help" : "kel help " + verb;
-  std::cerr << "kel: error: " << fault << "\nRun '" << help << "' for more information.\n";
-  return StatusUsage;
-}
-
-// The verb that the words name, also if they are wrong behind it.
-std::string VerbOf(const CLI::App& app) {
-  const std::vector<CLI::App*> verbs = app.get_subcommands();
-  return verbs.empty() ? "" : verbs.front()->get_name();
+  if (verb->reads == Verb::Nothing) return "";
+  if (!request.Has("--library")) return "-L DIR is required; it names a repository";
+  const auto& paths = request.Values("--library");
+  const auto isEmpty = [](const auto& path) { return path.find_first_not_of(';') == path.npos; };
+  return std::any_of(paths.begin(), paths.end(), isEmpty) ? "-L needs the name of a directory" : "";
 }
 
 // The parser would take a word in brackets for a list, and a pattern may be one. A mark behind it
 // keeps it a word.
 constexpr char kMark = '\x01';
 
-// The words from the last to the first, as the parser wants them.
-std::vector<std::string> MarkWords(int argc, char** argv) {
-  std::vector<std::string> words(argv + std::min(argc, 1), argv + argc);
+void Parse(CLI::App& app, std::vector<std::string> words) {
   for (std::string& word : words) {
-    if (!word.empty() && word.front() == '[' && word.back() == ']') word += kMark;
+    if (word.starts_with('[') && word.ends_with(']')) word += kMark;
   }
-  std::reverse(words.begin(), words.end());
-  return words;
+  std::reverse(words.begin(), words.end());  // as the parser wants them
+  app.parse(words);
 }
 
-void Unmark(std::string& word) {
-  if (!word.empty() && word.back() == kMark) word.pop_back();
-}
-
-void Unmark(Call& call) {
-  for (std::string* const word : {&call.key, &call.relativeTo}) Unmark(*word);
-  for (auto* const words : {&call.keys, &call.libraries, &call.settings}) {
-    for (std::string& word : *words) Unmark(word);
+// What was given for a word. JSON may be asked for by --json or as a format.
+std::vector<std::string> Given(const CLI::App& app, const Word& word, const Request& request) {
+  std::vector<std::string> values = app.get_option(word.name)->results();
+  for (std::string& value : values) {
+    if (value.ends_with(kMark)) value.pop_back();
   }
+  if (!values.empty() || word.byDefault.empty()) return values;
+  return {word.name == "--format" && request.Has("--json") ? "json" : word.byDefault};
 }
 
-std::string NoTopic(const std::string& word) {
-  std::vector<std::string> topics = kVerbNames;
-  topics.emplace_back("diagnostics");
-  for (const auto& code : Codes()) topics.emplace_back(code.code);
-  return "no help for '" + word + "'" + DidYouMean(topics, word);
-}
-
-Status ShowHelp(const CLI::App& app, const std::string& verb) {
-  if (ShowCodes(verb)) return StatusClean;
-  try {
-    const CLI::App* const shown = verb.empty() ? &app : app.get_subcommand(verb);
-    // The application's own operation would give the help of the verb `help`.
-    std::cout << app.get_formatter()->make_help(shown, verb.empty() ? "kel" : "kel " + verb,
-                                                CLI::AppFormatMode::Normal);
-    return StatusClean;
-  } catch (const CLI::OptionNotFound&) {
-    return Refuse(NoTopic(verb), "");
+// The verb is known also if the words are wrong behind it.
+Request MakeRequest(const CLI::App& app) {
+  Request request;
+  for (const Verb& verb : Verbs()) {
+    for (const Word& word : verb.words) request.given[word.name];
   }
+  for (const Word& word : CommonOptions()) request.given[word.name] = Given(app, word, request);
+  const std::vector<CLI::App*> named = app.get_subcommands();
+  if (named.empty()) return request;
+  request.verb = named.front()->get_name();
+  for (const Word& word : FindVerb(request.verb)->words) {
+    request.given[word.name] = Given(*named.front(), word, request);
+  }
+  return request;
 }
 
 }  // namespace
 
-std::optional<Call> ReadCall(int argc, char** argv, Status& status) {
+const std::vector<Word>& CommonOptions() {
+  static const std::vector<Word> options = {
+      {.letter = "-h",
+       .name = "--help",
+       .help = "Show the help of the command, or of the verb before it"},
+      {.name = "--version", .help = "Show the version"},
+      {.letter = "-L",
+       .name = "--library",
+       .value = "DIR",
+       .help = "A repository, or several with ';' between; may be repeated, the first wins",
+       .isRepeated = true},
+      {.name = "--json", .help = "Write a JSON document"},
+      {.name = "--trace", .help = "Show on standard error what is read"},
+      {.name = "--quiet", .help = "Leave out messages and notes; see the exit status"},
+      {.name = "--color",
+       .value = "WHEN",
+       .help = "Whether messages are coloured",
+       .byDefault = "auto",
+       .choices = Colors}};
+  return options;
+}
+
+std::optional<Request> ReadRequest(const std::vector<std::string>& words, Status& status) {
   CLI::App app;
-  Call call;
-  DescribeCall(app, call);
+  DescribeCommand(app);
   try {
-    app.parse(MarkWords(argc, argv));
-    Unmark(call);
+    Parse(app, words);
+    Request request = MakeRequest(app);
+    const std::string fault = Fault(app, request);
+    if (fault.empty()) return request;
+    status = Refuse(fault, request.verb);
   } catch (const CLI::Success& help) {
     app.exit(help);
     status = StatusClean;
-    return std::nullopt;
   } catch (const CLI::ParseError& error) {
-    status = Refuse(error.what(), VerbOf(app));
-    return std::nullopt;
+    status = Refuse(error.what(), MakeRequest(app).verb);
   }
-  if (call.verb == "help") {
-    status = ShowHelp(app, call.key);
-    return std::nullopt;
-  }
-  const std::string fault = Fault(app, call);
-  if (fault.empty()) return call;
-  status = Refuse(fault, call.verb);
   return std::nullopt;
+}
+
+Request GuessRequest(const std::vector<std::string>& words) {
+  CLI::App app;
+  DescribeCommand(app);
+  try {
+    Parse(app, words);
+  } catch (const CLI::Error&) {  // what was read until then will do
+  }
+  return MakeRequest(app);
+}
+
+// The application's own operation would give the help of the verb `help`.
+std::string HelpText(const std::string& verb) {
+  CLI::App app;
+  DescribeCommand(app);
+  const bool isVerb = FindVerb(verb) != nullptr;
+  return app.get_formatter()->make_help(isVerb ? app.get_subcommand(verb) : &app,
+                                        isVerb ? "kel " + verb : "kel", CLI::AppFormatMode::Normal);
+}
+
+Status Refuse(const std::string& fault, const std::string& verb) {
+  const std::string help = verb.empty() ? "kel --help" : "kel help " + verb;
+  std::cerr << "kel: error: " << fault << "\nRun '" << help << "' for more information.\n";
+  return StatusUsage;
 }

@@ -7,17 +7,15 @@
 #include <iostream>
 #include <tuple>
 
-#include "Cells.h"
-#include "Codes.h"
+#include "Answer.h"
 #include "Diagnostics.h"
-#include "Json.h"
 #include "Messages.h"
-#include "Nearby.h"
 #include "Sarif.h"
+#include "Suggestions.h"
 #include "Tarvo_KelChecker.h"
 #include "Tarvo_Kel_Index.h"
 #include "Text.h"
-#include "Verbs.h"
+#include "Verb.h"
 
 namespace {
 
@@ -81,9 +79,9 @@ bool IsLeftOut(const StringBase& file, const std::vector<std::string>& globs) {
 }
 
 // Sets the repository path, and gives what the walk finds and the checker does not look for.
-Diagnostics Walk(Tarvo::KelLibrary& library, const Call& call) {
+Diagnostics Walk(Tarvo::KelLibrary& library, const Request& request) {
   std::vector<std::string> paths;
-  for (const std::string& repository : Repositories(call)) {
+  for (const std::string& repository : Repositories(request)) {
     paths.push_back(fs::absolute(repository).lexically_normal());
   }
   const Tarvo::KelDiagnosticLog log;
@@ -92,7 +90,7 @@ Diagnostics Walk(Tarvo::KelLibrary& library, const Call& call) {
   std::erase_if(found, [&](const KelDiagnostic& one) {
     return one.place.file.GetLength() > 0 &&
            (one.code == "bad-statement" || one.code == "missing-description" ||
-            IsLeftOut(one.place.file, call.keys));
+            IsLeftOut(one.place.file, request.Values("GLOB")));
   });
   return found;
 }
@@ -102,11 +100,12 @@ auto Order(const KelDiagnostic& diagnostic) {
   return std::tie(place.file, place.line, place.column, diagnostic.code, diagnostic.text);
 }
 
-Diagnostics CheckAll(const Tarvo::KelLibrary& library, const Call& call, const StringList& keys) {
+Diagnostics CheckAll(const Tarvo::KelLibrary& library, const Request& request,
+                     const StringList& keys) {
   const Tarvo::KelChecker checker(library);
-  Progress progress(call.quiet);
+  Progress progress(request.Has("--quiet"));
   const auto step = [&](std::size_t done, std::size_t total) { progress.Step(done, total); };
-  return call.keys.empty() ? checker.CheckLibrary(step) : checker.CheckCores(keys, step);
+  return request.Has("GLOB") ? checker.CheckCores(keys, step) : checker.CheckLibrary(step);
 }
 
 // In the order of their places, each once.
@@ -137,11 +136,11 @@ std::string Plural(std::size_t count, const char* noun) {
   return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
 }
 
-void WriteText(const Diagnostics& found, const Counts& counts, const Call& call) {
-  const bool isDetailed = call.withExcerpts || ::isatty(STDOUT_FILENO) != 0;
+void WriteText(const Diagnostics& found, const Counts& counts, const Request& request) {
+  const bool isDetailed = request.Has("--excerpts") || ::isatty(STDOUT_FILENO) != 0;
   DiagnosticWriter writer;
-  writer.relativeTo = call.relativeTo;
-  writer.withColour = WantsColour(call.color, STDOUT_FILENO);
+  writer.relativeTo = request.Value("--relative-to");
+  writer.withColour = WantsColour(request.Value("--color"), STDOUT_FILENO);
   writer.withRelated = writer.withHelp = isDetailed;
   writer.excerptWidth = isDetailed ? TerminalWidth() : 0;
   for (const KelDiagnostic& diagnostic : found) std::cout << writer.Write(diagnostic);
@@ -160,15 +159,15 @@ Json PlaceMembers(const KelPlace& place, const std::string& relativeTo) {
           {"length", known(place.length)}};
 }
 
-void WriteJsonList(const Diagnostics& found, const Counts& counts, const Call& call) {
+void WriteJsonList(const Diagnostics& found, const Counts& counts, const Request& request) {
   Json findings = Json::array();
   for (const KelDiagnostic& one : found) {
     Json related = Json::array();
     for (const Tarvo::KelRelatedPlace& other : one.related) {
-      related.push_back(PlaceMembers(other.place, call.relativeTo));
+      related.push_back(PlaceMembers(other.place, request.Value("--relative-to")));
       related.back()["text"] = Text(other.text);
     }
-    findings.push_back(PlaceMembers(one.place, call.relativeTo));
+    findings.push_back(PlaceMembers(one.place, request.Value("--relative-to")));
     findings.back().update(
         {{"severity", SeverityWord(one.severity)},
          {"code", Text(one.code)},
@@ -184,41 +183,90 @@ void WriteJsonList(const Diagnostics& found, const Counts& counts, const Call& c
              {"findings", findings}});
 }
 
-void Write(const Diagnostics& found, const Counts& counts, const Call& call) {
-  if (call.format == "sarif") {
-    const std::string base = call.relativeTo.empty() ? "." : call.relativeTo;
-    const fs::path directory = fs::absolute(base + "/.").lexically_normal().parent_path();
-    WriteDocument(std::cout, SarifLog(found, directory));
-  } else if (call.asJson || call.format == "json") {
-    WriteJsonList(found, counts, call);
-  } else {
-    WriteText(found, counts, call);
+void WriteSarif(const Diagnostics& found, const Counts& /*counts*/, const Request& request) {
+  const std::string base = request.Value("--relative-to");
+  const fs::path directory = fs::absolute((base.empty() ? "." : base) + "/.");
+  WriteDocument(std::cout, SarifLog(found, directory.lexically_normal().parent_path()));
+}
+
+struct Format {
+  const char* name;
+  void (*write)(const Diagnostics& found, const Counts& counts, const Request& request);
+  const char* help;
+};
+const Format kFormats[] = {{"text", WriteText, "A line for each finding, and a line of counts"},
+                           {"json", WriteJsonList, "A document of findings and counts"},
+                           {"sarif", WriteSarif, "A SARIF log, for code hosts and editors"}};
+
+Choices FindingFormats() { return ChoicesOf(kFormats); }
+
+void Write(const Diagnostics& found, const Counts& counts, const Request& request) {
+  for (const Format& format : kFormats) {
+    if (request.Value("--format") == format.name) format.write(found, counts, request);
   }
 }
 
-}  // namespace
-
-Status Check(Tarvo::KelLibrary& library, const Call& call) {
-  Diagnostics found = Walk(library, call);
+Status Check(const Tarvo::KelLibrary& /*unread*/, const Request& request) {
+  Tarvo::KelLibrary library;
+  const std::vector<std::string>& globs = request.Values("GLOB");
+  Diagnostics found = Walk(library, request);
   if (library.GetRepositories().empty()) {
     for (const KelDiagnostic& diagnostic : found) Messages::Show(diagnostic);
-    SuggestRepositories(call);
+    SuggestRepositories(request);
     return StatusUnreadable;
   }
   const bool isComplete = found.empty();
-  const StringList keys = Keys(library, call.keys);
-  const Diagnostics checked = CheckAll(library, call, keys);
+  const StringList keys = Keys(library, globs);
+  const Diagnostics checked = CheckAll(library, request, keys);
   found.insert(found.end(), checked.begin(), checked.end());
   Sort(found);
-  Judge(found, call.warnings);
+  Judge(found, request.Values("-W"));
   Counts counts = {keys.size(), {}};
   for (const KelDiagnostic& diagnostic : found) ++counts.of.at(diagnostic.severity);
-  Write(found, counts, call);
-  if (!isComplete || keys.empty()) SuggestRepositories(call);
-  if (keys.empty() && call.keys.empty()) {
+  Write(found, counts, request);
+  if (!isComplete || keys.empty()) SuggestRepositories(request);
+  if (keys.empty() && globs.empty()) {
     Messages::Note("there is no core to check");
     return StatusUnreadable;
   }
   const bool isClean = counts.of.at(KelDiagnostic::Note) == found.size();
-  return MatchAll(library, call.keys) && isClean ? StatusClean : StatusFindings;
+  return MatchAll(library, globs) && isClean ? StatusClean : StatusFindings;
+}
+
+Choices Warnings() {
+  Choices choices = {{"error", "Warnings count as errors"}};
+  for (const auto& code : Codes()) choices.push_back({std::string("no-") + code.code, code.title});
+  return choices;
+}
+
+std::string WarningFault(const std::string& choice) {
+  const std::vector<std::string> names = NamesOf(Warnings());
+  if (std::find(names.begin(), names.end(), choice) != names.end()) return "";
+  return "'" + choice + "' is neither error nor no-CODE" + DidYouMean(names, choice);
+}
+
+}  // namespace
+
+Verb DescribeCheck() {
+  return {.name = "check",
+          .help = "Lists what is wrong with the cores, at its file and line",
+          .words = {Repeated(GlobWord()),
+                    {.name = "--format",
+                     .value = "FORMAT",
+                     .help = "How the findings are written",
+                     .byDefault = "text",
+                     .choices = FindingFormats},
+                    {.name = "--excerpts",
+                     .help = "Show lines, help and related places, as on a terminal"},
+                    {.name = "-W",
+                     .value = "CHOICE",
+                     .help = "error: warnings count as errors; no-CODE: leave out this code; may "
+                             "be repeated",
+                     .isRepeated = true,
+                     .choices = Warnings,
+                     .fault = WarningFault},
+                    RelativeToWord()},
+          .example = "check 'pulse*' -W error",
+          .reads = Verb::ItsOwn,
+          .answer = Check};
 }

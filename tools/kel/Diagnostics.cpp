@@ -6,13 +6,22 @@
 #include <cstdlib>
 #include <fstream>
 
-#include "Cells.h"
-#include "Codes.h"
+#include "Tarvo_KelChecker.h"
 #include "Text.h"
 
 using Tarvo::KelDiagnostic;
 using Tarvo::KelPlace;
 using Tarvo::KelRelatedPlace;
+
+const std::vector<Tarvo::KelDiagnosticCode>& Codes() {
+  static const std::vector<Tarvo::KelDiagnosticCode> codes = Tarvo::KelChecker::ListCodes();
+  return codes;
+}
+
+const char* SeverityWord(KelDiagnostic::Severity severity) {
+  constexpr std::array words = {"note", "warning", "error"};
+  return words.at(severity);
+}
 
 std::optional<std::string_view> FileLines::Find(const KelPlace& place) {
   if (place.line == 0) return std::nullopt;

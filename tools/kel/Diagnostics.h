@@ -9,6 +9,12 @@
 
 #include "Tarvo_KelDiagnostic.h"
 
+// All codes that a diagnostic may have, in the order of the alphabet.
+const std::vector<Tarvo::KelDiagnosticCode>& Codes();
+
+// "note", "warning" or "error", as a diagnostic's line and all formats have it.
+const char* SeverityWord(Tarvo::KelDiagnostic::Severity severity);
+
 // The lines that diagnostics are about. Files are read when a line is asked for; what can't be read
 // has no lines.
 class FileLines {

@@ -9,9 +9,6 @@
 #include <sstream>
 #include <string_view>
 
-#include "Json.h"
-#include "Messages.h"
-#include "Table.h"
 #include "Text.h"
 
 namespace {
@@ -189,11 +186,16 @@ struct Format {
   const char* name;
   void (*write)(std::ostream& output, const SourceList& list);
   const char* language;  // the only one that it has room for, if there is one
+  const char* help;
 };
-const Format kFormats[] = {{"list", WriteList, nullptr},   {"json", WriteJsonList, nullptr},
-                           {"f", WriteFileList, kVerilog}, {"ghdl", WriteGhdl, kVhdl},
-                           {"edam", WriteEdam, nullptr},   {"vhdl_ls", WriteVhdlLs, kVhdl},
-                           {"tcl", WriteTcl, nullptr}};
+const Format kFormats[] = {
+    {"list", WriteList, nullptr, "A path on each line"},
+    {"json", WriteJsonList, nullptr, "A document of sources and include directories"},
+    {"f", WriteFileList, kVerilog, "A file list for Verilog tools"},
+    {"ghdl", WriteGhdl, kVhdl, "A shell script that analyses with GHDL"},
+    {"edam", WriteEdam, nullptr, "A document for flow generators"},
+    {"vhdl_ls", WriteVhdlLs, kVhdl, "The configuration of the VHDL language server"},
+    {"tcl", WriteTcl, nullptr, "A script that sets lists of sources and directories"}};
 
 // Whoever asks for one language should know that the core has more.
 void NoteWhatIsLeftOut(const Format& format, const SourceList& list) {
@@ -209,11 +211,7 @@ void NoteWhatIsLeftOut(const Format& format, const SourceList& list) {
 
 }  // namespace
 
-std::vector<std::string> FormatNames() {
-  std::vector<std::string> names;
-  for (const Format& format : kFormats) names.emplace_back(format.name);
-  return names;
-}
+Choices SourceFormats() { return ChoicesOf(kFormats); }
 
 void WriteSources(const SourceList& list, const std::string& format) {
   const auto* const chosen =

@@ -4,19 +4,12 @@
 #include <string>
 #include <vector>
 
+#include "Verb.h"
+
 // How the sources of a core are written for the tools that read them.
-//
-//     list       a path on each line
-//     json       a document of sources, libraries and include directories
-//     f          a file list for Verilog tools: include directories and Verilog sources
-//     ghdl       a shell script that analyses the VHDL sources, each into its library
-//     edam       a document as flow generators take it: name, files with type and logical library
-//     vhdl_ls    the configuration of the VHDL language server
-//     tcl        a script that sets a list of sources and one of include directories
-//
 // Every format keeps the order, and the libraries where it can say them. Those for one language
 // leave out the sources of the other.
-std::vector<std::string> FormatNames();
+Choices SourceFormats();
 
 struct Source {
   std::string path;

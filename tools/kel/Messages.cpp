@@ -6,7 +6,6 @@
 #include <set>
 #include <sstream>
 
-#include "Codes.h"
 #include "Diagnostics.h"
 #include "Port_MsgManData.h"
 #include "Tarvo_DebugMessenger.h"
@@ -51,14 +50,14 @@ void TakeMessage(const Port_Message& message, const Tarvo::KelDiagnosticLog& log
 
 }  // namespace
 
-Session::Session(const Call& call) {
-  isQuiet = call.quiet;
-  writer.relativeTo = call.relativeTo;
-  writer.withColour = WantsColour(call.color, STDERR_FILENO);
+Session::Session(const Request& request) {
+  isQuiet = request.Has("--quiet");
+  writer.relativeTo = request.Value("--relative-to");
+  writer.withColour = WantsColour(request.Value("--color"), STDERR_FILENO);
   writer.withRelated = true;
   writer.withHelp = ::isatty(STDERR_FILENO) != 0;
   Port_MsgManData::setHandler([this](const Port_Message& message) { TakeMessage(message, log); });
-  if (!call.withTraces || isQuiet) return;
+  if (!request.Has("--trace") || isQuiet) return;
   Tarvo::DebugMessengerFactory::GetLogger("BaseIP")->SetSink(
       [](const Tarvo::StringBase& text) { std::cerr << Wrapped("trace: ", Text(text)); });
 }

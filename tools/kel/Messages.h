@@ -3,7 +3,7 @@
 
 #include <string>
 
-#include "Call.h"
+#include "Request.h"
 #include "Tarvo_KelDiagnostic.h"
 
 // What the command says beside its answer, on standard error. What the library finds wrong in a
@@ -15,7 +15,7 @@ namespace Messages {
 // One that comes with none only follows from what was shown.
 class Session {
  public:
-  explicit Session(const Call& call);
+  explicit Session(const Request& request);
   ~Session();
   Session(const Session&) = delete;
   Session& operator=(const Session&) = delete;

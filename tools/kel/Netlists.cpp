@@ -1,5 +1,5 @@
 #include "Text.h"
-#include "Verbs.h"
+#include "Verb.h"
 
 namespace {
 
@@ -25,7 +25,7 @@ Table::Row TableRow(const char* mark, const Tarvo::StringList& texts, const std:
   return fields;
 }
 
-Status AnswerTable(const KelIP& ip, bool asJson) {
+Status AnswerTable(const KelIP& ip, const Request& request) {
   KelNetlistTable netlists;
   if (!Ask(ip, &KelIP::GetNetlistTable, "netlists", netlists)) return StatusFindings;
   Table table;
@@ -40,23 +40,22 @@ Status AnswerTable(const KelIP& ip, bool asJson) {
     rows.push_back({{"values", Texts(row.values)}, {"netlists", paths}, {"applies", row.applies}});
   }
   const Json parameters = Texts(netlists.parameters);
-  WriteAnswer(table, {{"key", Text(ip.GetKey())}, {"parameters", parameters}, {"rows", rows}},
-              asJson);
+  WriteAnswer(request, {{"key", Text(ip.GetKey())}, {"parameters", parameters}, {"rows", rows}},
+              table);
   return StatusClean;
 }
 
-Status AnswerList(const KelIP& ip, bool asJson) {
+Status AnswerList(const KelIP& ip, const Request& request) {
   Tarvo::StringList paths;
   if (!Ask(ip, &KelIP::ListNetlists, "netlists", paths)) return StatusFindings;
-  Table table;
   Json netlists = Json::array();
   for (const Tarvo::StringBase& path : paths) {
-    table.Add({Text(path)});
     Tarvo::StringBase library;
     ip.GetNetlistProperty(path, KelIP::KEL_NETLIST_LIBRARY_PROPERTY, library);
     netlists.push_back({{"path", Text(path)}, {"library", Text(library)}});
   }
-  WriteAnswer(table, {{"key", Text(ip.GetKey())}, {"netlists", netlists}}, asJson);
+  WriteAnswer(request, {{"key", Text(ip.GetKey())}, {"netlists", netlists}},
+              TableOf(netlists, {"path"}));
   Tarvo::StringList libraries;
   const bool hasTable = ip.ListNetlistLibraries(libraries);
   if (paths.empty() && hasTable) {
@@ -65,12 +64,33 @@ Status AnswerList(const KelIP& ip, bool asJson) {
   return StatusClean;
 }
 
-}  // namespace
-
 // Netlists for other values than those that were asked for would be a wrong answer, so there are
 // none if a parameter is unknown.
-Status Netlists(const Tarvo::KelLibrary& library, const Call& call) {
-  const std::unique_ptr<KelIP> ip = OpenCore(library, call);
-  if (!ip || !SetParameters(*ip, call.settings)) return StatusFindings;
-  return call.wholeTable ? AnswerTable(*ip, call.asJson) : AnswerList(*ip, call.asJson);
+Status Netlists(const Tarvo::KelLibrary& library, const Request& request) {
+  const std::unique_ptr<KelIP> ip = OpenCore(library, request);
+  if (!ip || !SetParameters(*ip, request.Values("--set"))) return StatusFindings;
+  return request.Has("--table") ? AnswerTable(*ip, request) : AnswerList(*ip, request);
+}
+
+std::string SettingFault(const std::string& setting) {
+  const std::size_t equals = setting.find('=');
+  const bool isGood = equals != std::string::npos && equals > 0;
+  return isGood ? "" : "'" + setting + "' is not NAME=VALUE";
+}
+
+}  // namespace
+
+Verb DescribeNetlists() {
+  return {.name = "netlists",
+          .help = "Lists the netlists of a core that apply",
+          .words = {KeyWord(),
+                    {.name = "--set",
+                     .value = "NAME=VALUE",
+                     .help = "Sets a parameter first; may be repeated",
+                     .isRepeated = true,
+                     .fault = SettingFault},
+                    {.name = "--table",
+                     .help = "List all of them with their values; * marks those that apply"}},
+          .example = "netlists crc_unit --set WIDTH=16 --set MODE=FAST",
+          .answer = Netlists};
 }

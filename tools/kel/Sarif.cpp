@@ -4,8 +4,6 @@
 #include <cstdint>
 #include <map>
 
-#include "Cells.h"
-#include "Codes.h"
 #include "Diagnostics.h"
 #include "Tarvo_Version.h"
 #include "Text.h"

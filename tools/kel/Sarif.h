@@ -4,7 +4,7 @@
 #include <string>
 #include <vector>
 
-#include "Json.h"
+#include "Answer.h"
 #include "Tarvo_KelDiagnostic.h"
 
 // Diagnostics as a SARIF 2.1.0 log of one run, with all codes as its rules. Files below the

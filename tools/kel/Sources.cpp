@@ -4,7 +4,7 @@
 #include "Tarvo_KelIP.h"
 #include "Tarvo_LDXParser.h"
 #include "Text.h"
-#include "Verbs.h"
+#include "Verb.h"
 
 namespace {
 
@@ -22,26 +22,48 @@ std::string Language(const StringBase& language) {
   return "";
 }
 
-}  // namespace
-
-Status Sources(const Tarvo::KelLibrary& library, const Call& call) {
-  const std::unique_ptr<KelIP> ip = OpenCore(library, call);
+Status Sources(const Tarvo::KelLibrary& library, const Request& request) {
+  const std::unique_ptr<KelIP> ip = OpenCore(library, request);
   if (!ip) return StatusFindings;
+  const std::string purpose = request.Value("--for");
+  const std::string base = request.Value("--relative-to");
   const auto question =
-      call.purpose == "simulation" ? &KelIP::GetSimulationSources : &KelIP::GetSynthesisSources;
+      purpose == "simulation" ? &KelIP::GetSimulationSources : &KelIP::GetSynthesisSources;
   std::vector<KelSource> sources;
   if (!Ask(*ip, question, "sources", sources)) return StatusFindings;
   std::vector<KelIncludeDirectory> directories;
   if (!sources.empty()) ip->GetVerilogIncludeDirectories(directories);
-  SourceList list = {Text(ip->GetKey()), call.purpose, {}, {}};
+  SourceList list = {Text(ip->GetKey()), purpose, {}, {}};
   for (const KelSource& source : sources) {
-    list.sources.push_back({RelativeTo(call.relativeTo, source.path), Text(source.library.GetKey()),
-                            Language(source.language)});
+    list.sources.push_back(
+        {RelativeTo(base, source.path), Text(source.library.GetKey()), Language(source.language)});
   }
   for (const KelIncludeDirectory& directory : directories) {
-    list.includeDirectories.push_back(
-        {RelativeTo(call.relativeTo, directory.path), Text(directory.path)});
+    list.includeDirectories.push_back({RelativeTo(base, directory.path), Text(directory.path)});
   }
-  WriteSources(list, call.asJson ? "json" : call.format.empty() ? "list" : call.format);
+  WriteSources(list, request.Value("--format"));
   return StatusClean;
+}
+
+Choices Purposes() { return {{"synthesis"}, {"simulation"}}; }
+
+}  // namespace
+
+Verb DescribeSources() {
+  return {.name = "sources",
+          .help = "Lists the HDL sources of a core in analyse order",
+          .words = {KeyWord(),
+                    {.name = "--for",
+                     .value = "PURPOSE",
+                     .help = "What the sources are for",
+                     .isRequired = true,
+                     .choices = Purposes},
+                    {.name = "--format",
+                     .value = "FORMAT",
+                     .help = "How the sources are written",
+                     .byDefault = "list",
+                     .choices = SourceFormats},
+                    RelativeToWord()},
+          .example = "sources event_station --for simulation --format ghdl",
+          .answer = Sources};
 }

@@ -1,6 +1,6 @@
-#include "Nearby.h"
+#include "Suggestions.h"
 #include "Text.h"
-#include "Verbs.h"
+#include "Verb.h"
 
 namespace {
 
@@ -11,30 +11,32 @@ StringBase Resolve(const Tarvo::KelLibrary& library, const StringBase& text) {
   return key.IsValid() ? key.GetKey() : library.GetLatestIPKey(text);
 }
 
-}  // namespace
-
 // The location is asked for first: one message for an unknown key is enough.
-Status Which(const Tarvo::KelLibrary& library, const Call& call) {
-  Table table;
+Status Which(const Tarvo::KelLibrary& library, const Request& request) {
   Json cores = Json::array();
-  for (const std::string& asked : call.keys) {
+  for (const std::string& asked : request.Values("KEY")) {
     const StringBase text = asked.c_str();
     const std::string location = Text(library.GetLocation(text));
     if (location.empty()) {
       SuggestKeys(library, asked);
       continue;
     }
-    const std::string key = Text(Resolve(library, text));
-    const std::string name = Text(library.GetName(text));
-    const std::string version = Text(library.GetVersion(text));
-    table.Add({key, name, version, location});
     cores.push_back({{"asked", asked},
-                     {"key", key},
-                     {"name", name},
-                     {"version", version},
+                     {"key", Text(Resolve(library, text))},
+                     {"name", Text(library.GetName(text))},
+                     {"version", Text(library.GetVersion(text))},
                      {"location", location}});
   }
-  const bool foundAll = cores.size() == call.keys.size();
-  WriteAnswer(table, {{"cores", cores}}, call.asJson);
-  return foundAll ? StatusClean : StatusFindings;
+  WriteAnswer(request, {{"cores", cores}}, TableOf(cores, {"key", "name", "version", "location"}));
+  return cores.size() == request.Values("KEY").size() ? StatusClean : StatusFindings;
+}
+
+}  // namespace
+
+Verb DescribeWhich() {
+  return {.name = "which",
+          .help = "Tells key, name, version and location of each core",
+          .words = {Repeated(KeyWord())},
+          .example = "which word_fifo pulse_counter_v1_00_a",
+          .answer = Which};
 }

@@ -3,49 +3,34 @@
 #include <poll.h>
 #include <unistd.h>
 
+#include <algorithm>
 #include <clocale>
 #include <csignal>
 #include <exception>
 #include <iostream>
-#include <map>
-#include <sstream>
 
 #include "Arguments.h"
 #include "Messages.h"
-#include "Nearby.h"
+#include "Suggestions.h"
 #include "Tarvo_Kel_Index.h"
 #include "Text.h"
-#include "Verbs.h"
-
-std::vector<std::string> Repositories(const Call& call) {
-  std::vector<std::string> repositories;
-  for (const std::string& path : call.libraries) {
-    std::istringstream pieces(path);
-    for (std::string piece; std::getline(pieces, piece, ';');) {
-      if (!piece.empty()) repositories.push_back(piece);
-    }
-  }
-  return repositories;
-}
 
 namespace {
 
-using Verb = Status (*)(const Tarvo::KelLibrary&, const Call&);
-const std::map<std::string, Verb> kVerbs = {
-    {"list", List}, {"which", Which}, {"show", Show}, {"sources", Sources}, {"netlists", Netlists}};
-
-// Answers from whatever could be read: what could not has its message, and shows in the status,
-// unless it is another core than those that are asked for.
-Status Run(const Call& call) {
-  const Messages::Session session(call);
+// Answers from whatever could be read: what could not has its message, and shows in the status.
+Status Run(const Request& request) {
+  const Messages::Session session(request);
+  const Verb& verb = *FindVerb(request.verb);
   Tarvo::KelLibrary library;
-  if (call.verb == "check") return Check(library, call);
-  if (!library.SetRepositoryPath(Join(Repositories(call), ";").c_str())) {
-    SuggestRepositories(call);
+  if (verb.reads == Verb::Nothing || verb.reads == Verb::ItsOwn) {
+    return verb.answer(library, request);
+  }
+  if (!library.SetRepositoryPath(Join(Repositories(request), ";").c_str())) {
+    SuggestRepositories(request);
     if (library.GetIndex().GetFullIPCount() == 0) return StatusUnreadable;
   }
-  const int walkErrors = call.verb == "list" ? 0 : Messages::ErrorCount();
-  const Status status = kVerbs.at(call.verb)(library, call);
+  const int walkErrors = verb.reads == Verb::All ? 0 : Messages::ErrorCount();
+  const Status status = verb.answer(library, request);
   return Messages::ErrorCount() == walkErrors ? status : StatusFindings;
 }
 
@@ -60,9 +45,11 @@ bool IsClosedPipe() {
 int main(int argc, char** argv) try {
   if (std::signal(SIGPIPE, SIG_IGN) == SIG_ERR) return StatusFindings;
   static_cast<void>(std::setlocale(LC_CTYPE, "C.UTF-8"));  // for the width of characters
+  const std::vector<std::string> words(argv + std::min(argc, 1), argv + argc);
+  if (!words.empty() && words.front() == "__complete") return Complete(words);
   Status status = StatusClean;
-  const std::optional<Call> call = ReadCall(argc, argv, status);
-  if (call) status = Run(*call);
+  const std::optional<Request> request = ReadRequest(words, status);
+  if (request) status = Run(*request);
   if (std::cout.flush() || IsClosedPipe()) return status;
   std::cerr << "kel: error: Unable to write to standard output\n";
   return StatusFindings;

@@ -1,4 +1,4 @@
-#include "Nearby.h"
+#include "Suggestions.h"
 
 #include <filesystem>
 #include <set>
@@ -7,7 +7,7 @@
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
 #include "Text.h"
-#include "Verbs.h"
+#include "Verb.h"
 
 namespace {
 
@@ -78,8 +78,8 @@ void SuggestKeys(const Tarvo::KelLibrary& library, const std::string& key) {
   }
 }
 
-void SuggestRepositories(const Call& call) {
-  for (const std::string& repository : Repositories(call)) {
+void SuggestRepositories(const Request& request) {
+  for (const std::string& repository : Repositories(request)) {
     std::error_code error;
     if (!fs::is_directory(repository, error) || IsRepository(repository)) continue;
     const auto near = RepositoriesNear(fs::absolute(repository).lexically_normal());
