@@ -1,7 +1,9 @@
 #!/usr/bin/env python3
 """Runs the examples of the documents and compares what they print with what the documents show.
 
-Usage: check-docs.py [--calls] [BUILD_DIRECTORY]    --calls: calls of the command alone, which is quick
+Usage: check-docs.py [--calls | --update] [BUILD_DIRECTORY]
+  --calls   runs calls of the command alone, which is quick
+  --update  writes into the manual page what the command's help says, and runs nothing
 
 In a `console` block a line behind "$ " is run with the built `kel` on the path, and the lines below
 it are what it must print; a line of three dots stands for the rest. A line that ends in a backslash
@@ -10,9 +12,11 @@ compiled and run as README.md says, and prints what the `text` block behind it s
 first line is a comment with their path, make a repository, in which the document's lines are then run.
 docs/diagnostics.md has a section for each code of `kel help diagnostics`: its data files, in a repository
 of their own behind its `sh` blocks, are checked, and the lines with the code are those of its `text` block.
+The manual page has what `kel help` says, and a schema what the command may write.
 The project's directory is written /home/me/kel. And the headers' pages come without a warning.
 """
 
+import json
 import os
 import pathlib
 import re
@@ -135,6 +139,82 @@ def code_faults(environment):
             yield f"{name}: the example of {code} gives\n{printed}"
 
 
+def roff(text):
+    return text.replace("\\", "\\e").replace("-", "\\-").replace("'", "\\(aq")
+
+
+class Word:
+    """A word as `kel help` shows it, and the lines behind it."""
+
+    def __init__(self, label, lines):
+        words = re.sub(r"( \.\.\.)?( REQUIRED)?$", "", label).split(" ", 1)
+        self.is_option = label.startswith("-")
+        self.is_required, self.is_repeated = label.endswith(" REQUIRED"), " ..." in label
+        value, self.choices, self.default = re.fullmatch(
+            r"([A-Z=]*)(?::\{(.*)\})?(?:=(.*))?", words[1]).groups() if len(words) > 1 else ("", None, None)
+        names = [(r"\fB%s\fP" if self.is_option else r"\fI%s\fP") % roff(name) for name in words[0].split(",")]
+        self.names = ", ".join(names) + (rf" \fI{value}\fP" if value else "")
+        self.help, *self.lines = lines
+
+    def synopsis(self):
+        shown = self.names.replace(r"\fB", "").replace(r"\fP ", " ") if self.is_option else self.names
+        return (shown if self.is_required else rf"\fR[\fP{shown}\fR]\fP") + (r"\fR...\fP" * self.is_repeated)
+
+    def entry(self):
+        choices = [f"One of {', '.join(self.choices.split(','))}."] if self.choices else []
+        default = [f"Without it, {self.default}."] if self.default else []
+        lines = [".TP", self.names, f"{roff(self.help)}.", *choices, *default]
+        for name, meaning in (line.split(": ", 1) for line in self.lines):
+            lines += [".RS", ".TP", rf"\fB{roff(name)}\fP", f"{roff(meaning)}.", ".RE"]
+        return lines
+
+
+def words_of(text):
+    """The arguments and options that the help of a verb, or of the command, shows."""
+    shown = "".join(re.findall(r"^(?:Positionals|Options):\n((?:  .*\n)+)", text, re.MULTILINE))
+    for label, lines in re.findall(r"^  (\S.*?)(?:  +|\n +)(\S.*\n(?: {10}.*\n)*)", shown, re.MULTILINE):
+        yield Word(label, [line.strip() for line in lines.splitlines()])
+
+
+def manual_part(verb, environment):
+    """The lines of the manual page that follow from the help of a verb, or of the command."""
+    text = run(f"kel help {verb}", environment)
+    words = [word for word in words_of(text) if not verb or "help" not in word.names]
+    known = [r"\fIKEY\fP", r"\fIGLOB\fP"]  # which the page's description explains
+    lines = [line for word in words if word.names not in known for line in word.entry()]
+    if verb:
+        synopsis = " ".join([verb, *(word.synopsis() for word in words)])
+        lines = [f".SS {synopsis}", f"{roff(text.splitlines()[0])}.", *lines]
+    return "".join(f"{line}\n" for line in lines)
+
+
+def with_help(page, environment):
+    """The manual page with what the command's help says of each verb and option."""
+    verbs = [line.split("\t")[0] for line in run("kel __complete ''", environment).splitlines()]
+    for verb in [*verbs, ""]:
+        begin = f'.\\" From `{f"kel help {verb}".strip()}`:\n'
+        if begin not in page:
+            page = page.replace(".SH GLOBAL OPTIONS\n", f'{begin}.\\" End.\n.SH GLOBAL OPTIONS\n')
+        before, rest = page.split(begin)
+        page = before + begin + manual_part(verb, environment) + rest[rest.index('.\\" End.\n'):]
+    return page
+
+
+def help_faults(environment):
+    """What is written down about the command, and follows from its rows."""
+    page = (ROOT / "docs/kel.1").read_text()
+    if page != with_help(page, environment):
+        yield "docs/kel.1: differs from the command's help; scripts/check-docs.py --update writes it"
+    for schema in sorted((ROOT / "docs").glob("*.schema.json")):
+        document = json.loads(schema.read_text())
+        verb, form = re.match(r"kel (\w+) --format (\w+)", document["title"]).groups()
+        if f"--format={form}" not in run(f"kel __complete {verb} --format={form}", environment).split():
+            yield f"{schema.name}: kel {verb} has no format {form}"
+        purposes = document["properties"].get("purpose", {"enum": []})["enum"]
+        if purposes and purposes != run("kel __complete sources --for ''", environment).split():
+            yield f"{schema.name}: these are not the purposes of kel sources: {purposes}"
+
+
 def page_faults(environment):
     """The pages of the headers, without a warning."""
     printed = run("mkdir -p build && doxygen docs/Doxyfile", environment)
@@ -154,11 +234,14 @@ def program_and_page_faults(build, environment):
 
 
 def main():
-    words = [word for word in sys.argv[1:] if word != "--calls"]
+    words = [word for word in sys.argv[1:] if not word.startswith("--")]
     build = words[0] if words else "build/gcc-release"
     environment = dict(os.environ, PATH=f"{ROOT / build / 'bin'}:{os.environ['PATH']}")
+    if "--update" in sys.argv:
+        page = ROOT / "docs/kel.1"
+        return page.write_text(with_help(page.read_text(), environment)) * 0
     faults = [fault for name in DOCUMENTS for fault in document_faults(name, environment)]
-    faults += code_faults(environment)
+    faults += [*code_faults(environment), *help_faults(environment)]
     if "--calls" not in sys.argv:
         faults += program_and_page_faults(build, environment)
     print("\n".join(faults) or "The documents' examples print what they show")

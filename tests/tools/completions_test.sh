@@ -55,7 +55,7 @@ kel sources --relative-to examples/o|examples/overlay
 kel netlists --set A = |
 kel --color a|auto always
 kel netlists --t|--trace --table
-kel list --v|
+kel list --v|--version
 EOT
 # A name of a directory is never run.
 differs "a name with a call" "" "$(offer kel -L '$(touch /dev/full)' show '')"
