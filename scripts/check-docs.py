@@ -6,8 +6,8 @@ Usage: check-docs.py [--calls | --update] [BUILD_DIRECTORY]
   --update  writes into the manual page what the command's help says, and runs nothing
 
 In a `console` block a line behind "$ " is run with the built `kel` on the path, and the lines below
-it are what it must print; a line of three dots stands for the rest. A line that ends in a backslash
-goes on in the next. In a manual page the blocks are those between .EX and .EE. Each `cpp` block is
+it are what it must print, standard error last; a line of three dots stands for any lines. A line that ends
+in a backslash goes on in the next. In tests/transcripts an exit status other than 0 stands below, as [1]. In a manual page the blocks are those between .EX and .EE. Each `cpp` block is
 compiled and run as README.md says, and prints what the `text` block behind it shows. Data files, whose
 first line is a comment with their path, make a repository, in which the document's lines are then run.
 docs/diagnostics.md has a section for each code of `kel help diagnostics`: its data files, in a repository
@@ -26,6 +26,7 @@ import tempfile
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
 DOCUMENTS = ["README.md", "docs/guide.md", "docs/formats.md", "docs/kel.1"]
+TRANSCRIPTS = sorted(str(path.relative_to(ROOT)) for path in ROOT.glob("tests/transcripts/*.md"))
 SHOWN_ROOT = "/home/me/kel"
 
 
@@ -44,16 +45,17 @@ def manual_blocks(text):
         yield re.sub(r"\\(\(..|.)", lambda escape: ESCAPES[escape.group(1)], lines)
 
 
-def run(command, environment, directory=ROOT):
+def run(command, environment, directory=ROOT, tells_status=False):
     done = subprocess.run(["bash", "-c", command], cwd=directory, env=environment,
                           capture_output=True, text=True)
-    return (done.stdout + done.stderr).replace(str(ROOT), SHOWN_ROOT)
+    status = f"[{done.returncode}]\n" if tells_status and done.returncode else ""
+    printed = done.stdout + done.stderr + status
+    return printed.replace(str(directory), SHOWN_ROOT).replace(str(ROOT), SHOWN_ROOT)
 
 
 def matches(expected, printed):
-    if expected.endswith("...\n"):
-        return printed.startswith(expected.removesuffix("...\n"))
-    return printed == expected
+    begin, dots, end = expected.rpartition("...\n")
+    return printed.startswith(begin) and printed.endswith(end) if dots else printed == expected
 
 
 def console_faults(name, text, environment, directory):
@@ -61,7 +63,7 @@ def console_faults(name, text, environment, directory):
     for block in found:
         for command, expected in re.findall(r"^\$ ((?:.*\\\n)*.*)\n((?:(?!\$ ).*\n)*)", block,
                                             re.MULTILINE):
-            printed = run(command, environment, directory)
+            printed = run(command, environment, directory, name in TRANSCRIPTS)
             if not matches(expected, printed):
                 yield f"{name}: $ {command}\nprints\n{printed}"
 
@@ -109,7 +111,7 @@ def document_faults(name, environment):
     with tempfile.TemporaryDirectory() as scratch:
         write_files(text, pathlib.Path(scratch))
         shows_files = any(pathlib.Path(scratch).iterdir())
-        if shows_files:
+        if shows_files and name in DOCUMENTS:
             # All is well but for the sources and netlists, which a document doesn't hold.
             findings = run("kel -L . check", environment, scratch).splitlines()[:-1]
             bad = [finding for finding in findings if not re.search(r"\[missing-(source|netlist)\]", finding)]
@@ -134,7 +136,6 @@ def code_faults(environment):
             write_files(text, pathlib.Path(scratch))
             found = run("kel -L . check --relative-to .", environment, scratch).splitlines()
             printed += "".join(f"{line}\n" for line in found if f"[{code}]: " in line)
-            printed = printed.replace(scratch, SHOWN_ROOT)
         if [printed] != blocks(text, "text"):
             yield f"{name}: the example of {code} gives\n{printed}"
 
@@ -240,7 +241,7 @@ def main():
     if "--update" in sys.argv:
         page = ROOT / "docs/kel.1"
         return page.write_text(with_help(page.read_text(), environment)) * 0
-    faults = [fault for name in DOCUMENTS for fault in document_faults(name, environment)]
+    faults = [fault for name in DOCUMENTS + TRANSCRIPTS for fault in document_faults(name, environment)]
     faults += [*code_faults(environment), *help_faults(environment)]
     if "--calls" not in sys.argv:
         faults += program_and_page_faults(build, environment)
