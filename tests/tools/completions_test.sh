@@ -1,5 +1,7 @@
 #!/usr/bin/env bash
-# Checks what the shell completions of kel offer. Usage: completions_test.sh KEL
+# Checks what the shells make of a line and of the answer of `kel __complete`, which itself is seen in
+# tests/transcripts/completions.md. zsh and fish are tried if they are there.
+# Usage: completions_test.sh KEL
 set -uo pipefail
 [ $# -eq 1 ] || { echo "usage: $0 KEL" >&2; exit 2; }
 kel=$(realpath "$1")
@@ -7,6 +9,7 @@ cd "$(dirname "$0")/../.."
 folder=tools/kel/completions
 # shellcheck source=/dev/null
 source $folder/kel.bash
+export PATH="${kel%/*}:$PATH" HOME=$PWD repository=$PWD/examples/repository line
 
 failures=0
 differs() {  # WHAT EXPECTED GOT
@@ -15,59 +18,58 @@ differs() {  # WHAT EXPECTED GOT
   failures=$((failures + 1))
 }
 
-# The candidates for the last of these words, between blanks.
-offer() {
-  COMP_WORDS=("$@")
-  COMP_CWORD=$(($# - 1))
+# What each shell offers for the last word of $line, sorted. zsh's own operations are stood in for.
+in_bash() {  # the words as Readline splits them, but quotes
+  local -a split
+  read -ra split <<<"${line//=/ = }."
+  split[-1]=${split[-1]%.}
+  COMP_WORDS=("${split[@]}")
+  COMP_CWORD=$((${#split[@]} - 1))
   _kel "$kel"
-  echo "${COMPREPLY[*]}"
+  printf '%s\n' "${COMPREPLY[@]}"
 }
+in_zsh() {
+  # shellcheck disable=SC2016
+  zsh -fc 'words=(${=line%.}) PREFIX=
+    [[ $line == *" " ]] || PREFIX=$words[-1] words[-1]=()
+    words+=("$PREFIX") CURRENT=$#words
+    _describe() { print -rl -- ${candidates%%:*} }
+    compset() { lead=$2 PREFIX=${PREFIX#$2} }
+    _files() { local -a found=(${~PREFIX}*(/)); print -rl -- $lead$^found }
+    source '$folder/_kel
+}
+in_fish() { fish --no-config -c "source $folder/kel.fish; complete -C \$line" | sed 's/\t.*//; s:/$::'; }
 
-pulse="pulse_counter pulse_counter_v2_00_a pulse_counter_v1_01_b pulse_counter_v1_00_a"
-repository=$PWD/examples/repository
-# Words, in front of the candidates. The words of a row stand as Readline splits them.
-while IFS='|' read -r words expected; do
-  [[ $words == *' ' ]] && words+="''"
-  eval "split=($words)"
-  differs "$words" "$expected" "$(offer "${split[@]}")"
+pulse="pulse_counter pulse_counter_v1_00_a pulse_counter_v1_01_b pulse_counter_v2_00_a"
+# A line, the candidates, and those of bash if they differ, where a word begins anew behind '='.
+while IFS='|' read -r line expected anew; do
+  for shell in bash zsh fish; do
+    command -v $shell >/dev/null || continue
+    [ $shell != bash ] || wanted=${anew:-$expected}
+    differs "$shell: $line" "$wanted" "$("in_$shell" | LC_ALL=C sort | xargs)"
+    wanted=$expected
+  done
 done <<EOT
-kel s|show sources
-kel help ne|netlists
-kel help list|list list-ends
-kel check -W no-missing-s|no-missing-source
-kel check --format = |text json sarif
-kel check --e|--excerpts
+kel net|netlists
+kel sources --format=vh|--format=vhdl_ls|vhdl_ls
+kel netlists x --set A=|
 kel -L examples/rep|examples/repository
-kel --library = examples/o|examples/overlay
+kel --library=examples/o|--library=examples/overlay|examples/overlay
+kel check -Lexamples/o|-Lexamples/overlay
 kel -L examples/repository show pul|$pulse
-kel --library = examples/repository which x tone_|tone_gen tone_gen_v1_00_a
-kel -L '"$repository"' list pul|$pulse
-kel -L '\$repository' check pul|$pulse
+kel --library=examples/repository show pul|$pulse
+kel -L ~/examples/repository list pul|$pulse
+kel -L \$repository check pul|$pulse
+kel -L "\${repository}/." check pul|$pulse
 kel -L 'examples/overlay;examples/repository' sources pul|$pulse
-kel -L examples/overlay show pul|pulse_counter pulse_counter_v2_00_a
-kel -L nowhere show pul|
 kel show pul|
-kel -L examples/repository show tone_gen tone|
-kel show --section p|place parameters ports
-kel sources --format = |list json f ghdl edam vhdl_ls tcl
-kel sources x --for s|synthesis simulation
-kel sources --relative-to examples/o|examples/overlay
-kel netlists --set A = |
-kel --color a|auto always
-kel netlists --t|--trace --table
-kel list --v|--version
 EOT
-# A name of a directory is never run.
-differs "a name with a call" "" "$(offer kel -L '$(touch /dev/full)' show '')"
-
-if command -v zsh >/dev/null; then
-  differs "zsh -n" "" "$(zsh -n $folder/_kel 2>&1)"
-fi
-if command -v fish >/dev/null; then
-  differs "fish -n" "" "$(fish -n $folder/kel.fish 2>&1)"
-  keys=$(PATH="$(dirname "$kel"):$PATH" fish --no-config -c "source $folder/kel.fish
-    complete -C 'kel -L examples/repository show pul'" | sort | tr '\n' ' ')
-  differs "fish" "$(tr ' ' '\n' <<<"$pulse" | sort | tr '\n' ' ')" "$keys"
-fi
+# What a name would do if it were run can't be seen above.
+marker=$(mktemp -u)
+line="kel -L \$(touch\${IFS}$marker) -L \`touch\${IFS}$marker\` show "
+for shell in bash zsh fish; do
+  ! command -v $shell >/dev/null || "in_$shell" >/dev/null
+  differs "$shell runs a name" "" "$(ls "$marker" 2>/dev/null)"
+done
 [ $failures -eq 0 ] && echo "The completions offer what they should"
 exit $((failures > 0))
