@@ -7,9 +7,7 @@
 #include <iostream>
 #include <tuple>
 
-#include "Answer.h"
 #include "Diagnostics.h"
-#include "Messages.h"
 #include "Sarif.h"
 #include "Suggestions.h"
 #include "Tarvo_KelChecker.h"

@@ -34,15 +34,10 @@ using List = bool (KelIP::*)(StringList&) const;
 using ListOf = bool (KelIP::*)(const StringBase&, StringList&) const;
 using Get = bool (KelIP::*)(const StringBase&, const StringBase&, StringBase&) const;
 
-StringList Ask(const KelIP& ip, List list) {
+template <class Question, class... Record>
+StringList Ask(const KelIP& ip, Question question, const Record&... record) {
   StringList names;
-  (ip.*list)(names);
-  return names;
-}
-
-StringList Ask(const KelIP& ip, ListOf list, const StringBase& record) {
-  StringList names;
-  (ip.*list)(record, names);
+  (ip.*question)(record..., names);
   return names;
 }
 

@@ -1,10 +1,7 @@
-#include <memory>
 
 #include "Formats.h"
-#include "Tarvo_KelIP.h"
 #include "Tarvo_LDXParser.h"
 #include "Text.h"
-#include "Verb.h"
 
 namespace {
 

@@ -3,7 +3,6 @@
 #include <filesystem>
 #include <set>
 
-#include "Messages.h"
 #include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
 #include "Text.h"

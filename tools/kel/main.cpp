@@ -10,7 +10,6 @@
 #include <iostream>
 
 #include "Arguments.h"
-#include "Messages.h"
 #include "Suggestions.h"
 #include "Tarvo_Kel_Index.h"
 #include "Text.h"
