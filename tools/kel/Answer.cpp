@@ -15,6 +15,7 @@ std::string Field(const Json& value) {
 }
 
 std::string Field(const Json& record, const std::string& name) {
+  // DESC is a property like any other, but the one that tables show.
   const bool isProperty = name == "description" && record.contains("properties");
   if (isProperty) return record["properties"].value("DESC", std::string());
   const Json& value = record[name];
@@ -43,6 +44,8 @@ std::vector<std::size_t> Table::Widths() const {
 
 // The last field of a row needs nothing behind it.
 void Table::Write(std::ostream& output) const {
+  // Only a terminal wants columns: scripts cut at tabs, and need not know all rows before the
+  // first.
   const bool aligned = ::isatty(STDOUT_FILENO) != 0;
   const std::vector<std::size_t> widths = aligned ? Widths() : std::vector<std::size_t>();
   for (const Row& row : rows) {
@@ -65,6 +68,7 @@ void WriteDocument(std::ostream& output, const Json& document) {
 }
 
 void WriteJson(const Json& members, std::ostream& output) {
+  // Raised when a member goes or changes its meaning, not when one comes.
   constexpr int formatVersion = 1;
   Json document = {{"format_version", formatVersion}};
   document.update(members);

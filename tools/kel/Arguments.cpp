@@ -18,6 +18,7 @@ const char* const kFooter =
 
 Choices Colors() { return {{"auto"}, {"always"}, {"never"}}; }
 
+// Arguments with choices are topics of help, which have errors of their own.
 bool IsClosed(const Word& word) {
   return word.choices != nullptr && word.fault == nullptr && word.IsOption();
 }
@@ -50,6 +51,7 @@ void AddValued(CLI::App& app, const Word& word) {
   CLI::Option* const option = app.add_option(NamesFor(word), std::as_const(help));
   option->type_name(value)->required(word.isRequired)->default_str(word.byDefault);
   if (word.isRepeated) option->expected(1, CLI::detail::expected_max_vector_size);
+  // Without this, an option that may be repeated would take all words behind it.
   option->allow_extra_args(word.isRepeated && !word.IsOption());
   option->check([&word](const std::string& given) { return FaultOf(word, given); });
 }
@@ -102,6 +104,7 @@ std::string Fault(const CLI::App& app, const Request& request) {
   if (verb == nullptr && !extras.empty() && !extras.front().starts_with('-')) {
     return NoVerb(extras.front());
   }
+  // Behind a verb, or an option that nobody knows.
   if (!extras.empty()) return "unexpected argument '" + extras.front() + "'";
   if (verb == nullptr) return "a verb is required: " + Join(NamesOf(ChoicesOf(Verbs())));
   const std::string format = request.Value("--format");
@@ -139,6 +142,7 @@ std::vector<std::string> Given(const CLI::App& app, const Word& word, const Requ
 
 // The verb is known also if the words are wrong behind it.
 Request MakeRequest(const CLI::App& app) {
+  // Each word of each verb has its place, so that common code may ask for it.
   Request request;
   for (const Verb& verb : Verbs()) {
     for (const Word& word : verb.words) request.given[word.name];

@@ -55,6 +55,7 @@ class Progress {
 
   void Step(std::size_t done, std::size_t total) {
     const auto now = std::chrono::steady_clock::now();
+    // Twice a second is enough for people, and costs nothing beside a core.
     if (!shown || now - last < std::chrono::milliseconds(500)) return;
     last = now;
     written = true;
@@ -71,7 +72,9 @@ class Progress {
 bool IsLeftOut(const StringBase& file, const std::vector<std::string>& globs) {
   for (fs::path path = Text(file); path.has_relative_path(); path = path.parent_path()) {
     const Kel_Key key(StringBase(path.filename().c_str()));
-    if (path.parent_path().filename() == "ipmods" && key.IsValid()) return !MatchesAny(key, globs);
+    const bool isVersion =
+        path.parent_path().filename() == Tarvo::Kel_Index::KEL_VERSIONS_SUBDIRECTORY.GetText();
+    if (isVersion && key.IsValid()) return !MatchesAny(key, globs);
   }
   return false;
 }
@@ -80,10 +83,13 @@ bool IsLeftOut(const StringBase& file, const std::vector<std::string>& globs) {
 Diagnostics Walk(Tarvo::KelLibrary& library, const Request& request) {
   std::vector<std::string> paths;
   for (const std::string& repository : Repositories(request)) {
+    // Findings come from the walk and from the checker; one way of writing paths lets them be
+    // sorted.
     paths.push_back(fs::absolute(repository).lexically_normal());
   }
   const Tarvo::KelDiagnosticLog log;
   library.SetRepositoryPath(Join(paths, ";").c_str());
+  // The checker tells of bad descriptions by itself, with all of their faults.
   Diagnostics found = log.Take();
   std::erase_if(found, [&](const KelDiagnostic& one) {
     return one.place.file.GetLength() > 0 &&
@@ -118,6 +124,7 @@ void Sort(Diagnostics& found) {
 void Judge(Diagnostics& found, const std::vector<std::string>& choices) {
   for (const std::string& choice : choices) {
     std::erase_if(found, [&](const auto& one) { return "no-" + Text(one.code) == choice; });
+    // The last choice does not win: leaving out and raising are two questions.
     for (KelDiagnostic& one : found) {
       const bool counts = choice == "error" && one.severity == KelDiagnostic::Warning;
       if (counts) one.severity = KelDiagnostic::Error;
@@ -213,6 +220,7 @@ Status Check(const Tarvo::KelLibrary& /*unread*/, const Request& request) {
     SuggestRepositories(request);
     return StatusUnreadable;
   }
+  // What the walk found is about repositories, and may be what is to be suggested about.
   const bool isComplete = found.empty();
   const StringList keys = Keys(library, globs);
   const Diagnostics checked = CheckAll(library, request, keys);

@@ -6,6 +6,7 @@
 
 namespace {
 
+// Stands for all directories, which shells list better.
 const char* const kDirectory = ":directory";
 
 using Words = std::vector<const Word*>;
@@ -44,6 +45,7 @@ Opening FindOption(const Words& options, const std::string& text) {
 Choices Keys(const std::vector<std::string>& repositories) {
   Choices choices;
   if (repositories.empty()) return choices;
+  // Bad descriptions must not write between the words of a command line.
   Port_MsgManData::setHandler([](const Port_Message&) {});
   Tarvo::KelLibrary library;
   library.SetRepositoryPath(Join(repositories, ";").c_str());
@@ -103,6 +105,8 @@ Status Complete(const std::vector<std::string>& words) try {
   const Words options = OptionsOf(request);
   const Opening open = before.empty() ? Opening() : FindOption(options, before.back());
   const Opening own = FindOption(options, text);
+  // Behind an option its value, within an option with "=" its value too, and else an option or an
+  // argument.
   if (open.option != nullptr && open.lead.empty()) {
     Write(ValuesOf(*open.option, request), "", text);
   } else if (!own.lead.empty()) {

@@ -30,6 +30,7 @@ std::optional<std::string_view> FileLines::Find(const KelPlace& place) {
     lines.clear();
     std::ifstream stream(file, std::ios::binary);
     for (std::string line; std::getline(stream, line);) lines.push_back(line);
+    // A byte order mark counts for no column.
     const bool isMarked = !lines.empty() && lines[0].starts_with("\xEF\xBB\xBF");
     if (isMarked) lines[0].erase(0, 3);
   }
@@ -66,6 +67,7 @@ std::string DiagnosticWriter::Related(const KelRelatedPlace& related) {
   const std::string where = Where(related.place);
   const std::string note = withColour ? Coloured("note: ", KelDiagnostic::Note) : "note: ";
   std::string text = Printable(related.text.View());
+  // So that a line begins as compilers write such notes.
   const bool isFrom = text.ends_with(" from here");
   if (isFrom) text.replace(text.size() - 4, 4, where);
   const std::string excerpt = related.place.column > 0 ? Shown(related.place) : "";
@@ -94,6 +96,7 @@ std::string Coloured(const std::string& words, KelDiagnostic::Severity severity)
 
 bool WantsColour(const std::string& choice, int descriptor) {
   if (choice != "auto") return choice == "always";
+  // As many programs do: NO_COLOR with any text, or a terminal without colours.
   const char* const refused = std::getenv("NO_COLOR");
   const char* const terminal = std::getenv("TERM");
   const bool isRefused = refused != nullptr && *refused != 0;

@@ -15,6 +15,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
+// As `Source` writes them.
 const char* const kVhdl = "VHDL";
 const char* const kVerilog = "Verilog";
 
@@ -28,6 +29,7 @@ std::string Backslashed(const std::string& text, std::string_view special) {
   return escaped;
 }
 
+// Quotes only where they are needed, since people read these files too.
 std::string ShellWord(const std::string& text) {
   const auto isPlain = [](char c) { return IsPlain(c, "_-./,:+@%"); };
   if (!text.empty() && std::all_of(text.begin(), text.end(), isPlain)) return text;
@@ -103,6 +105,8 @@ void WriteFileList(std::ostream& output, const SourceList& list) {
   }
 }
 
+// GHDL takes VHDL alone. Each library is analysed in the order of its sources, into the current
+// directory.
 void WriteGhdl(std::ostream& output, const SourceList& list) {
   output << "#!/bin/sh\n# Analyses into the current directory; GHDL_FLAGS go to every call.\n"
             "set -e\n";
@@ -139,6 +143,7 @@ std::vector<std::string> FilesIn(const std::string& directory) {
   return files;
 }
 
+// Include files are files of their own there, so the directories are listed.
 void WriteEdam(std::ostream& output, const SourceList& list) {
   Json files = Json::array();
   for (const IncludeDirectory& directory : list.includeDirectories) {
@@ -167,6 +172,8 @@ void WriteVhdlLs(std::ostream& output, const SourceList& list) {
     open = true;
     output << "  " << TomlString(GlobLiteral(source.path)) << ",\n";
   }
+  // A library whose sources stand in two places of the order would have two lists: the order says
+  // each library once.
   if (open) output << "]\n";
 }
 
@@ -219,6 +226,7 @@ void WriteSources(const SourceList& list, const std::string& format) {
                    [&](const Format& candidate) { return candidate.name == format; });
   if (chosen == std::end(kFormats)) return;
   NoteWhatIsLeftOut(*chosen, list);
+  // A tool gets each byte of a name; a terminal must not obey one.
   if (::isatty(STDOUT_FILENO) == 0) return chosen->write(std::cout, list);
   std::stringstream lines;
   chosen->write(lines, list);

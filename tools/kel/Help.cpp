@@ -24,6 +24,7 @@ void WriteWrapped(const std::string& text) {
   std::cout << line << '\n';
 }
 
+// For one code, or for all of them.
 bool ShowCodes(const std::string& topic) {
   bool isTopic = false;
   for (const KelDiagnosticCode& code : Codes()) {

@@ -17,9 +17,11 @@ Status List(const KelLibrary& library, const Request& request) {
   Json cores = Json::array();
   StringBase core;
   std::vector<std::string> globs = request.Values("GLOB");
+  // An empty pattern is none, as it was left out by a script.
   std::erase(globs, "");
   for (const Kel_Key& key : SortedKeys(library)) {
     if (!MatchesAny(key, globs)) continue;
+    // The keys come by name, the newest first.
     const bool isNewest = key.GetName() != core;
     core = key.GetName();
     if (!isNewest && !request.Has("--all")) continue;

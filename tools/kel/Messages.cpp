@@ -20,6 +20,7 @@ using Tarvo::KelDiagnostic;
 int errorCount = 0;
 bool isQuiet = false;
 DiagnosticWriter writer;
+// An error of a repository would come again with each question to it.
 std::set<std::string> shownTexts;
 
 void ShowOnce(const std::string& text) {
@@ -44,6 +45,7 @@ void Say(KelDiagnostic::Severity severity, const std::string& text) {
 }
 
 void TakeMessage(const Port_Message& message, const Tarvo::KelDiagnosticLog& log) {
+  // Counted also when nothing is shown: the exit status tells.
   if (message.severity != Port_Message::Warning) ++errorCount;
   for (const KelDiagnostic& diagnostic : log.Take()) Show(diagnostic);
 }
@@ -54,16 +56,17 @@ Session::Session(const Request& request) {
   isQuiet = request.Has("--quiet");
   writer.relativeTo = request.Value("--relative-to");
   writer.withColour = WantsColour(request.Value("--color"), STDERR_FILENO);
+  // Pipes get the lines that lead to a place too, since messages have no other way to tell them.
   writer.withRelated = true;
   writer.withHelp = ::isatty(STDERR_FILENO) != 0;
   Port_MsgManData::setHandler([this](const Port_Message& message) { TakeMessage(message, log); });
   if (!request.Has("--trace") || isQuiet) return;
-  Tarvo::DebugMessengerFactory::GetLogger("BaseIP")->SetSink(
-      [](const Tarvo::StringBase& text) { std::cerr << Wrapped("trace: ", Text(text)); });
+  Tarvo::DebugMessengerFactory::GetLogger(Tarvo::kLoggerName)
+      ->SetSink([](const Tarvo::StringBase& text) { std::cerr << Wrapped("trace: ", Text(text)); });
 }
 
 Session::~Session() {
-  Tarvo::DebugMessengerFactory::GetLogger("BaseIP")->SetSink({});
+  Tarvo::DebugMessengerFactory::GetLogger(Tarvo::kLoggerName)->SetSink({});
   Port_MsgManData::setHandler({});
 }
 

@@ -33,6 +33,7 @@ Status AnswerTable(const KelIP& ip, const Request& request) {
   if (!netlists.rows.empty()) table.Add(TableRow("#", netlists.parameters, "netlist"));
   for (const Tarvo::KelNetlistRow& row : netlists.rows) {
     Json paths = Json::array();
+    // A line for each netlist, so that scripts need not cut lists.
     for (const Tarvo::KelNetlist& netlist : row.netlists) {
       paths.push_back(Text(netlist.path));
       table.Add(TableRow(row.applies ? "*" : "", row.values, Text(netlist.path)));

@@ -20,6 +20,7 @@ Json Message(const std::string& text) { return {{"text", text}}; }
 Json Rules() {
   Json rules = Json::array();
   for (const Tarvo::KelDiagnosticCode& code : Codes()) {
+    // All codes, found or not, so that a host can explain each.
     rules.push_back({{"id", code.code},
                      {"shortDescription", Message(code.title)},
                      {"fullDescription", Message(code.help)},
@@ -38,6 +39,7 @@ std::string Encoded(const std::string& path) {
 
 // The same number for the same bytes, in every version and on every machine.
 std::string Hash(const std::string& text) {
+  // FNV-1a: short, and known to everybody.
   std::uint64_t hash = 14695981039346656037U;
   for (const char c : text) hash = (hash ^ static_cast<unsigned char>(c)) * 1099511628211U;
   return std::to_string(hash);
@@ -80,6 +82,7 @@ class Writer {
 
   Json Location(const KelPlace& place) {
     Json physical = {{"artifactLocation", Address(place)}};
+    // A finding of a whole file has no region.
     if (place.line > 0) physical["region"] = Region(place);
     return {{"physicalLocation", physical}};
   }

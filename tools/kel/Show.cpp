@@ -23,6 +23,7 @@ using Tarvo::StringList;
 // Gives `visit` each name once.
 template <class Visit>
 void ForEachName(const StringList& names, const Visit& visit) {
+  // The library answers for the first of namesakes alone, so a second line would show it twice.
   std::set<StringBase> seen;
   for (const StringBase& name : names) {
     if (seen.insert(name).second) visit(name);
@@ -207,6 +208,7 @@ void WriteTables(const Json& core, bool withHeadings) {
   for (const Section& section : kSections) {
     if (!core.contains(section.name)) continue;
     const Json& members = core[section.name];
+    // A heading without rows helps nobody.
     if (members.empty()) continue;
     if (withHeadings) std::cout << "# " << section.name << ": " << Join(section.columns) << '\n';
     TableOf(members, section.columns).Write();

@@ -29,6 +29,7 @@ Status Sources(const Tarvo::KelLibrary& library, const Request& request) {
   std::vector<KelSource> sources;
   if (!Ask(*ip, question, "sources", sources)) return StatusFindings;
   std::vector<KelIncludeDirectory> directories;
+  // Without a source there is nothing to include into.
   if (!sources.empty()) ip->GetVerilogIncludeDirectories(directories);
   SourceList list = {Text(ip->GetKey()), purpose, {}, {}};
   for (const KelSource& source : sources) {

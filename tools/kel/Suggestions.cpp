@@ -18,12 +18,13 @@ using Tarvo::StringList;
 
 bool IsRepository(const fs::path& directory) {
   std::error_code error;
-  return fs::is_directory(directory / "ipmods", error);
+  return fs::is_directory(directory / Tarvo::Kel_Index::KEL_VERSIONS_SUBDIRECTORY.GetText(), error);
 }
 
 // The nearest repository above a directory, and those right in it.
 std::set<std::string> RepositoriesNear(const fs::path& directory) {
   std::set<std::string> near;
+  // People stand within a repository, or right above several.
   for (fs::path above = directory; near.empty() && above != above.root_path();) {
     above = above.parent_path();
     if (IsRepository(above)) near.insert(above);
@@ -66,6 +67,7 @@ void SuggestKeys(const Tarvo::KelLibrary& library, const std::string& key) {
   for (const StringBase& text : library.GetIndex().GetAllVersionKeys()) {
     const Kel_Key other(text);
     if (other.GetName() != asked.GetName()) continue;
+    // The core is there, so what can't be opened has told its own error.
     if (!asked.IsValid() || other == asked) return;
     versions.insert(Text(text));
   }

@@ -15,13 +15,13 @@ constexpr std::string_view kCut = "...";
 constexpr std::size_t kTabStop = 8;
 
 // A glyph at its cell of an excerpt that nothing is cut from.
-struct Placed {
+struct ShownGlyph {
   std::string shown;
   std::size_t cell;
   std::size_t end;
 };
 
-Placed Place(const Glyph& glyph, std::size_t cell) {
+ShownGlyph ShowAt(const Glyph& glyph, std::size_t cell) {
   if (glyph.bytes == "\t") {
     const std::size_t blanks = kTabStop - cell % kTabStop;
     return {std::string(blanks, ' '), cell, cell + blanks};
@@ -32,7 +32,7 @@ Placed Place(const Glyph& glyph, std::size_t cell) {
 
 // What of a line may be shown, and the cells of the part in it.
 struct Layout {
-  std::deque<Placed> glyphs;
+  std::deque<ShownGlyph> glyphs;
   std::size_t end = 0;
   std::size_t partStart = 0;
   std::size_t partEnd = 0;
@@ -43,7 +43,8 @@ Layout LayOut(std::string_view line, std::size_t start, std::size_t length, std:
   Layout layout;
   for (std::size_t at = 0; at < line.size();) {
     const Glyph glyph = FirstGlyph(line.substr(at));
-    const Placed placed = Place(glyph, layout.end);
+    const ShownGlyph placed = ShowAt(glyph, layout.end);
+    // A line of megabytes is laid out around the part alone.
     if (at > start && placed.cell > layout.partStart + width) break;
     if (at <= start) layout.partStart = placed.cell;
     if (at < start + length) layout.partEnd = placed.end;
@@ -94,6 +95,7 @@ std::string RelativeTo(const std::string& directory, const Tarvo::StringBase& pa
   const fs::path base = fs::absolute(directory).lexically_normal();
   const std::string relative =
       fs::absolute(text).lexically_normal().lexically_relative(base).string();
+  // A name that begins with a sign could be an option of the tool that reads it.
   const bool isPlain = relative.find_first_of("-+#/") != 0;
   return isPlain ? relative : "./" + relative;
 }
@@ -101,6 +103,7 @@ std::string RelativeTo(const std::string& directory, const Tarvo::StringBase& pa
 Glyph FirstGlyph(std::string_view text) {
   std::mbstate_t state{};
   wchar_t character = 0;
+  // By the locale, which main() sets to UTF-8: bytes that are no character are escaped.
   const std::size_t size = std::mbrtowc(&character, text.data(), text.size(), &state);
   const bool isCharacter = size > 0 && size <= text.size();
   const int cells = isCharacter ? ::wcwidth(character) : -1;
@@ -135,7 +138,7 @@ Excerpt MakeExcerpt(std::string_view line, std::size_t start, std::size_t length
   const bool isCut = layout.end > last;
   if (isCut) last -= kCut.size();
   Excerpt excerpt = {lead, std::string(lead.size() + layout.partStart - shift, ' ')};
-  for (const Placed& glyph : layout.glyphs) {
+  for (const ShownGlyph& glyph : layout.glyphs) {
     if (glyph.end <= last) excerpt.line += glyph.shown;
   }
   if (isCut) excerpt.line += kCut;

@@ -78,6 +78,7 @@ std::unique_ptr<KelIP> OpenCore(const KelLibrary& library, const Request& reques
 }
 
 bool HasNoneByStyle(const KelIP& ip, const char* what, int errors) {
+  // False without an error is how the library says that the style has none.
   if (Messages::ErrorCount() != errors) return false;
   StringBase style;
   ip.GetIPProperty(KelIP::KEL_STYLE_OPTION_NAME, style);

@@ -42,6 +42,7 @@ bool IsClosedPipe() {
 }  // namespace
 
 int main(int argc, char** argv) try {
+  // A reader that has enough is no failure; see IsClosedPipe.
   if (std::signal(SIGPIPE, SIG_IGN) == SIG_ERR) return StatusFindings;
   static_cast<void>(std::setlocale(LC_CTYPE, "C.UTF-8"));  // for the width of characters
   const std::vector<std::string> words(argv + std::min(argc, 1), argv + argc);
