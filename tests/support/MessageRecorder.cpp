@@ -6,16 +6,12 @@
 
 namespace {
 
-const char* NameOf(Port_Message::Severity severity) {
-  static const char* const names[] = {"warning ", "error ", "fatal "};
-  return names[severity];
-}
-
 // All of the library's messages have one domain and revision, so only others show.
 std::string Dump(const Port_Message& message) {
+  const char* const severities[] = {"warning ", "error ", "fatal "};
   const std::string domain = message.domain;
   const std::string revision = message.revision;
-  return NameOf(message.severity) + (domain == "tarvomsg" ? "" : domain + " ") + message.file +
+  return severities[message.severity] + (domain == "tarvomsg" ? "" : domain + " ") + message.file +
          (revision == "1.0" ? "" : " " + revision) + ": " + message.text;
 }
 
