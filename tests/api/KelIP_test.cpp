@@ -1,10 +1,12 @@
+// What an instance keeps, and when it reads; what its operations say is in Operations_test.cpp.
+
 #include <gmock/gmock.h>
 #include <gtest/gtest.h>
 
+#include <filesystem>
 #include <memory>
 #include <string>
 
-#include "AllocationFault.h"
 #include "MessageRecorder.h"
 #include "RepositoryBuilder.h"
 #include "Tarvo_KelIP.h"
@@ -13,380 +15,131 @@
 namespace {
 
 using namespace Tarvo;
+namespace fs = std::filesystem;
 using testing::ElementsAre;
 using testing::IsEmpty;
 
-// The paths that an operation may be asked for, and what it puts out.
-struct Output {
-  StringBase source;
-  StringBase netlist;
-  StringBase value = "old";
-  StringList list = {"old"};
-
-  // What an operation left behind, the one output that it has no use for taken out.
-  std::string Text() const {
-    std::string text = value == "old" ? "" : value.GetText();
-    for (const StringBase& name : list) {
-      if (name != "old") text += "<" + std::string(name) + ">";
-    }
-    return text;
-  }
-  bool IsOld() const { return value == "old" && list == StringList{"old"}; }
-};
-
-// Names that don't fit into a string object, so that every operation allocates.
-const char kDescription[] =
-    "OPTION STYLE = MIX\nOPTION AN_OPTION_WITH_A_LONG_NAME = a value of some length\n"
-    "BUS_INTERFACE BUS = A_BUS_WITH_A_LONG_NAME\nIO_INTERFACE IO_IF = AN_IO_WITH_A_LONG_NAME\n"
-    "PARAMETER A_PARAMETER_WITH_A_LONG_NAME = the_value_of_a_parameter, "
-    "BUS = A_BUS_WITH_A_LONG_NAME, IO_IF = AN_IO_WITH_A_LONG_NAME\n"
-    "PORT A_PORT_WITH_A_LONG_NAME = the_default_of_a_port, BUS = A_BUS_WITH_A_LONG_NAME, "
-    "IO_IF = AN_IO_WITH_A_LONG_NAME\n";
-const StringBase kOption = "AN_OPTION_WITH_A_LONG_NAME";
-const StringBase kParameter = "A_PARAMETER_WITH_A_LONG_NAME";
-const StringBase kBus = "A_BUS_WITH_A_LONG_NAME";
-const StringBase kIo = "AN_IO_WITH_A_LONG_NAME";
-const StringBase kPort = "A_PORT_WITH_A_LONG_NAME";
-const StringBase kLong = "a text that is too long for a string object";
-const StringBase kLibrary = "an_include_library_with_a_long_name";
-const char kAnalyseOrder[] =
-    "lib full_v1_00_a a_source_with_a_long_name.vhd\n"
-    "vlgincdir an_include_library_with_a_long_name data";
-const char kNetlists[] = "FILES\na_netlist_with_a_long_name.edn";
-
-// One guarded operation: what it answers, how it reports a failure, how severe that is for an
-// exception with a text, and what that text is for a core without any statement or further file.
-// "@" stands for the instance's key and "$" for its location. Last, how the operation reports a
-// failure of the one that it asks first.
-struct Row {
-  const char* operation;
-  std::string answer;
-  std::string failure;
-  const char* severity;
-  const char* reason;
-  bool (*run)(KelIP& ip, Output& output);
-  std::string inner = failure;
-};
-
-#define GET(operation, name, property) \
-  [](KelIP& ip, Output& output) { return ip.operation(name, property, output.value); }
-#define LIST(operation, ...) \
-  [](KelIP& ip, Output& output) { return ip.operation(__VA_ARGS__ output.list); }
-
-const std::string kSource = "$/hdl/vhdl/a_source_with_a_long_name.vhd";
-const std::string kNetlist = "$/netlist/a_netlist_with_a_long_name.edn";
-const char kNoOrder[] = "Invalid LDX $/data/none_v2_1_0.ldx\n";
-const char kNoTable[] = "Cannot read file $/data/none_v2_1_0.tew\n";
-
-std::string In(std::string text, const KelIP& ip) {
-  for (std::size_t at; (at = text.find('@')) != std::string::npos;)
-    text.replace(at, 1, ip.GetKey());
-  for (std::size_t at; (at = text.find('$')) != std::string::npos;)
-    text.replace(at, 1, ip.GetLocation());
-  return text;
-}
-StringBase Path(const std::string& text, const KelIP& ip) {
-  return StringBase(std::string_view(In(text, ip)));
-}
-
-const std::string kP = kParameter.GetText(), kB = kBus.GetText(), kI = kIo.GetText(),
-                  kO = kPort.GetText();
-const std::string kDefaults = "<ASSIGNMENT><ISVALID><PERMIT><TYPE>";
-const std::string kValues = "<NAME><VALUE><DEFAULT_VALUE><BUS><IO_IF>" + kDefaults;
-
-const Row kRows[] = {
-    {"GetIPProperty", "a value of some length",
-     "access property " + std::string(kOption) + " for IP @", "error",
-     "Cannot find option AN_OPTION_WITH_A_LONG_NAME\n",
-     [](KelIP& ip, Output& output) { return ip.GetIPProperty(kOption, output.value); }},
-    {"ListIPProperties",
-     "<NAME><VERSION><STYLE><AN_OPTION_WITH_A_LONG_NAME><IMP_NETLIST><RUN_TRAMFOLD><USAGE_LEVEL>",
-     "list properties for IP @", "error", nullptr, LIST(ListIPProperties)},
-    {"GetParameterProperty", "the_value_of_a_parameter",
-     "get parameter " + kP + " property VALUE for IP @", "warning",
-     "Cannot find Parameter A_PARAMETER_WITH_A_LONG_NAME\n",
-     GET(GetParameterProperty, kParameter, "VALUE")},
-    {"SetParameterProperty", "",
-     "set IP @ parameter " + kP + " property VALUE to " + std::string(kLong), "warning",
-     "Cannot find Parameter A_PARAMETER_WITH_A_LONG_NAME\n",
-     [](KelIP& ip, Output&) { return ip.SetParameterProperty(kParameter, "VALUE", kLong); }},
-    {"ListParameters", "<" + kP + ">", "list parameters for IP @", "error", nullptr,
-     LIST(ListParameters)},
-    {"ListParameterProperties", kValues, "list parameter properties for IP @", "error",
-     "Cannot find Parameter A_PARAMETER_WITH_A_LONG_NAME\n",
-     LIST(ListParameterProperties, kParameter, )},
-    {"GetGenericProperty", "the_value_of_a_parameter",
-     "get generic " + kP + " property VALUE for IP @", "warning",
-     "Cannot find Generic A_PARAMETER_WITH_A_LONG_NAME\n",
-     GET(GetGenericProperty, kParameter, "VALUE")},
-    {"ListGenerics", "<" + kP + ">", "list generics for IP @", "error", nullptr,
-     LIST(ListGenerics)},
-    {"ListGenericProperties", kValues, "list generic properties for IP @", "error",
-     "Cannot find Generic A_PARAMETER_WITH_A_LONG_NAME\n",
-     LIST(ListGenericProperties, kParameter, )},
-    {"GetPortProperty", "the_default_of_a_port", "get port " + kO + " property DEFAULT for IP @",
-     "warning", "Cannot find Port A_PORT_WITH_A_LONG_NAME\n",
-     GET(GetPortProperty, kPort, "DEFAULT")},
-    {"ListPorts", "<" + kO + ">", "list ports for IP @", "error", nullptr, LIST(ListPorts)},
-    {"ListPortProperties",
-     "<NAME><DEFAULT><BUS><IO_IF><ASSIGNMENT><ENABLE><INITIALVAL><ISVALID><PERMIT>",
-     "list port " + kO + " properties for IP @", "error",
-     "Cannot find Port A_PORT_WITH_A_LONG_NAME\n", LIST(ListPortProperties, kPort, )},
-    {"GetBusInterfaceProperty", kB, "get bus interface " + kB + " property NAME for IP @",
-     "warning", "Cannot find Bus Interface A_BUS_WITH_A_LONG_NAME\n",
-     GET(GetBusInterfaceProperty, kBus, "NAME")},
-    {"ListBusInterfaces", "<" + kB + ">", "list bus interfaces for IP @", "error", nullptr,
-     LIST(ListBusInterfaces)},
-    {"ListBusInterfaceProperties", "<NAME><BUS><ISVALID><SHARES_ADDR>",
-     "list bus interface " + kB + " properties for IP @", "error",
-     "Cannot find Bus Interface A_BUS_WITH_A_LONG_NAME\n",
-     LIST(ListBusInterfaceProperties, kBus, )},
-    {"ListBusInterfaceParameters", "<" + kP + ">",
-     "list bus interface " + kB + " parameters for IP @", "error",
-     "Cannot find Bus Interface A_BUS_WITH_A_LONG_NAME\n",
-     LIST(ListBusInterfaceParameters, kBus, )},
-    {"ListBusInterfacePorts", "<" + kO + ">", "list bus interface " + kB + " ports for IP @",
-     "error", "Cannot find Bus Interface A_BUS_WITH_A_LONG_NAME\n",
-     LIST(ListBusInterfacePorts, kBus, )},
-    {"GetIOInterfaceProperty", kI, "get I/O interface " + kI + " property NAME for IP @", "warning",
-     "Cannot find I/O Interface AN_IO_WITH_A_LONG_NAME\n",
-     GET(GetIOInterfaceProperty, kIo, "NAME")},
-    {"ListIOInterfaces", "<" + kI + ">", "list I/O interfaces for IP @", "error", nullptr,
-     LIST(ListIOInterfaces)},
-    {"ListIOInterfaceProperties", "<NAME><IO_IF><ISVALID>",
-     "list I/O interface " + kI + " properties for IP @", "error",
-     "Cannot find I/O Interface AN_IO_WITH_A_LONG_NAME\n", LIST(ListIOInterfaceProperties, kIo, )},
-    {"ListIOInterfaceParameters", "<" + kP + ">",
-     "list I/O interface " + kI + " parameters for IP @", "error",
-     "Cannot find I/O Interface AN_IO_WITH_A_LONG_NAME\n", LIST(ListIOInterfaceParameters, kIo, )},
-    {"ListIOInterfacePorts", "<" + kO + ">", "list I/O interface " + kI + " ports for IP @",
-     "error", "Cannot find I/O Interface AN_IO_WITH_A_LONG_NAME\n",
-     LIST(ListIOInterfacePorts, kIo, )},
-    {"ListSynthesisSources", "<" + kSource + ">", "list synthesis analyse order for IP @", "error",
-     kNoOrder, LIST(ListSynthesisSources)},
-    {"ListSimulationSources", "<" + kSource + ">", "list simulation analyse order for IP @",
-     "error", kNoOrder, LIST(ListSimulationSources)},
-    {"ListSynthesisLibraries", "<$>", "list synthesis libraries for IP @", "error", kNoOrder,
-     LIST(ListSynthesisLibraries)},
-    {"ListSimulationLibraries", "<$>", "list simulation libraries for IP @", "error", kNoOrder,
-     LIST(ListSimulationLibraries)},
-    {"ListVerilogIncludeLibraries", "<" + std::string(kLibrary) + ">",
-     "list Verilog include libraries for IP @", "error", kNoOrder,
-     LIST(ListVerilogIncludeLibraries)},
-    {"GetVerilogIncludeLocation", "$/data",
-     "locate Verilog include library " + std::string(kLibrary) + " for IP @", "error", kNoOrder,
-     [](KelIP& ip, Output& output) {
-       return ip.GetVerilogIncludeLocation(kLibrary, output.value);
-     }},
-    {"GetSourceProperty", "$/hdl/vhdl",
-     "get property FILENAME_HEAD for source " + kSource + " in IP @", "error", kNoOrder,
-     [](KelIP& ip, Output& output) {
-       return ip.GetSourceProperty(output.source, "FILENAME_HEAD", output.value);
-     }},
-    {"ListSourceProperties", "<LIBRARY><LANGUAGE><FILENAME_HEAD><FILENAME_TAIL>",
-     "list source " + kSource + " properties for IP @", "error", kNoOrder,
-     LIST(ListSourceProperties, output.source, ),
-     "get property LIBRARY for source " + kSource + " in IP @"},
-    {"ListNetlists", "<" + kNetlist + ">", "list netlists for IP @", "error", kNoTable,
-     LIST(ListNetlists)},
-    {"ListNetlistLibraries", "<$>", "list netlist libraries for IP @", "error", kNoTable,
-     LIST(ListNetlistLibraries)},
-    {"GetNetlistProperty", "@", "get netlist " + kNetlist + " property LIBRARY for IP @", "error",
-     kNoTable, GET(GetNetlistProperty, output.netlist, "LIBRARY")},
-    {"ListNetlistProperties", "<LIBRARY>", "list netlist " + kNetlist + " properties for IP @",
-     "error", kNoTable, LIST(ListNetlistProperties, output.netlist, ),
-     "get netlist " + kNetlist + " property LIBRARY for IP @"}};
-
-#undef GET
-#undef LIST
-
 class Instance : public testing::Test {
  protected:
-  std::unique_ptr<KelIP> Open(const std::string& key) {
-    return std::unique_ptr<KelIP>(library.CreateIP(key.c_str()));
+  // Walks anew first.
+  std::unique_ptr<KelIP> Open(const char* key) {
+    EXPECT_TRUE(library.SetRepositoryPath(repo.Path().c_str()));
+    return std::unique_ptr<KelIP>(library.CreateIP(key));
   }
-  void Walk() { ASSERT_TRUE(library.SetRepositoryPath(repo.Path().c_str())); }
-  static Output Ready(const KelIP& ip) { return {Path(kSource, ip), Path(kNetlist, ip)}; }
-  // The message of a failure up to its tail.
-  static std::string Failure(const std::string& severity, const std::string& text,
-                             const KelIP& ip) {
-    return severity + " s/Tarvo_KelIP: Unable to " + In(text, ip);
+  // What a question gives, as the last names of its paths, or that it has no answer.
+  static std::string Ask(const KelIP& ip, bool (KelIP::*question)(StringList&) const) {
+    StringList list = {"old"};
+    if (!(ip.*question)(list)) return list.empty() ? "none" : "left";
+    std::string text;
+    for (const StringBase& name : list) text += fs::path(name.GetText()).filename().string() + " ";
+    return text;
   }
+  std::string At(const std::string& name) const { return repo / "ipmods/abc_v1_00_a/" + name; }
 
   RepositoryBuilder repo;
   MessageRecorder recorder;
   KelLibrary library;
 };
 
-TEST_F(Instance, AnswersAndReportsByItsRows) {
-  repo.Core("full_v1_00_a").Qvr(kDescription).Ldx(kAnalyseOrder).Tew(kNetlists);
-  repo.Core("none_v1_00_a").Qvr("OPTION STYLE = MIX");
-  Walk();
-  const auto full = Open("full"), none = Open("none");
-  for (const Row& row : kRows) {
-    SCOPED_TRACE(row.operation);
-    Output answer = Ready(*full);
-    EXPECT_TRUE(row.run(*full, answer));
-    EXPECT_EQ(answer.Text(), In(row.answer, *full));
-    EXPECT_THAT(recorder.Take(), IsEmpty());
-    if (!row.reason) continue;
-    Output output = Ready(*none);
-    EXPECT_FALSE(row.run(*none, output));
-    EXPECT_EQ(output.Text(), "");
-    EXPECT_EQ(output.IsOld(), row.answer.empty());
-    EXPECT_THAT(recorder.Take(), ElementsAre(Failure(row.severity, row.failure, *none) + "\n" +
-                                             In(row.reason, *none) + "\n"));
-  }
-}
-
-// Each operation with its n-th allocation failing, for every n until it succeeds. The parsers are
-// there before.
-TEST_F(Instance, LetsNothingEscape) {
-  repo.Core("full_v1_00_a").Qvr(kDescription).Ldx(kAnalyseOrder).Tew(kNetlists);
-  Walk();
-  const struct {
-    AllocationFault::Kind kind;
-    const char* severity;  // instead of the row's
-    const char* tail;
-  } faults[] = {{AllocationFault::BadAlloc, nullptr, "\nstd::bad_alloc\n"},
-                {AllocationFault::FatalException, nullptr, "\nout of order\n\n"},
-                {AllocationFault::SomethingElse, "error", ", unknown exception\n"}};
-  for (const Row& row : kRows) {
-    SCOPED_TRACE(row.operation);
-    for (const auto& [kind, severity, usualTail] : faults) {
-      const auto ip = Open("full");
-      StringList list;
-      ASSERT_TRUE(ip->ListSynthesisSources(list) && ip->ListNetlists(list));
-      const bool isEmpty = severity && row.operation == std::string("GetIPProperty");
-      const std::string tail = isEmpty ? "\n\n" : usualTail;
-      const auto message = [&, sure = severity ? severity : row.severity](const std::string& text) {
-        return Failure(sure, text, *ip) + tail;
-      };
-      for (int count = 0;; ++count) {
-        Output output = Ready(*ip);
-        bool done = false;
-        {
-          const AllocationFault fault(count, kind);
-          done = row.run(*ip, output);
-        }
-        EXPECT_EQ(done, !AllocationFault::Fired());
-        if (!AllocationFault::Fired()) {
-          EXPECT_EQ(output.Text(), In(row.answer, *ip));
-          EXPECT_GT(count, 0);
-          break;
-        }
-        EXPECT_EQ(output.Text(), "");
-        EXPECT_EQ(output.IsOld(), row.answer.empty());
-        EXPECT_THAT(recorder.Take(),
-                    ElementsAre(testing::AnyOf(message(row.failure), message(row.inner))));
-      }
-    }
-  }
-}
-
 TEST_F(Instance, IsMadeForTheVersionThatAKeyStandsFor) {
   repo.Core("abc_v1_00_a").Qvr("PORT a = 1");
   repo.Core("abc_V02_00_B").Qvr("OPTION EMPTY = ''\nOPTION NAME = other");
-  Walk();
-  auto old = Open("abc_v1_00_a"), ip = Open("abc");
+  const auto old = Open("abc_v1_00_a"), ip = Open("abc");
   EXPECT_EQ(std::string(ip->GetKey()) + " " + ip->GetName().GetText() + " " +
                 ip->GetVersion().GetText() + " " + ip->GetLocation().GetText(),
             "abc_v02_00_b abc 2.00.b " + (repo / "ipmods/abc_V02_00_B"));
-  StringBase value;
-  EXPECT_TRUE(ip->GetIPProperty("NAME", value));
+  EXPECT_EQ(Ask(*ip, &KelIP::ListIPProperties),
+            "NAME VERSION EMPTY NAME IMP_NETLIST RUN_TRAMFOLD STYLE USAGE_LEVEL ");
+  StringBase value = "NAME";
+  EXPECT_TRUE(ip->GetIPProperty(value, value));  // an argument may be the output, or lie in it
   EXPECT_EQ(value, "abc");
-  EXPECT_TRUE(ip->GetIPProperty("VERSION", value));
-  EXPECT_EQ(value, "2.00.b");
-  StringList names;
-  EXPECT_TRUE(ip->ListIPProperties(names));
-  EXPECT_THAT(names, ElementsAre("NAME", "VERSION", "EMPTY", "NAME", "IMP_NETLIST", "RUN_TRAMFOLD",
-                                 "STYLE", "USAGE_LEVEL"));
+  StringList list = {"a"};
+  EXPECT_TRUE(old->ListPortProperties(list[0], list));
   EXPECT_FALSE(ip->GetIPProperty("EMPTY", value));
   EXPECT_EQ(value, "");
   EXPECT_THAT(recorder.Take(), IsEmpty());
-  EXPECT_FALSE(ip->GetIPProperty("name", value));
-  EXPECT_THAT(recorder.Take(), ElementsAre("error s/Tarvo_KelIP: Unable to access property name "
-                                           "for IP abc_v02_00_b\nCannot find option name\n\n"));
 
-  // A refresh that finds another newest version changes no instance.
+  // A walk that finds another newest version changes no instance.
   repo.Core("abc_v3_00_a").Qvr("");
-  std::filesystem::remove_all(repo / "ipmods/abc_v1_00_a");
-  EXPECT_TRUE(library.RefreshLibrary());
+  fs::remove_all(repo / "ipmods/abc_v1_00_a");
+  EXPECT_EQ(Open("abc")->GetKey(), "abc_v3_00_a");
   EXPECT_EQ(ip->GetKey(), "abc_v02_00_b");
   EXPECT_EQ(old->GetLocation(), (repo / "ipmods/abc_v1_00_a").c_str());
-  StringList list;
-  EXPECT_TRUE(old->ListPorts(list));
-  EXPECT_THAT(list, ElementsAre("a"));
-  EXPECT_EQ(Open("abc")->GetKey(), "abc_v3_00_a");
+  EXPECT_EQ(Ask(*old, &KelIP::ListPorts), "a ");
 }
 
-TEST_F(Instance, KeepsArgumentsThatLieInTheOutput) {
-  repo.Core("abc_v1_00_a").Qvr("PORT p = 1, DIR = I");
-  Walk();
-  const auto ip = Open("abc");
-  StringBase value = "p";
-  EXPECT_TRUE(ip->GetPortProperty(value, "DIR", value));
-  EXPECT_EQ(value, "I");
-  StringList list = {"p", "q"};
-  EXPECT_TRUE(ip->ListPortProperties(list[0], list));
-  list = {"p", "q"};
-  EXPECT_FALSE(ip->ListPortProperties(list[1], list));
-  EXPECT_THAT(recorder.Take(), ElementsAre(testing::HasSubstr("list port q properties")));
-}
-
-TEST_F(Instance, IsNotMadeWithoutADescription) {
-  repo.Core("none_v1_00_a");
-  repo.Core("bad_v1_00_a").Qvr("PORT a");
-  repo.Core("abc_v1_00_a").Qvr(kDescription);
-  Walk();
-  const std::string error = "error s/Tarvo_KelLibrary: Unable to create IP ";
-  EXPECT_EQ(library.CreateIP("No_V1_00_A"), nullptr);
-  EXPECT_EQ(library.CreateIP("none"), nullptr);
-  EXPECT_EQ(library.CreateIP("bad"), nullptr);
-  const std::string bad = repo / "ipmods/bad_v1_00_a/data/bad_v2_1_0.qvr";
-  EXPECT_THAT(
-      recorder.Take(),
-      ElementsAre(error + "No_V1_00_A\nCannot find IP index entry for No_v1_00_a\n\n",
-                  error + "none\nCannot read file " +
-                      repo / "ipmods/none_v1_00_a/data/none_v2_1_0.qvr" + "\n\n",
-                  "error s/Tarvo_QVRParser: QVR unparsable PORT: " + bad + " line 1, PORT a\n",
-                  error + "bad\nInvalid QVR " + bad + "\n\n"));
-  const struct {
-    AllocationFault::Kind kind;
-    std::string message;
-  } faults[] = {{AllocationFault::BadAlloc, error + "abc\nstd::bad_alloc\n"},
-                {AllocationFault::SomethingElse, error + "abc, unknown exception\n"},
-                {AllocationFault::FatalException,
-                 "fatal s/Tarvo_KelLibrary: Unable to create IP abc\nout of order\n\n"}};
-  const StringBase key = "abc";
-  for (const auto& [kind, message] : faults) {
-    for (int count = 0;; ++count) {
-      std::unique_ptr<KelIP> ip;
-      {
-        const AllocationFault fault(count, kind);
-        ip.reset(library.CreateIP(key));
-      }
-      EXPECT_EQ(ip == nullptr, AllocationFault::Fired());
-      if (!AllocationFault::Fired()) break;
-      const auto messages = recorder.Take();
-      ASSERT_FALSE(messages.empty());
-      EXPECT_THAT(messages.back(), testing::StartsWith(message)) << count;
-    }
+TEST_F(Instance, TakesTheLanguageFromTheOption) {
+  const char* const rows[][2] = {{"", "a.vhd "},
+                                 {"OPTION HDL = verilog", "a.v "},
+                                 {"OPTION hdl = Verilog", "a.vhd "},
+                                 {"OPTION HDL = Verilog\nOPTION HDL = VHDL", "a.v "}};
+  for (const auto& [option, sources] : rows) {
+    repo.Core("abc_v1_00_a").Qvr(option).Ldx("lib abc a");
+    EXPECT_EQ(Ask(*Open("abc"), &KelIP::ListSynthesisSources), sources) << option;
   }
 }
 
-TEST_F(Instance, TracesItsMaking) {
-  repo.Core("abc_v1_00_a").Qvr("");
-  const auto relative = std::filesystem::relative(repo.Path());
-  ASSERT_TRUE(library.SetRepositoryPath(relative.c_str()));
-  const std::string where = std::filesystem::current_path() / relative / "ipmods/abc_v1_00_a";
-  MessageRecorder traces(MessageRecorder::MessagesAndTraces);
-  Open("abc");
-  const auto entries = traces.Take();
-  EXPECT_EQ(entries.front(),
-            "trace: Constructing IP instance abc v1.00.a from path " + where + "\n");
-  EXPECT_EQ(Open("abc")->GetLocation(), where.c_str());
-  EXPECT_EQ(entries.back(), "trace: Finished constructing IP instance abc v1.00.a\n");
+TEST_F(Instance, GivesPropertiesOfSources) {
+  repo.Core("abc_v1_00_a").Ldx("lib abc s/a.vhd\nsimlib abc b.vh VHDL").Qvr("");
+  const auto ip = Open("abc");
+  const std::string a = At("hdl/vhdl/s/a.vhd"), b = At("hdl/vhdl/b.vh"), other = "no/such.v";
+  const std::string rows[][3] = {{a, "FILENAME_HEAD", At("hdl/vhdl/s")},
+                                 {a, "library", ""},
+                                 {b, "LIBRARY", "abc_v1_00_a"},
+                                 {b, "LANGUAGE", ""},
+                                 {other, "LANGUAGE", "Verilog"},
+                                 {other, "FILENAME_HEAD", fs::current_path() / "no"},
+                                 {other, "LIBRARY", ""}};
+  for (const auto& [source, property, expected] : rows) {
+    StringBase value = "old";
+    EXPECT_EQ(ip->GetSourceProperty(source.c_str(), property.c_str(), value), !expected.empty());
+    EXPECT_EQ(value.View(), expected) << source << " " << property;
+  }
+  StringList list = {"old"};
+  EXPECT_FALSE(ip->ListSourceProperties(other.c_str(), list));
+  EXPECT_THAT(list, IsEmpty());
+  EXPECT_THAT(recorder.Take(), IsEmpty());
+}
+
+TEST_F(Instance, FollowsTheParametersWithoutReadingAgain) {
+  auto core = repo.Core("abc_v1_00_a");
+  core.Qvr("OPTION STYLE = MIX\nPARAMETER A = 1");
+  core.Tew("A FILES\n1 one.edn\n2 two.edn, three.edn");
+  const auto ip = Open("abc");
+  EXPECT_EQ(Ask(*ip, &KelIP::ListNetlists), "one.edn ");
+  fs::remove_all(At("data"));
+  EXPECT_TRUE(ip->SetParameterProperty("A", "VALUE", "2"));
+  EXPECT_EQ(Ask(*ip, &KelIP::ListNetlists), "two.edn three.edn ");
+  EXPECT_TRUE(ip->SetParameterProperty("A", "VALUE", "3"));
+  EXPECT_EQ(Ask(*ip, &KelIP::ListNetlists), "");
+  StringBase value;
+  const StringBase netlist = At("netlist/one.edn").c_str();
+  EXPECT_FALSE(ip->GetNetlistProperty(netlist, "library", value));
+  EXPECT_THAT(recorder.Take(), IsEmpty());
+  // The list asks for the property, whose message is then the only one.
+  StringList list;
+  EXPECT_FALSE(ip->ListNetlistProperties(netlist, list));
+  EXPECT_THAT(
+      recorder.Take(),
+      ElementsAre(testing::HasSubstr("property LIBRARY for IP abc_v1_00_a\nCould not find")));
+}
+
+// A file that is bad fails each question anew, and no other, until it is mended.
+TEST_F(Instance, TriesAgainAfterAFailure) {
+  auto core = repo.Core("abc_v1_00_a");
+  core.Qvr("OPTION STYLE = MIX\nPARAMETER A = 1").Ldx("lib").Tew("FILES\nb.edn, '");
+  const auto ip = Open("abc");
+  for (int round = 0; round < 2; ++round) {
+    EXPECT_EQ(Ask(*ip, &KelIP::ListSynthesisSources), "none");
+    EXPECT_EQ(recorder.Take().size(), 2U);
+    EXPECT_EQ(Ask(*ip, &KelIP::ListParameters), "A ");
+    EXPECT_EQ(Ask(*ip, &KelIP::ListNetlistLibraries), "none");
+    EXPECT_EQ(recorder.Take().size(), 1U);
+  }
+  core.Ldx("lib abc a.vhd").Tew("FILES\nb.edn");
+  EXPECT_EQ(Ask(*ip, &KelIP::ListSynthesisSources), "a.vhd ");
+  EXPECT_EQ(Ask(*ip, &KelIP::ListNetlists), "b.edn ");
+  EXPECT_THAT(recorder.Take(), IsEmpty());
 }
 
 }  // namespace
