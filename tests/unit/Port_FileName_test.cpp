@@ -3,40 +3,35 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <string>
+#include <utility>
 
 namespace {
 
 using Port::FileName;
 
 TEST(FileName, SplitsAndKeepsTheText) {
-  struct Row {
-    const char* name;
-    const char* head;
-    const char* path;
-    const char* tail;
-    const char* base;
-    bool extended;
-  };
-  const Row rows[] = {{"", "", "", "", "", false},
-                      {"a.vhd", "", "", "a.vhd", "a", true},
-                      {"sub/a", "sub", "sub", "a", "a", false},
-                      {"../x/a.b.v", "../x", "../x", "a.b.v", "a.b", true},
-                      {"/a.v", "/", "", "a.v", "a", true},
-                      {"//x//a.v", "//x", "x", "a.v", "a", true},
-                      {"/x/", "/x", "x", "", "", false},
-                      {"x.y/a", "x.y", "x.y", "a", "a", false},
-                      {"d/.profile", "d", "d", ".profile", ".profile", false},
-                      {"d/a.", "d", "d", "a.", "a.", false},
-                      {"..", "", "", "..", "..", false}};
-  for (const Row& row : rows) {
-    SCOPED_TRACE(row.name);
-    const FileName name(row.name);
-    EXPECT_EQ(name.GetName(), row.name);
-    EXPECT_EQ(name.GetHead(false, false), row.head);
-    EXPECT_EQ(name.GetPath(), row.path);
-    EXPECT_EQ(name.GetTail(), row.tail);
-    EXPECT_EQ(name.GetBase(), row.base);
-    EXPECT_EQ(name.HasExtension(), row.extended);
+  // Head, path, tail and base, and whether there is an extension.
+  const std::pair<const char*, const char*> rows[] = {{"", "||||"},
+                                                      {"a.vhd", "||a.vhd|a|yes"},
+                                                      {"sub/a", "sub|sub|a|a|"},
+                                                      {"../x/a.b.v", "../x|../x|a.b.v|a.b|yes"},
+                                                      {"/a.v", "/||a.v|a|yes"},
+                                                      {"//x//a.v", "//x|x|a.v|a|yes"},
+                                                      {"/x/", "/x|x|||"},
+                                                      {"x.y/a", "x.y|x.y|a|a|"},
+                                                      {"d/.profile", "d|d|.profile|.profile|"},
+                                                      {"d/a.", "d|d|a.|a.|"},
+                                                      {"..", "||..|..|"}};
+  for (const auto& [text, expected] : rows) {
+    const FileName name(text);
+    std::string parts;
+    for (const auto& part :
+         {name.GetHead(false, false), name.GetPath(), name.GetTail(), name.GetBase()}) {
+      parts += std::string(part) + "|";
+    }
+    EXPECT_EQ(parts + (name.HasExtension() ? "yes" : ""), expected) << text;
+    EXPECT_EQ(name.GetName(), text);
   }
 }
 
@@ -64,32 +59,24 @@ TEST(FileName, BuildsTheNamesOfDataFiles) {
 
 // What is pushed comes back level by level, down to the root or to nothing.
 TEST(FileName, PushesAndPopsLevels) {
-  struct Row {
-    const char* head;
-    const char* pushed;
-    const char* name;
-    const char* popped;
-  };
-  const Row rows[] = {{"", "", "t", ""},
-                      {"", "a", "a/t", "a|"},
-                      {"/", "", "/t", ""},
-                      {"/", "a", "/a/t", "a|"},
-                      {"/r", "a/b", "/r/a/b/t", "b|a|r|"},
-                      {"r", "/a/", "r/a/t", "a|r|"},
-                      {"r//", "..//b", "r//..//b/t", "b|..|r|"}};
-  for (const Row& row : rows) {
-    SCOPED_TRACE(row.name);
+  // The head, what is pushed, the name then, and what is popped.
+  const char* const rows[][4] = {{"", "", "t", ""},
+                                 {"", "a", "a/t", "a|"},
+                                 {"/", "", "/t", ""},
+                                 {"/", "a", "/a/t", "a|"},
+                                 {"/r", "a/b", "/r/a/b/t", "b|a|r|"},
+                                 {"r", "/a/", "r/a/t", "a|r|"},
+                                 {"r//", "..//b", "r//..//b/t", "b|..|r|"}};
+  for (const auto& [head, pushed, name, popped] : rows) {
     FileName file("t");
-    file.SetHead(row.head);
-    file.PushPathEnd(row.pushed);
-    EXPECT_EQ(file.GetName(), row.name);
-    std::string popped;
+    file.SetHead(head);
+    file.PushPathEnd(pushed);
+    EXPECT_EQ(file.GetName(), name);
+    std::string levels;
     for (auto level = file.PopPathEnd(); level.GetLength() > 0; level = file.PopPathEnd()) {
-      popped += std::string(level) + "|";
+      levels += std::string(level) + "|";
     }
-    EXPECT_EQ(popped, row.popped);
-    EXPECT_EQ(file.PopPathEnd(), "");
-    EXPECT_EQ(file.GetTail(), "t");
+    EXPECT_EQ(levels + file.GetTail().GetText(), std::string(popped) + "t") << name;
   }
 }
 
