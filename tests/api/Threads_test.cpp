@@ -6,7 +6,6 @@
 #include <memory>
 #include <thread>
 #include <utility>
-#include <vector>
 
 #include "Port_MsgManData.h"
 #include "RepositoryBuilder.h"
@@ -30,8 +29,8 @@ bool Request(const StringBase& path) {
          ip->ListNetlists(netlists) && netlists.size() == 1;
 }
 
-// Each thread has a library of its own; the handler of messages and the logger are for all, and are
-// exchanged meanwhile.
+// Each thread has a library of its own; the handler of messages and the logger are for all, run one
+// at a time, and are exchanged meanwhile.
 TEST(Threads, ShareOnlyHandlerAndLogger) {
   RepositoryBuilder repo;
   repo.Core("abc_v1_00_a")
@@ -40,25 +39,24 @@ TEST(Threads, ShareOnlyHandlerAndLogger) {
       .Tew("MODE FILES\nFAST a.edif");
   repo.Core("def_v1_00_a").Ldx("lib def b.vhd");
   const StringBase path = repo.Path().c_str();
-  std::atomic<int> wrong = 0;
-  std::atomic<int> running = 3;
-  std::vector<std::thread> threads;
-  for (int i = 0; i < 3; ++i) {
-    threads.emplace_back([&] {
-      for (int round = 0; round < 50; ++round) wrong += Request(path) ? 0 : 1;
-      --running;
-    });
+  std::atomic<int> wrong = 0, running = 3, inside = 0;
+  const auto request = [&] {
+    for (int round = 0; round < 50; ++round) wrong += Request(path) ? 0 : 1;
+    --running;
+  };
+  std::thread threads[] = {std::thread(request), std::thread(request), std::thread(request)};
+  DebugMessenger& logger = *DebugMessengerFactory::GetLogger("BaseIP");
+  const auto handle = [&](const Port_Message&) {
+    wrong += ++inside == 1 ? 0 : 1;
+    logger.Verbose("from within");
+    --inside;
+  };
+  while (running > 0) {
+    auto previous = Port_MsgManData::setHandler(handle);
+    logger.SetSink([](const StringBase&) { std::this_thread::yield(); });
+    logger.SetSink({});
+    Port_MsgManData::setHandler(std::move(previous));
   }
-  threads.emplace_back([&] {
-    DebugMessenger& logger = *DebugMessengerFactory::GetLogger("BaseIP");
-    unsigned seen = 0;
-    while (running > 0) {
-      auto previous = Port_MsgManData::setHandler([&](const Port_Message&) { ++seen; });
-      logger.SetSink([&](const StringBase&) { ++seen; });
-      logger.SetSink({});
-      Port_MsgManData::setHandler(std::move(previous));
-    }
-  });
   for (std::thread& thread : threads) thread.join();
   EXPECT_EQ(wrong, 0);
 }
