@@ -461,7 +461,8 @@ bool KelIP::GetNetlistTable(KelNetlistTable& table) const {
                [&] { return Answer(table, impl->GetTEWParser(), &TEWParser::GetTable); });
 }
 
-// Questions to an instance like the others, though their answers need none of it.
+// Questions to an instance like the others, though their answers need none of it. Each makes its
+// list apart: if memory runs out, the caller's one is as it was.
 // NOLINTBEGIN(readability-convert-member-functions-to-static)
 
 bool KelIP::ListAllParameterProperties(StringList& list) const {
@@ -489,13 +490,13 @@ bool KelIP::ListAllIOInterfaceProperties(StringList& list) const {
 }
 
 bool KelIP::ListAllSourceProperties(StringList& list) const {
-  list = {KEL_HDL_LIBRARY_PROPERTY, KEL_HDL_LANGUAGE_PROPERTY, KEL_HDL_FILENAME_HEAD_PROPERTY,
-          KEL_HDL_FILENAME_TAIL_PROPERTY};
+  list = StringList{KEL_HDL_LIBRARY_PROPERTY, KEL_HDL_LANGUAGE_PROPERTY,
+                    KEL_HDL_FILENAME_HEAD_PROPERTY, KEL_HDL_FILENAME_TAIL_PROPERTY};
   return true;
 }
 
 bool KelIP::ListAllNetlistProperties(StringList& list) const {
-  list = {KEL_NETLIST_LIBRARY_PROPERTY};
+  list = StringList{KEL_NETLIST_LIBRARY_PROPERTY};
   return true;
 }
 

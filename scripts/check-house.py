@@ -1,8 +1,12 @@
 #!/usr/bin/env python3
-"""Checks the house rules that no compiler knows: who may include whom, and how long a source is.
+"""Checks the house rules that no compiler knows: who may include whom, how long a source is, and how much
+of the code is tests.
 
-Each rule has a sample in tests/data/house that must fail; one that passes is a failure of the
+Each rule has a sample in tests/data/house, or here, that must fail; one that passes is a failure of the
 check itself.
+
+The share of tests: lines of code (neither blank nor comment) under tests/, divided by those under tests/ and
+the product's folders. It is printed, with the share of comments in sources (*.cpp of the product).
 """
 
 import pathlib
@@ -13,6 +17,10 @@ import sys
 ROOT = pathlib.Path(__file__).resolve().parent.parent
 SAMPLES = ROOT / "tests/data/house"
 LONGEST_SOURCE = 600
+PRODUCT = ["s", "include", "platform", "tools"]
+LARGEST_SHARE_OF_TESTS = 0.33
+CODE = ["*.cpp", "*.h", "*.py", "*.sh", "*.bash", "*.fish", "_kel"]
+COMMENT = re.compile(r"\s*(//|#(?!\s*(include|define|undef|if|ifdef|ifndef|else|elif|endif|pragma|error)\b))")
 
 # The modules of the whole design. One may include itself and modules of a lower rank. The first pattern that fits a file's
 # path counts.
@@ -95,17 +103,51 @@ def breaches(path, lines, headers):
             yield f"{path}:{number}: rank {own[0]} includes {name} of rank {other[0]}"
 
 
-def project_sources():
+def project_files(*patterns):
     listed = subprocess.run(
-        ["git", "ls-files", "-z", "--cached", "--others", "--exclude-standard", "*.h", "*.cpp"],
+        ["git", "ls-files", "-z", "--cached", "--others", "--exclude-standard", *patterns],
         cwd=ROOT, check=True, capture_output=True, text=True).stdout.split("\0")
     return [path for path in listed if path and not path.startswith("tests/data/") and (ROOT / path).exists()]
+
+
+def count_lines(path):
+    """How many lines of a file are code, and how many are comments."""
+    lines = [line for line in (ROOT / path).read_text().splitlines() if line.strip()]
+    comments = sum(bool(COMMENT.match(line)) for line in lines)
+    return len(lines) - comments, comments
+
+
+def share(part, whole):
+    return part / max(part + whole, 1)
+
+
+def faults_of_share(tests, product):
+    if share(tests, product) > LARGEST_SHARE_OF_TESTS:
+        yield f"tests: {share(tests, product):.1%} of the code, more than {LARGEST_SHARE_OF_TESTS:.0%}"
+
+
+def size_faults():
+    """Prints the shares, and gives what is wrong with them."""
+    code, comments, lines = {"tests": 0, "product": 0}, 0, 0
+    for path in project_files(*CODE):
+        folder = path.split("/")[0]
+        if folder not in ["tests", *PRODUCT]:
+            continue
+        own, own_comments = count_lines(path)
+        code["tests" if folder == "tests" else "product"] += own
+        if folder in PRODUCT and path.endswith(".cpp"):
+            lines, comments = lines + own, comments + own_comments
+    print(f"{code['product']} lines of product, {code['tests']} of tests: tests are "
+          f"{share(code['tests'], code['product']):.1%}, comments {share(comments, lines):.1%} of sources")
+    return faults_of_share(code["tests"], code["product"])
 
 
 def sample_failures(headers):
     """Each sample names in its first line the path to take it for, and must breach a rule."""
     if not any(breaches("s/Tarvo_Kel_Key.cpp", [""] * (LONGEST_SOURCE + 1), headers)):
         yield "a source that is too long passes"
+    if not any(faults_of_share(1, 2)):
+        yield "too many tests pass"
     for sample in sorted(SAMPLES.glob("*.sample")):
         lines = sample.read_text().splitlines()
         if not any(breaches(lines[0].removeprefix("// as "), lines, headers)):
@@ -113,9 +155,9 @@ def sample_failures(headers):
 
 
 def main():
-    sources = project_sources()
+    sources = project_files("*.h", "*.cpp")
     headers = {pathlib.Path(path).name: path for path in sources if path.endswith(".h")}
-    found = list(sample_failures(headers))
+    found = [*sample_failures(headers), *size_faults()]
     for path in sources:
         found += breaches(path, (ROOT / path).read_text().splitlines(), headers)
     for text in found:

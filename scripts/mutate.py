@@ -1,19 +1,24 @@
 #!/usr/bin/env python3
 """Changes the product at random places, one place at a time, and notes which tests find each change.
 
-usage: mutate.py draw COUNT FILE [--seed N] [--jobs N]   draws changes, tries them and writes FILE
-       mutate.py again OLD FILE [--jobs N]               tries the changes of OLD on the present tree
-       mutate.py compare OLD FILE                        fails if one that was found is found no more
-       mutate.py show FILE                               what no test finds, and what each test finds alone
+usage: mutate.py draw COUNT FILE [--seed N] [--jobs N] [--first] [--commit C]
+                                      draws changes, tries them and writes FILE
+       mutate.py again OLD FILE       tries the changes of OLD on the present tree; same options
+       mutate.py compare OLD FILE     fails if one that was found is found no more
+       mutate.py show FILE            what no test finds, and what each test finds alone
+
+With --first the first test that finds a change is enough, which takes half the time.
 
 A change is one operator, condition, constant, statement or text of a source of the library, the platform
 layer or the command. One that does not compile is not counted. Each worker has a copy of the committed
 tree in build/mutate, so the work tree is left alone. A FILE that is there already is gone on with. A change is told by its line and the line above it,
-and so is found again after others have moved it; `again` says which are gone.
+and so is found again after others have moved it; `again` says which are gone, and tries only what was found.
 """
 
 import argparse
 import collections
+import concurrent.futures
+import contextlib
 import json
 import os
 import pathlib
@@ -94,7 +99,8 @@ def place(change, root):
 class Worker:
     """A copy of the tree with a build of its own, in which one change after the other is tried."""
 
-    def __init__(self, number, commit):
+    def __init__(self, number, commit, first):
+        self.first = first
         self.root = COPIES / str(number)
         self.build = self.root / "build/tests"
         if not self.root.exists():
@@ -130,10 +136,11 @@ class Worker:
         failing = []
         for _ in range(4):
             without = "-" + ":".join(failing) if failing else "*"
-            status, output = self.call(self.build / "bin" / program, f"--gtest_filter={without}", seconds=LIMIT)
+            status, output = self.call(self.build / "bin" / program, f"--gtest_filter={without}",
+                                       *["--gtest_fail_fast"] * self.first, seconds=LIMIT)
             failing += re.findall(r"^\[  FAILED  \] (\S+) \(", output, re.MULTILINE)
             begun = re.findall(r"^\[ RUN      \] (\S+)", output, re.MULTILINE)
-            if status in (0, 1) or not begun or begun[-1] in failing:
+            if self.first and failing or status in (0, 1) or not begun or begun[-1] in failing:
                 return failing + (["start"] if not begun else [])
             failing.append(begun[-1])
         return failing
@@ -145,8 +152,13 @@ class Worker:
 
     def finders(self):
         """The tests that fail, of all but those that take long."""
-        found = [test for program in PROGRAMS for test in self.failures_of(program)]
-        return sorted(found + self.scripts("-L", "quick"))
+        found = []
+        for program in PROGRAMS:
+            if not (self.first and found):
+                found += self.failures_of(program)
+        if not (self.first and found):
+            found += self.scripts("-L", "quick")
+        return sorted(found)
 
     def attempt(self, change):
         """The tests that find the change, or None if it can't be made or does not compile."""
@@ -154,19 +166,29 @@ class Worker:
         if where is None:
             return None
         path, number = where
-        before = path.read_text()
-        lines = before.split("\n")
+        lines = path.read_text().split("\n")
         shift = len(lines[number]) - len(lines[number].lstrip()) - len(change["line"]) + len(change["line"].lstrip())
         start, end = change["start"] + shift, change["end"] + shift
         lines[number] = lines[number][:start] + change["by"] + lines[number][end:]
         if change["kind"] == "condition" and change["by"] == "!":
             close = closing(lines[number], start)
             lines[number] = lines[number][:start] + "!(" + lines[number][start + 1:close] + ")" + lines[number][close:]
-        path.write_text("\n".join(lines))
-        try:
+        with self.saved(path):
+            path.write_text("\n".join(lines))
             return self.finders() if self.make() else None
+
+    @contextlib.contextmanager
+    def saved(self, path):
+        """Puts a source and its object back, so that it is not compiled again for the next change."""
+        text, times = path.read_text(), (path.stat().st_atime_ns, path.stat().st_mtime_ns)
+        objects = {file: file.read_bytes() for file in self.build.rglob(f"{path.name}.o")}
+        try:
+            yield
         finally:
-            path.write_text(before)
+            path.write_text(text)
+            os.utime(path, ns=times)
+            for file, content in objects.items():
+                file.write_bytes(content)
 
 
 def closing(line, start):
@@ -179,7 +201,14 @@ def closing(line, start):
     return len(line)
 
 
-def try_all(changes, count, file, jobs):
+def make_workers(arguments):
+    commit = subprocess.run(["git", "rev-parse", arguments.commit], cwd=ROOT, check=True, capture_output=True,
+                            text=True).stdout.strip()
+    with concurrent.futures.ThreadPoolExecutor() as pool:
+        return list(pool.map(lambda number: Worker(number, commit, arguments.first), range(arguments.jobs)))
+
+
+def try_all(workers, changes, count, file):
     """Tries changes until `count` of them compiled, and writes each result as soon as it is there."""
     waiting, lock = queue.SimpleQueue(), threading.Lock()
     file = pathlib.Path(file)
@@ -200,8 +229,6 @@ def try_all(changes, count, file, jobs):
                     print(f"{len(results)}/{count} {change['path']}: {change['kind']}: "
                           f"{' '.join(found[:3]) or 'NOT FOUND'}", flush=True)
 
-    commit = subprocess.run(["git", "rev-parse", "HEAD"], cwd=ROOT, check=True, capture_output=True, text=True).stdout
-    workers = [Worker(number, commit.strip()) for number in range(jobs)]
     threads = [threading.Thread(target=work, args=(worker,)) for worker in workers]
     for thread in threads:
         thread.start()
@@ -222,14 +249,15 @@ def told(change):
 
 def compare(old, new):
     found = {key(change): change["found_by"] for change in new}
-    gone = [change for change in old if key(change) not in found]
-    lost = [change for change in old if change["found_by"] and not found.get(key(change), ["gone"])]
+    known = [change for change in old if change["found_by"]]
+    gone = [change for change in known if key(change) not in found]
+    lost = [change for change in known if not found.get(key(change), ["gone"])]
     for change in gone:
         print(f"gone: {told(change)}")
     for change in lost:
         print(f"not found any more: {told(change)}\n    was found by {', '.join(change['found_by'])}")
-    for name, changes in (("before", old), ("now", new)):
-        print(f"{name}: {sum(bool(change['found_by']) for change in changes)} of {len(changes)} changes found")
+    print(f"{len(known)} of {len(old)} changes were found; {len(gone)} of them are gone, and {len(lost)} are "
+          f"found no more")
     return 1 if lost else 0
 
 
@@ -241,6 +269,7 @@ def show(changes):
         for test in change["found_by"]:
             all_of[test] += 1
             alone[test] += len(change["found_by"]) == 1
+    print(f"{sum(bool(change['found_by']) for change in changes)} of {len(changes)} changes are found")
     for test, number in sorted(all_of.items()):
         print(f"{test} finds {number}, {alone[test]} of them alone")
 
@@ -251,18 +280,23 @@ def main():
     parser.add_argument("words", nargs="+")
     parser.add_argument("--seed", type=int, default=1)
     parser.add_argument("--jobs", type=int, default=2)
+    parser.add_argument("--first", action="store_true")
+    parser.add_argument("--commit", default="HEAD")
     arguments = parser.parse_args()
+    files = arguments.words
     if arguments.verb == "draw":
-        count, file = arguments.words
-        changes = list(candidates(ROOT))
+        workers = make_workers(arguments)
+        changes = list(candidates(workers[0].root))
         print(f"{len(changes)} places")
         random.Random(arguments.seed).shuffle(changes)
-        return 0 if len(try_all(changes, int(count), file, arguments.jobs)) == int(count) else 1
-    first, *rest = (json.loads(pathlib.Path(file).read_text()) for file in
-                    (arguments.words if arguments.verb != "again" else arguments.words[:1]))
+        return 0 if len(try_all(workers, changes, int(files[0]), files[1])) == int(files[0]) else 1
+    old = json.loads(pathlib.Path(files[0]).read_text())
+    if arguments.verb == "show":
+        return show(old)
     if arguments.verb == "again":
-        return compare(first, try_all(first, len(first), arguments.words[1], arguments.jobs))
-    return compare(first, *rest) if arguments.verb == "compare" else show(first)
+        found = [change for change in old if change["found_by"]]
+        try_all(make_workers(arguments), found, len(found), files[1])
+    return compare(old, json.loads(pathlib.Path(files[1]).read_text()))
 
 
 if __name__ == "__main__":

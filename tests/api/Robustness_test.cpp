@@ -16,6 +16,7 @@
 #include "AllocationFault.h"
 #include "MessageRecorder.h"
 #include "OrdinaryUser.h"
+#include "Outcome.h"
 #include "RepositoryBuilder.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary.h"
@@ -190,8 +191,8 @@ TEST_F(Request, PassesAnyWordUnharmed) {
     EXPECT_FALSE(ip->GetPortProperty(core, core, value));
     EXPECT_THAT(recorder.Take(), ElementsAre(testing::HasSubstr("Cannot find Port " + word +
                                                                 " Property " + word + "\n")));
-    EXPECT_EQ(Thrown([&] { Kel_Index().GetIPLocation(Kel_Key(core)); }),
-              "0 Cannot find IP index entry for " + word + "\n");
+    EXPECT_EQ(Outcome([&] { Kel_Index().GetIPLocation(Kel_Key(core)); }),
+              "not found: Cannot find IP index entry for " + word + "\n");
   }
 }
 

@@ -5,7 +5,6 @@
 #include <vector>
 
 #include "Port_MsgManData.h"
-#include "Tarvo_AppException.h"
 
 // Catches all messages, and the traces too while asked for, from its making to its end. The one
 // place that knows how both are caught. Each entry is one text:
@@ -36,16 +35,5 @@ class MessageRecorder {
   std::vector<int> lines;
   std::vector<std::string> inputs;
 };
-
-// The exception that comes out of the work, as its level and text: "1 Invalid LDX a.ldx\n".
-template <class Work>
-std::string Thrown(const Work& work) {
-  try {
-    work();
-    return "nothing";
-  } catch (const Tarvo::AppException& exception) {
-    return std::to_string(exception.level) + " " + exception.what();
-  }
-}
 
 #endif
