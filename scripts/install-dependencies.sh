@@ -7,7 +7,7 @@ declare -A groups=(
   [build]="g++ cmake ninja-build pkg-config libboost-filesystem-dev libpcre2-dev libcli11-dev
           nlohmann-json3-dev"
   [test]="libgtest-dev libgmock-dev libbenchmark-dev"
-  [tools]="ghdl iverilog verilator yosys tcl python3-jsonschema"
+  [tools]="ghdl iverilog verilator yosys tcl python3-jsonschema zsh fish"
   [package]="dpkg-dev file libgtest-dev libgmock-dev"
   [check]="clang clang-format clang-tidy libclang-rt-14-dev git python3 valgrind
           doxygen"
