@@ -301,6 +301,7 @@ void DescriptionChecker::CheckKey(QVRStatement::Keyword keyword, const std::vect
   if (Contains(keys.known, key)) return;
   const StringBase meant = FindMisspelt(key, keys.known);
   if (meant.GetLength() == 0) return;
+  // Options and properties are two words for people.
   const char* const kind = keyword == QVRStatement::Option ? "option " : "property ";
   Tell(Codes::kUnknownProperty, key, Say({"unknown ", kind, "'", key, "'"}),
        Say({"did you mean ", meant.View(), "?"}));
@@ -390,6 +391,7 @@ void DescriptionChecker::AddParameter(const QVRStatement::List& list) {
 // Each name once, with the other places that name it. A bad statement may be the one that declares
 // what is missing.
 void DescriptionChecker::TellMentions() const {
+  // Sorted by name, so that the order does not depend on a hash.
   std::map<std::pair<QVRStatement::Keyword, StringBase>, KelDiagnostic> missing;
   for (const Mention& mention : mentions) {
     const std::pair key(mention.declaredBy, mention.name);

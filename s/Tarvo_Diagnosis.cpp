@@ -51,6 +51,7 @@ KelDiagnosticLog::KelDiagnosticLog()
 KelDiagnosticLog::~KelDiagnosticLog() = default;
 
 std::vector<KelDiagnostic> KelDiagnosticLog::Take() const {
+  // Handed over, so that each is taken once.
   return std::exchange(collector->found, {});
 }
 

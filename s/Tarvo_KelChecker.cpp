@@ -32,6 +32,7 @@ namespace {
 
 namespace fs = boost::filesystem;
 
+// By place, so that findings come in the order in which a reader of the files meets them.
 auto Rank(const KelDiagnostic& diagnostic) {
   const KelPlace& place = diagnostic.place;
   return std::tie(place.file, place.line, place.column, diagnostic.code, diagnostic.text);
@@ -123,6 +124,7 @@ void CheckRun::CheckCore(const StringBase& text) {
     key = index.GetIPKey(Kel_Key(text));
     location = index.GetIPLocation(key);
   } catch (const AppException&) {
+    // No file is to blame for a key that a caller made up.
     return TellFile(Codes::kUnknownLibrary, "", Say({"there is no core '", text.View(), "'"}));
   }
   const auto file = [&](const StringBase& extension) {
@@ -209,6 +211,7 @@ void CheckRun::FindUnlisted(const StringList& keys) {
     Collect([&] {
       FindUnlistedIn(hdl / Kel_Index::KEL_VHDL_SUBDIRECTORY.GetText(), {".vhd", ".vhdl"});
       FindUnlistedIn(hdl / Kel_Index::KEL_VERILOG_SUBDIRECTORY.GetText(), {".v"});
+      // Netlists have many extensions, so any file counts there.
       FindUnlistedIn(location / Kel_Index::KEL_NETLIST_SUBDIRECTORY.GetText(), {});
     });
   }

@@ -409,6 +409,7 @@ bool KelIP::GetNetlistProperty(const StringBase& netlist, const StringBase& prop
                  const TEWParser* const table = impl->GetTEWParser();
                  // The only property that netlists have.
                  if (!table || property != KEL_NETLIST_LIBRARY_PROPERTY) return false;
+                 // Only a netlist that applies at present has one.
                  value = table->GetFileLibrary(Port::FileName(netlist)).GetKey();
                  return true;
                });

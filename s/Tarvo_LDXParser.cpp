@@ -194,6 +194,7 @@ void OrderReader::CheckNesting() const {
   const auto same = std::find_if(open.begin(), open.end(), [&](const OpenOrder& outer) {
     return outer.core == core && (isRoot || *outer.file == *fileName);
   });
+  // The root is refused by its key, all others by file and core.
   if (isRoot || same != open.end()) {
     TellCircle(same == open.end() ? open.begin() : same);
     throw Report::Told(Circular(core));
@@ -400,6 +401,7 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
     kModule.Warning("The include directory %s for library %s does not exist\n", directory, library);
     return false;
   }
+  // Behind the question whether it exists: that one is asked in any case.
   if (!entry.rest.empty()) {
     TellIgnored(entry);
     return true;
@@ -414,6 +416,7 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
     kModule.Warning("Library %s already has path %s defined\n", library, known->location.GetName());
     return false;
   }
+  // The first directory of a library counts; it is never replaced.
   order.includeDirectories.push_back({libKey, location, fileName, MarkOf(entry.name)});
   return true;
 }

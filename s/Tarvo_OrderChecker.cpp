@@ -141,6 +141,7 @@ void OrderChecker::AddEdges(const AnalyseOrder& order, const Kel_Key& key) {
     for (const AnalyseOrder::Include& include : *includes) {
       cores.emplace(*include.file, *include.from);
       own[include.from->GetKey()].push_back({*include.core, include.mark.In(*include.file), true});
+      // A core that is included whole lists its own sources in its own file.
       cores.emplace(OrderFile(index, *include.core).GetName(), *include.core);
     }
   }
@@ -196,6 +197,7 @@ OrderChecker::Steps OrderChecker::FindSteps(const StringBase& top,
 void OrderChecker::CheckVersionsOf(const StringBase& top) {
   std::vector<StringBase> met;
   const Steps steps = FindSteps(top, met);
+  // Every version that is older than the newest one met is told, with the way to both.
   std::map<StringBase, Kel_Key> newest;  // by the core's name
   for (const StringBase& text : met) {
     const Kel_Key key(text);

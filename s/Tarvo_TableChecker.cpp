@@ -119,6 +119,7 @@ unsigned TableChecker::FindHeader() {
     if (!TEWLine::ReadHeader(line, header, fault) || !header.isEnded) continue;
     const auto isKnown = [&](Text column) { return FindParameter(StringBase(column)) != nullptr; };
     if (std::all_of(header.names.begin(), header.names.end(), isKnown)) return number;
+    // A line that ends in FILES was meant for the header, whatever it names.
     if (first == 0) first = number;
   }
   return first;
@@ -132,6 +133,7 @@ void TableChecker::TellNoHeader(Text line) const {
   if (!hasNames) {
     return Diagnosis::Add([&] { return Diagnosis::Of(Codes::kBadHeader, name, text); });
   }
+  // FILES is the last word of a header, so the last name is the one to look at.
   const StringBase meant = FindMisspelt(header.names.back(), {"FILES"});
   const bool isMisspelt = meant.GetLength() > 0;
   Tell(Codes::kBadHeader, isMisspelt ? header.names.back() : line, text,

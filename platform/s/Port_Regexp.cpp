@@ -57,6 +57,7 @@ Port_Regexp::~Port_Regexp() = default;
 
 Port_Range Port_Regexp::GetRangeOfMatch(const char* text, unsigned start) const {
   const std::size_t length = std::strlen(text);
+  // Behind the end there is nothing to match, not even an empty text.
   if (start > length) return {};
   const std::unique_ptr<pcre2_match_data, Free> data(pcre2_match_data_create(1, nullptr));
   if (!data) throw std::bad_alloc();

@@ -125,6 +125,7 @@ String String::doFormat(const char* format, ...) {
   const int length = std::vsnprintf(brief.data(), brief.size(), format, arguments);
   va_end(arguments);
   if (length < 0) throw std::length_error("formatted text of more than 2 GiB");
+  // Formatted once more only if the short buffer was too small.
   const auto size = static_cast<std::size_t>(length);
   if (size < brief.size()) return String(std::string_view(brief.data(), size));
 

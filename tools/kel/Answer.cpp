@@ -1,3 +1,6 @@
+// An answer is made once, as a document; rows for people and scripts are read off it. So both can't
+// differ.
+
 #include "Answer.h"
 
 #include <unistd.h>

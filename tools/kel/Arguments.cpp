@@ -1,3 +1,6 @@
+// The rows of the verbs are turned into a description for the parser of command lines, and what
+// that one read into a Request. Only here is the parser known.
+
 #include "Arguments.h"
 
 #include <CLI/CLI.hpp>

@@ -1,3 +1,6 @@
+// The verb `check`. The library finds what is wrong; here it is narrowed to what was asked for,
+// sorted, judged and written.
+
 #include <unistd.h>
 
 #include <algorithm>
@@ -231,6 +234,7 @@ Status Check(const Tarvo::KelLibrary& /*unread*/, const Request& request) {
   for (const KelDiagnostic& diagnostic : found) ++counts.of.at(diagnostic.severity);
   Write(found, counts, request);
   if (!isComplete || keys.empty()) SuggestRepositories(request);
+  // A repository without cores is hardly the one that was meant.
   if (keys.empty() && globs.empty()) {
     Messages::Note("there is no core to check");
     return StatusUnreadable;

@@ -1,3 +1,6 @@
+// Completion for all shells: a shell hands over the words up to the cursor and gets what may stand
+// there. The rows of the verbs know it.
+
 #include <iostream>
 
 #include "Arguments.h"

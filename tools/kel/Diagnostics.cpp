@@ -1,3 +1,5 @@
+// A diagnostic is written as compilers write theirs, so that editors find the place.
+
 #include "Diagnostics.h"
 
 #include <unistd.h>

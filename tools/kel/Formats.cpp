@@ -1,3 +1,6 @@
+// How sources are written for tools. Each format escapes names as its reader wants them: a path may
+// hold any byte but NUL.
+
 #include "Formats.h"
 
 #include <unistd.h>

@@ -1,3 +1,6 @@
+// The verb `help`: texts that the parser makes of the rows, and the codes that the library
+// explains.
+
 #include <iostream>
 #include <sstream>
 

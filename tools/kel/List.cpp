@@ -1,3 +1,6 @@
+// The verb `list`: a row for each core, or each version, whose options can be read. What could not
+// be read shows in the exit status.
+
 #include "Text.h"
 #include "Verb.h"
 

@@ -1,3 +1,6 @@
+// What the library reports is shown as diagnostics where there are any, since these have places,
+// and as messages where not.
+
 #include "Messages.h"
 
 #include <unistd.h>

@@ -1,3 +1,6 @@
+// The verb `netlists`: parameters are set in the opened core alone, and then the library is asked
+// what applies.
+
 #include "Text.h"
 #include "Verb.h"
 

@@ -1,3 +1,6 @@
+// A log in the form that code hosts read. What is optional there is left out, unless a reader is
+// known to use it.
+
 #include "Sarif.h"
 
 #include <algorithm>
@@ -91,6 +94,7 @@ class Writer {
     Json region = {{"startLine", place.line}};
     const std::optional<std::string_view> line = lines.Find(place);
     if (place.column == 0 || !line || place.column > line->size() + 1) return region;
+    // Columns are characters here, cells for people and bytes in the library.
     const std::size_t start = CountCodePoints(line->substr(0, place.column - 1)) + 1;
     region["startColumn"] = start;
     if (place.length == 0) return region;

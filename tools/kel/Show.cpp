@@ -1,3 +1,5 @@
+// The verb `show`. A section is asked from the library as a document; tables are made of that.
+
 #include <algorithm>
 #include <filesystem>
 #include <iostream>

@@ -1,3 +1,4 @@
+// The verb `sources`: the library's order, handed to one of the formats.
 
 #include "Formats.h"
 #include "Tarvo_LDXParser.h"

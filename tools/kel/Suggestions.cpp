@@ -1,3 +1,6 @@
+// What somebody may have meant. Nothing here is an answer, so it may look at more than was asked
+// for.
+
 #include "Suggestions.h"
 
 #include <filesystem>

@@ -1,3 +1,6 @@
+// Texts as a terminal shows them: what a byte, a character and a cell are, and how a long line is
+// cut.
+
 #include "Text.h"
 
 #include <sys/ioctl.h>

@@ -1,3 +1,5 @@
+// What several verbs need: words of the command line, keys and patterns, the opened core.
+
 #include "Verb.h"
 
 #include <fnmatch.h>

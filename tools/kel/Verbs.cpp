@@ -1,3 +1,5 @@
+// The one place that knows all verbs.
+
 #include <algorithm>
 
 #include "Verb.h"

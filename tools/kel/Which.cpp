@@ -1,3 +1,6 @@
+// The verb `which`: what a key or a bare name stands for. Each is answered by itself, so that one
+// that is unknown costs the others nothing.
+
 #include "Suggestions.h"
 #include "Text.h"
 #include "Verb.h"
