@@ -39,7 +39,8 @@ Opening FindOption(const Words& options, const std::string& text) {
   const std::string name = text.substr(0, size);
   for (const Word* const option : options) {
     const bool isIt = !name.empty() && (option->name == name || option->letter == name);
-    if (isIt && !option->IsFlag()) return {option, holdsValue ? text.substr(0, size + isLong) : ""};
+    if (!isIt || option->IsFlag()) continue;
+    return {option, holdsValue ? text.substr(0, isLong ? size + 1 : size) : ""};
   }
   return {};
 }
@@ -112,7 +113,7 @@ Status Complete(const std::vector<std::string>& words) try {
   // argument.
   if (open.option != nullptr && open.lead.empty()) {
     Write(ValuesOf(*open.option, request), "", text);
-  } else if (!own.lead.empty()) {
+  } else if (own.option != nullptr && !own.lead.empty()) {
     Write(ValuesOf(*own.option, request), own.lead, text);
   } else {
     Write(text.starts_with('-') ? NamesOf(options) : Arguments(request), "", text);
