@@ -22,10 +22,10 @@ namespace Tarvo {
 // directory. It is made in two ways. An entry's source is looked up by the name as the entry writes
 // it; a source that comes from another core's order, and one that a caller asks for, by what its
 // location tells. Both give the same text but for odd names, such as one with a doubled slash: then
-// entry and location are keyed apart, and what is the same file counts as two.
+// entry and location have different keys, and one file counts as two.
 class AnalyseOrder {
  public:
-  // What the sources of one entry after another mostly share.
+  // What the sources of consecutive entries usually have in common.
   struct Origin {
     std::shared_ptr<const Kel_Key> library;
     std::shared_ptr<const StringBase> file;  // that lists them
@@ -58,8 +58,8 @@ class AnalyseOrder {
   // The sources for one purpose, library by library. No library is without sources.
   class SourceList {
    public:
-    // Adds a source under the key of its entry. If that is there already, gives the source that has
-    // it, and nothing changes; else null.
+    // Adds a source under the key of its entry, and gives null. If the key is there already, gives
+    // the source that has it, and nothing changes.
     const Source* Add(const SourcePointer& source);
     // Adds the sources of another list, which is of no use afterwards, under the keys of their
     // locations. Gives those whose keys were there.

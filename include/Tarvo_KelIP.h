@@ -26,7 +26,7 @@ class KelIPImpl;
 // Results: true with the output replaced by the answer, which may be empty; false with an empty
 // output, and a message that says why. Get operations on a record's property and
 // SetParameterProperty issue a warning, all others an error; what arrives without a text of its own
-// is always an error. Where there may be false without a message, it is said so. An argument may be
+// is always an error. Operations that may give false without a message say so. An argument may be
 // the output itself or lie in it.
 //
 // Failures: the constructor and the operations that say so throw; all others throw nothing. A
@@ -118,9 +118,9 @@ class TARVO_EXPORT KelIP {
   bool ListIOInterfaceParameters(const StringBase& interface, StringList& list) const;
   bool ListIOInterfacePorts(const StringBase& interface, StringList& list) const;
 
-  // HDL sources, of a core whose option STYLE is HDL, as it is by default, or MIX, in any letter
-  // case. Any other core has none: false without a message. The analyse order is read by the first
-  // question that needs it (see LDXParser); if that fails, the next question tries again.
+  // Only a core whose option STYLE is HDL, the default, or MIX has HDL sources; letter case does
+  // not matter. Any other core has none: false without a message. The analyse order is read by the
+  // first question that needs it (see LDXParser); if that fails, the next question tries again.
   //
   // Absolute paths of the sources in analyse order (compile order), and absolute directories of the
   // libraries that they belong to, in the same order.
@@ -148,8 +148,8 @@ class TARVO_EXPORT KelIP {
   // each once.
   bool ListNetlists(StringList& list) const;
   bool ListNetlistLibraries(StringList& list) const;
-  // LIBRARY is the key of the library that a netlist belongs to; an error for a netlist that does
-  // not apply, which ListNetlistProperties reports so too. False without a message for any other
+  // LIBRARY is the key of the library that a netlist belongs to; a netlist that does not
+  // apply is an error, here and in ListNetlistProperties. False without a message for any other
   // property; the list is that one name.
   bool GetNetlistProperty(const StringBase& netlist, const StringBase& property,
                           StringBase& value) const;

@@ -87,10 +87,10 @@ class TARVO_EXPORT LDXParser {
   // LDX_HDL_VHDL, or empty.
   StringBase GetFileLanguage(const Port::FileName& file) const;
 
-  // The library of a listed source, found by the levels of its path from the version's directory
-  // on, which must bear the key's normal text. An invalid, empty key for any other file, for a
-  // source in a directory of its own that is named `vhdl` or `verilog`, and for one whose entry
-  // names it with a slash at either end or with a doubled one.
+  // The library of a listed source. It is found by the part of the path that begins with the
+  // version's directory, whose name must be the key in its normal spelling. An invalid, empty key
+  // for any other file, for a source within a further directory named `vhdl` or `verilog`, and for
+  // one whose entry names it with a slash at either end or with `//`.
   Kel_Key GetFileLibrary(const Port::FileName& file) const;
 
   // The absolute path of a library's Verilog include directory: the one that an entry gives it, or

@@ -90,8 +90,8 @@ FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
   throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", file.GetName()));
 }
 
-// A file may be read for a core that is in no index.
-// The key as the index stores it, or as it is if the index does not know it.
+// The key as the index stores it, or as it is if the index does not know it: a file may be read for
+// a core that is in no index.
 Kel_Key Resolve(const Kel_Index& index, const Kel_Key& key) {
   try {
     return index.GetIPKey(key);
@@ -306,9 +306,8 @@ bool OrderReader::AddFile(const LDXEntry& entry) {
   return true;
 }
 
-// A language that can't count costs the source that it stands behind. Where nobody knows what a
-// source is, compiling the others would only hide that.
-// Says what is wrong with a file entry. True if that costs the entry alone.
+// Says what is wrong with a file entry. True if only this source is lost, as for a language that
+// can't count. Where nobody knows what a source is, compiling the others would only hide that.
 bool OrderReader::ReportUnsettled(const LDXEntry& entry, const SourceLanguage& settled) const {
   const StringBase file(entry.name);
   const std::string_view language = entry.language;

@@ -18,8 +18,8 @@ TokenReader Cut(std::string_view line) {
   return TokenReader(line, kDelimiters, TokenReader::WithoutGroups);
 }
 
-// A comma that nothing follows is left to the rest, for who tells of it.
-// Goes behind a comma that something follows. False at the end of a row's netlists.
+// Goes behind a comma that something follows. False at the end of a row's netlists; a comma that
+// nothing follows belongs to the rest.
 bool NextNetlist(TokenReader& tokens, Row& row) {
   if (!tokens.MoreTokens()) return false;
   const std::string_view rest = tokens.GetRest();
