@@ -93,6 +93,7 @@ bool KelLibraryImpl::AddRepository(const StringBase& repository) {
 // Passes over what is no version. A description that can't be read costs the version its options,
 // and nobody else anything.
 bool KelLibraryImpl::AddVersion(const fs::directory_entry& entry) {
+  // A look at the name costs nothing; only what may be a version is looked at on disk.
   const Kel_Key key(StringBase(entry.path().filename().c_str()));
   if (!key.IsValid() || !MayBeVersion(entry)) return true;
   Port::FileName location;

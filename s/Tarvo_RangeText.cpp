@@ -85,6 +85,7 @@ class Expression {
   bool PassProduct() {
     return PassList("*/%", [&] { return PassFactor(); });
   }
+  // A sign may stand before a bracket too.
   bool PassFactor() {
     Pass('-');
     if (!Pass('(')) return PassWord();
@@ -98,6 +99,7 @@ class Expression {
     const auto* const end = std::find_if_not(rest.begin(), rest.end(), IsWordChar);
     const std::string_view word = rest.substr(0, static_cast<std::size_t>(end - rest.begin()));
     rest.remove_prefix(word.size());
+    // What begins with a digit is a number, whatever follows.
     if (!word.empty() && !IsDigit(word.front())) result.names.push_back(word);
     return !word.empty();
   }

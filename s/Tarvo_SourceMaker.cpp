@@ -26,6 +26,7 @@ void SourceMaker::EnterLibrary(std::string_view entered) {
 }
 
 void SourceMaker::EnterDirectory(const SourceLanguage& settled) {
+  // Sources of one file, library and language share what they have in common.
   if (!origin || origin->language != settled.language) {
     origin = std::make_shared<const AnalyseOrder::Origin>(
         AnalyseOrder::Origin{library, file, settled.language});

@@ -50,6 +50,7 @@ std::string TomlString(const std::string& text) {
   return quoted;
 }
 
+// Braces would need no escapes, but can't hold a path with a brace that nothing closes.
 std::string TclWord(const std::string& text) {
   std::string word = Backslashed(text, "\\\"$[]{}");
   for (std::size_t at; (at = word.find('\n')) != std::string::npos;) word.replace(at, 1, "\\n");
@@ -57,6 +58,7 @@ std::string TclWord(const std::string& text) {
 }
 
 // A pattern that stands for this path alone.
+// That configuration takes patterns, and a path may hold their characters.
 std::string GlobLiteral(const std::string& path) {
   std::string pattern;
   for (const char c : path) {
@@ -66,6 +68,7 @@ std::string GlobLiteral(const std::string& path) {
   return pattern;
 }
 
+// Through a table, so that a terminal is shown each name on one line.
 void WriteList(std::ostream& output, const SourceList& list) {
   Table table;
   for (const Source& source : list.sources) table.Add({source.path});
@@ -180,6 +183,7 @@ void WriteVhdlLs(std::ostream& output, const SourceList& list) {
   if (open) output << "]\n";
 }
 
+// Only words and no calls, so that a tool may read it with `source` and do with it what it likes.
 void WriteTcl(std::ostream& output, const SourceList& list) {
   output << "# Each source is a dict of library, language and path.\nset kel_sources {}\n";
   for (const Source& source : list.sources) {

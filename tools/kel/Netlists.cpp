@@ -60,6 +60,7 @@ Status AnswerList(const KelIP& ip, const Request& request) {
   }
   WriteAnswer(request, {{"key", Text(ip.GetKey())}, {"netlists", netlists}},
               TableOf(netlists, {"path"}));
+  // Asked again, since an empty list may also mean that the style has no netlists at all.
   Tarvo::StringList libraries;
   const bool hasTable = ip.ListNetlistLibraries(libraries);
   if (paths.empty() && hasTable) {

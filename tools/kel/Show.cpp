@@ -86,6 +86,8 @@ Json Parameters(const KelIP& ip) {
 }
 
 // The interfaces that a port names, bus interfaces first.
+// As the port writes them, whether anything declares them or not: `check` tells of those that
+// nobody does.
 Json InterfacesOf(const Json& port) {
   Json names = Json::array();
   for (const StringBase* key : {&QVRParser::QVR_BUS_IF_NAME, &QVRParser::QVR_IO_IF_NAME}) {
@@ -121,6 +123,7 @@ struct InterfaceKind {
   ListOf listParameters;
   ListOf listPorts;
 };
+// In the order in which they are shown.
 const InterfaceKind kInterfaceKinds[] = {
     {"bus", &KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceProperties,
      &KelIP::GetBusInterfaceProperty, &KelIP::ListBusInterfaceParameters,

@@ -9,6 +9,7 @@ namespace {
 
 using Tarvo::StringBase;
 
+// A key is shown in its normal spelling also if it was given in capitals.
 StringBase Resolve(const Tarvo::KelLibrary& library, const StringBase& text) {
   const Tarvo::Kel_Key key(text);
   return key.IsValid() ? key.GetKey() : library.GetLatestIPKey(text);
