@@ -240,7 +240,8 @@ def main():
     environment = dict(os.environ, PATH=f"{ROOT / build / 'bin'}:{os.environ['PATH']}")
     if "--update" in sys.argv:
         page = ROOT / "docs/kel.1"
-        return page.write_text(with_help(page.read_text(), environment)) * 0
+        page.write_text(with_help(page.read_text(), environment))
+        return 0
     faults = [fault for name in DOCUMENTS + TRANSCRIPTS for fault in document_faults(name, environment)]
     faults += [*code_faults(environment), *help_faults(environment)]
     if "--calls" not in sys.argv:
