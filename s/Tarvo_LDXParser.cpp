@@ -16,7 +16,6 @@
 #include "Port_Input.h"
 #include "Tarvo_AnalyseOrderReader.h"
 #include "Tarvo_Existence.h"
-#include "Tarvo_FileKey.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_Guard.h"
 #include "Tarvo_Kel_Index.h"
