@@ -14,6 +14,8 @@
 
 namespace Tarvo {
 
+struct OrderPart;
+
 // An analyse order (a compile order, as many say): the sources for synthesis and for simulation,
 // the Verilog include directories, and the cores that were taken in. A plain value that LDXParser
 // fills and answers from; callers ask that class.
@@ -30,6 +32,7 @@ class AnalyseOrder {
     std::shared_ptr<const Kel_Key> library;
     std::shared_ptr<const StringBase> file;  // that lists them
     StringBase language;                     // as settled
+    StringBase directory;                    // of the language
   };
   // Where on its file an entry names what it adds.
   struct Mark {
@@ -39,16 +42,22 @@ class AnalyseOrder {
     unsigned column;
     unsigned length;
   };
-  struct Source {
-    std::shared_ptr<const Origin> origin;
+  // What only a source with an odd name has.
+  struct OddName {
     Port::FileName location;
-    StringBase fileKey;   // by its location
-    StringBase entryKey;  // by its entry, if that is another text
+    StringBase entryKey;  // its file key by its entry
+  };
+  struct Source {
+    Port::FileName GetLocation() const;
+    const StringBase& GetEntryKey() const { return odd ? odd->entryKey : fileKey; }
+
+    const Origin* origin;
+    StringBase fileKey;  // by its location
+    unsigned nameAt;     // where in that key its name below the language's directory begins
+    std::unique_ptr<const OddName> odd;
     Mark mark;
   };
-  // Made once, and then handed from order to order.
-  using SourcePointer = std::shared_ptr<const Source>;
-  using SourcePointers = std::vector<SourcePointer>;
+  using SourcePointers = std::vector<const Source*>;
 
   struct Library {
     std::shared_ptr<const Kel_Key> key;
@@ -60,22 +69,21 @@ class AnalyseOrder {
    public:
     // Adds a source under the key of its entry, and gives null. If the key is there already, gives
     // the source that has it, and nothing changes.
-    const Source* Add(const SourcePointer& source);
-    // Adds the sources of another list, which is of no use afterwards, under the keys of their
-    // locations. Gives those whose keys were there.
-    SourcePointers Append(SourceList& other);
+    const Source* Add(const Source& source);
+    // Adds the sources of another list under the keys of their locations. Gives those whose keys
+    // were there.
+    SourcePointers Append(const SourceList& other);
     // The source with that file key, or null.
     const Source* Find(const StringBase& fileKey) const;
 
     std::vector<Library> libraries;
 
    private:
-    void AppendSource(const SourcePointer& source);
+    void AppendSource(const Source& source);
 
     // Views of the texts in keys and sources that the libraries hold.
     std::unordered_map<std::string_view, std::size_t> libraryIndex;    // by the key's text
     std::unordered_map<std::string_view, const Source*> sourcesByKey;  // by file key
-    bool isKeyedByLocation = true;  // whether all keys of sourcesByKey are those of locations
   };
 
   struct IncludeDirectory {
@@ -96,6 +104,8 @@ class AnalyseOrder {
 
   // What stood in the lists already; null where the source is new or was not to be added.
   struct Earlier {
+    explicit operator bool() const { return synthesis || simulation; }
+
     const Source* synthesis = nullptr;
     const Source* simulation = nullptr;
   };
@@ -107,25 +117,30 @@ class AnalyseOrder {
     bool isParted = false;
   };
 
-  Earlier Add(const SourcePointer& source, bool forSynthesis, bool forSimulation);
-  // Takes over the sources and include directories of another order. A library keeps the directory
-  // that it was given first.
-  Known Append(AnalyseOrder&& other);
+  Earlier Add(const Source& source, bool forSynthesis, bool forSimulation);
+  // Adds a directory and gives null; gives the one that its library has already, which stays.
+  const IncludeDirectory* Add(const IncludeDirectory& directory);
+  // Adds the sources and include directories of another order.
+  Known Append(const AnalyseOrder& other);
 
+  bool IsEmpty() const;
   const IncludeDirectory* FindIncludeDirectory(const Kel_Key& library) const;
 
   const SourceList& GetSynthesis() const { return synthesis; }
   const SourceList& GetSimulation() const { return simulation ? *simulation : synthesis; }
 
-  std::vector<IncludeDirectory> includeDirectories;
+  std::vector<const IncludeDirectory*> includeDirectories;
   std::vector<Include> includes;  // of the core's own file, in the order of its lines
   std::vector<Include> further;   // of the files below; for a checker alone
+  // What was read, which holds all that the lists point at.
+  std::vector<std::shared_ptr<const OrderPart>> parts;
 
  private:
   void PartLists();
 
   SourceList synthesis;
   std::unique_ptr<SourceList> simulation;  // null while it is the same as for synthesis
+  std::unordered_map<std::string_view, const IncludeDirectory*> directoriesByLibrary;
 };
 
 }  // namespace Tarvo

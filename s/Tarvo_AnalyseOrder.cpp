@@ -1,27 +1,32 @@
-// Merging is what an analysis spends its time on, so nothing here copies a source: lists hold
-// shared pointers, tables hold views of texts that the sources own, and synthesis and simulation
-// are one list until they differ.
+// An order is what its cores' parts add up to, so nothing here copies a source: lists hold pointers
+// and tables hold views of what the parts own, and synthesis and simulation are one list until they
+// differ.
 
 #include "Tarvo_AnalyseOrder.h"
 
-#include <algorithm>
 #include <utility>
 
 namespace Tarvo {
 
-const AnalyseOrder::Source* AnalyseOrder::SourceList::Add(const SourcePointer& source) {
-  const bool sameKey = source->entryKey.GetLength() == 0;
-  const StringBase& fileKey = sameKey ? source->fileKey : source->entryKey;
-  const auto [known, isNew] = sourcesByKey.try_emplace(fileKey.View(), source.get());
+// The text behind the library, which for all but odd names is that of the path below the directory.
+Port::FileName AnalyseOrder::Source::GetLocation() const {
+  if (odd) return odd->location;
+  StringBase name = origin->directory;
+  name.Append("/");
+  name.Append(fileKey.GetText() + nameAt);
+  return Port::FileName(name);
+}
+
+const AnalyseOrder::Source* AnalyseOrder::SourceList::Add(const Source& source) {
+  const auto [known, isNew] = sourcesByKey.try_emplace(source.GetEntryKey().View(), &source);
   if (!isNew) return known->second;
   AppendSource(source);
-  isKeyedByLocation = isKeyedByLocation && sameKey;
   return nullptr;
 }
 
 // Most sources follow one of the same library, so that its text is seldom looked up.
-void AnalyseOrder::SourceList::AppendSource(const SourcePointer& source) {
-  const std::shared_ptr<const Kel_Key>& library = source->origin->library;
+void AnalyseOrder::SourceList::AppendSource(const Source& source) {
+  const std::shared_ptr<const Kel_Key>& library = source.origin->library;
   std::size_t position = libraries.size() - 1;
   // The pointers are compared: sources that are made one after another share the key.
   if (libraries.empty() || libraries.back().key != library) {
@@ -30,32 +35,15 @@ void AnalyseOrder::SourceList::AppendSource(const SourcePointer& source) {
     if (isNew) libraries.push_back({library, {}});
     position = known->second;
   }
-  libraries[position].sources.push_back(source);
+  libraries[position].sources.push_back(&source);
 }
 
-// Where both tables hold the same kind of keys, the entries that are new here come over without
-// being made again, and those that are known stay behind in the other table.
-AnalyseOrder::SourcePointers AnalyseOrder::SourceList::Append(SourceList& other) {
+AnalyseOrder::SourcePointers AnalyseOrder::SourceList::Append(const SourceList& other) {
   SourcePointers known;
-  if (libraries.empty() && other.isKeyedByLocation) {
-    *this = std::move(other);
-    return known;
-  }
-  if (other.isKeyedByLocation) sourcesByKey.merge(other.sourcesByKey);
-  // Nothing of the other list is here yet, so its libraries come over whole.
-  const bool allNew = other.isKeyedByLocation && other.sourcesByKey.empty();
-  for (Library& library : other.libraries) {
-    if (allNew && libraryIndex.try_emplace(library.key->GetKey().View(), libraries.size()).second) {
-      libraries.push_back(std::move(library));
-      continue;
-    }
-    for (const SourcePointer& source : library.sources) {
-      const std::string_view fileKey = source->fileKey.View();
-      const bool isNew = other.isKeyedByLocation
-                             ? other.sourcesByKey.find(fileKey) == other.sourcesByKey.end()
-                             : sourcesByKey.try_emplace(fileKey, source.get()).second;
-      if (isNew) {
-        AppendSource(source);
+  for (const Library& library : other.libraries) {
+    for (const Source* const source : library.sources) {
+      if (sourcesByKey.try_emplace(source->fileKey.View(), source).second) {
+        AppendSource(*source);
       } else {
         known.push_back(source);
       }
@@ -69,7 +57,7 @@ const AnalyseOrder::Source* AnalyseOrder::SourceList::Find(const StringBase& fil
   return found == sourcesByKey.end() ? nullptr : found->second;
 }
 
-AnalyseOrder::Earlier AnalyseOrder::Add(const SourcePointer& source, bool forSynthesis,
+AnalyseOrder::Earlier AnalyseOrder::Add(const Source& source, bool forSynthesis,
                                         bool forSimulation) {
   if (forSynthesis != forSimulation) PartLists();
   Earlier earlier;
@@ -82,30 +70,34 @@ AnalyseOrder::Earlier AnalyseOrder::Add(const SourcePointer& source, bool forSyn
   return earlier;
 }
 
-AnalyseOrder::Known AnalyseOrder::Append(AnalyseOrder&& other) {
+const AnalyseOrder::IncludeDirectory* AnalyseOrder::Add(const IncludeDirectory& directory) {
+  const auto [known, isNew] =
+      directoriesByLibrary.try_emplace(directory.library.GetKey().View(), &directory);
+  if (!isNew) return known->second;
+  includeDirectories.push_back(&directory);
+  return nullptr;
+}
+
+AnalyseOrder::Known AnalyseOrder::Append(const AnalyseOrder& other) {
   // One list for both purposes goes on only while neither side has told them apart.
-  if (simulation || other.simulation) {
-    PartLists();
-    other.PartLists();
-  }
+  if (other.simulation) PartLists();
   Known known;
-  known.synthesis = synthesis.Append(other.synthesis);
+  known.synthesis = synthesis.Append(other.GetSynthesis());
   known.isParted = simulation != nullptr;
-  if (known.isParted) known.simulation = simulation->Append(*other.simulation);
-  for (IncludeDirectory& directory : other.includeDirectories) {
-    if (!FindIncludeDirectory(directory.library)) {
-      includeDirectories.push_back(std::move(directory));
-    }
-  }
+  if (known.isParted) known.simulation = simulation->Append(other.GetSimulation());
+  for (const IncludeDirectory* const directory : other.includeDirectories) Add(*directory);
   return known;
+}
+
+bool AnalyseOrder::IsEmpty() const {
+  return GetSynthesis().libraries.empty() && GetSimulation().libraries.empty() &&
+         includeDirectories.empty();
 }
 
 const AnalyseOrder::IncludeDirectory* AnalyseOrder::FindIncludeDirectory(
     const Kel_Key& library) const {
-  const auto found =
-      std::find_if(includeDirectories.begin(), includeDirectories.end(),
-                   [&](const IncludeDirectory& entry) { return entry.library == library; });
-  return found == includeDirectories.end() ? nullptr : &*found;
+  const auto found = directoriesByLibrary.find(library.GetKey().View());
+  return found == directoriesByLibrary.end() ? nullptr : found->second;
 }
 
 // From here on the list for simulation is its own.

@@ -40,12 +40,6 @@ void AppendLevels(StringBase& text, std::string_view path) {
   }
 }
 
-void AppendExtension(StringBase& name, const StringBase& extension) {
-  if (extension.GetLength() == 0) return;
-  name.Append(".");
-  name.Append(extension);
-}
-
 }  // namespace
 
 // Upwards from the file to the directory of a language. Above that stands `hdl`, whatever it is
@@ -73,9 +67,15 @@ StringBase OfEntry(const Kel_Key& library, const StringBase& file,
                    const StringBase& missingExtension) {
   StringBase fileKey = library.GetKey();
   fileKey.Append(kBetweenLibraryAndFile);
-  fileKey.Append(file.GetText());  // up to a NUL byte, where its name on disk ends too
-  AppendExtension(fileKey, missingExtension);
+  AppendName(fileKey, file, missingExtension);
   return fileKey;
+}
+
+void AppendName(StringBase& fileKey, const StringBase& file, const StringBase& missingExtension) {
+  fileKey.Append(file.GetText());
+  if (missingExtension.GetLength() == 0) return;
+  fileKey.Append(".");
+  fileKey.Append(missingExtension);
 }
 
 }  // namespace Tarvo::FileKey

@@ -17,6 +17,9 @@ StringBase OfLocation(const Port::FileName& location);
 StringBase OfEntry(const Kel_Key& library, const StringBase& file,
                    const StringBase& missingExtension);
 
+// Appends a name as an entry writes it: up to a NUL byte, where its name on disk ends too.
+void AppendName(StringBase& fileKey, const StringBase& file, const StringBase& missingExtension);
+
 }  // namespace Tarvo::FileKey
 
 #endif

@@ -1,12 +1,15 @@
 // The reader of analyse orders. A reader takes one file and makes a further one for each core that
 // is included whole; all of them share an Analysis.
+//
+// What a file adds is its part. Readers put their sources into one order as they come to them,
+// which is that of the root at the end. A core's own order is made only where somebody can tell:
+// where an entry might be listed twice in that core, and for traces.
 
 #include "Tarvo_LDXParser.h"
 
 #include <algorithm>
 #include <iterator>
 #include <memory>
-#include <set>
 #include <string>
 #include <string_view>
 #include <tuple>
@@ -22,6 +25,7 @@
 #include "Tarvo_LDXEntry.h"
 #include "Tarvo_LDXParser_Hdl.h"
 #include "Tarvo_OptionScanner.h"
+#include "Tarvo_OrderAnalysis.h"
 #include "Tarvo_Report.h"
 #include "Tarvo_SourceMaker.h"
 #include "Tarvo_TellFault.h"
@@ -36,30 +40,11 @@ namespace {
 using Diagnosis::Say;
 using Mark = AnalyseOrder::Mark;
 using Source = AnalyseOrder::Source;
-using SourcePointer = AnalyseOrder::SourcePointer;
 
 constexpr Report::Module kModule{"s/Tarvo_LDXParser", "1.0"};
 
 const char* const kSynthesis = "synthesis";
 const char* const kSimulation = "simulation";
-
-// Far above what libraries need, and far below what the stack of a thread has room for.
-constexpr unsigned kDeepestLevel = 1000;
-
-// A file that is being read, and the entry that it has come to.
-struct OpenOrder {
-  std::shared_ptr<const StringBase> file;
-  Kel_Key core;
-  Mark entry;
-};
-// The outermost first.
-using OpenOrders = std::vector<OpenOrder>;
-
-// What the readers of one analysis share.
-struct Analysis {
-  OpenOrders open;
-  std::set<StringBase> done;  // for a checker alone: the files that were read to their end
-};
 
 KelPlace PlaceOf(const OpenOrder& open) { return open.entry.In(*open.file); }
 
@@ -102,7 +87,7 @@ Kel_Key Resolve(const Kel_Index& index, const Kel_Key& key) {
 // Reads one file. An include makes a further reader, and both work on one list of open files.
 class OrderReader {
  public:
-  OrderReader(const Kel_Index& theIndex, Analysis& theAnalysis, const Kel_Key& version,
+  OrderReader(const Kel_Index& theIndex, OrderAnalysis& theAnalysis, const Kel_Key& version,
               const Kel_Key& theRoot, StringBase language, FileName theFile)
       : index(theIndex),
         analysis(theAnalysis),
@@ -115,11 +100,16 @@ class OrderReader {
         hdl(std::move(language)),
         ldxFile(std::move(theFile)),
         fileName(std::make_shared<const StringBase>(ldxFile.GetName())),
-        maker(index, fileName) {}
+        state(analysis.cores[core.GetKey()]),
+        order(analysis, open.empty()),
+        maker(index, fileName, order.GetPart()) {}
 
-  AnalyseOrder Read();
+  const OrderPart& Read();
+  // What was read, for the outermost reader.
+  AnalyseOrder TakeOrder();
 
  private:
+  void Close();
   void CheckNesting() const;
   void TellCircle(OpenOrders::const_iterator first) const;
   void Parse();
@@ -128,12 +118,13 @@ class OrderReader {
   [[gnu::noinline]] bool AddFile(const LDXEntry& entry);
   [[gnu::noinline]] bool AddDirectory(const LDXEntry& entry);
   bool AddLibrary(const LDXEntry& entry);
-  void AddSource(const LDXEntry& entry, const SourcePointer& source);
+  void AddSource(const LDXEntry& entry, const Source& source);
 
   StringBase LanguageOf(const Kel_Key& library) const;
 
-  void AddInclude(const StringBase& library, const Kel_Key& libKey);
-  void KeepIncludes(const AnalyseOrder& taken);
+  void TakeIn(std::string_view text, const Kel_Key& library, const StringBase& language);
+  void AddInclude(std::string_view text, const Kel_Key& included);
+  void KeepIncludes(const OrderReader& nested);
   FileName FindOrder(const Kel_Key& library, std::string_view text) const;
   bool ReportUnsettled(const LDXEntry& entry, const SourceLanguage& settled) const;
   void WarnOfSecond(const Source& source, const char* purpose) const;
@@ -156,7 +147,7 @@ class OrderReader {
   }
 
   const Kel_Index& index;
-  Analysis& analysis;
+  OrderAnalysis& analysis;
   OpenOrders& open;
   Kel_Key key;   // as given
   Kel_Key core;  // the version that it stands for
@@ -166,46 +157,66 @@ class OrderReader {
   FileName ldxFile;
   std::shared_ptr<const StringBase> fileName;
   std::unique_ptr<FileScanner> lines;
-  AnalyseOrder order;
+  OrderAnalysis::Core& state;
+  CoreOrder order;
+  std::vector<AnalyseOrder::Include> includes;
+  std::vector<AnalyseOrder::Include> further;  // of the files below; for a checker alone
   SourceMaker maker;
 };
 
 // The list of open files is the same for all readers of an analysis, so a failed one leaves it too.
 // For a checker, what a file read before has was told, and taken over by what leads to it.
-AnalyseOrder OrderReader::Read() {
+const OrderPart& OrderReader::Read() {
   CheckNesting();
-  if (Diagnosis::GoesOn() && !analysis.done.insert(*fileName).second) return {};
+  if (Diagnosis::GoesOn() && !analysis.done.insert(*fileName).second) return order.GetPart();
   open.push_back({fileName, core, {}});
+  ++state.timesOpen;
   try {
     Parse();
   } catch (...) {
-    open.pop_back();
+    Close();
     throw;
   }
+  Close();
+  return order.GetPart();
+}
+
+void OrderReader::Close() {
   open.pop_back();
-  return std::move(order);
+  --state.timesOpen;
+}
+
+AnalyseOrder OrderReader::TakeOrder() {
+  AnalyseOrder taken = order.TakeOrder();
+  taken.includes = std::move(includes);
+  taken.further = std::move(further);
+  taken.parts = std::move(analysis.parts);
+  return taken;
 }
 
 // Refuses the root, a file that is being read already, which only an endless circle comes back to,
 // and what is too deep for the stack. A core whose own file is another one than that which is read
 // in its name is no circle.
 void OrderReader::CheckNesting() const {
-  const auto same = std::find_if(open.begin(), open.end(), [&](const OpenOrder& outer) {
-    return outer.core == core && (isRoot || *outer.file == *fileName);
-  });
+  auto same = open.cend();
+  if (state.timesOpen > 0) {
+    same = std::find_if(open.cbegin(), open.cend(), [&](const OpenOrder& outer) {
+      return outer.core == core && (isRoot || *outer.file == *fileName);
+    });
+  }
   // The root is refused by its key, all others by file and core.
-  if (isRoot || same != open.end()) {
-    TellCircle(same == open.end() ? open.begin() : same);
+  if (isRoot || same != open.cend()) {
+    TellCircle(same == open.cend() ? open.cbegin() : same);
     throw Report::Told(Circular(core));
   }
-  if (open.size() < kDeepestLevel) return;
+  if (open.size() < OrderAnalysis::kDeepestLevel) return;
   Diagnosis::Add([&] {
     return Diagnosis::AtPlace(Codes::kIncludeTooDeep, PlaceOf(open.back()),
                               "includes nest too deep");
   });
   throw Report::Told(Report::Exception(AppException::Failure,
                                        "LDX definition for %s nested below %d others\n",
-                                       core.GetKey(), kDeepestLevel));
+                                       core.GetKey(), OrderAnalysis::kDeepestLevel));
 }
 
 // Tells the circle at the include that closes it, with the others behind it. A checker comes into
@@ -300,8 +311,7 @@ bool OrderReader::AddFile(const LDXEntry& entry) {
                 StringBase(entry.library), file);
   }
   if (settled.verdict != SourceLanguage::Settled) return ReportUnsettled(entry, settled);
-  AddSource(entry,
-            std::make_shared<const Source>(maker.Make(file, name, settled, MarkOf(entry.name))));
+  AddSource(entry, maker.Make(file, name, settled, MarkOf(entry.name)));
   return true;
 }
 
@@ -344,13 +354,13 @@ bool OrderReader::ReportUnsettled(const LDXEntry& entry, const SourceLanguage& s
   return false;
 }
 
-void OrderReader::AddSource(const LDXEntry& entry, const SourcePointer& source) {
+void OrderReader::AddSource(const LDXEntry& entry, const Source& source) {
   const AnalyseOrder::Earlier earlier = order.Add(source, entry.forSynthesis, entry.forSimulation);
   if (!earlier.synthesis && !earlier.simulation) return;
   TellSecond(entry, earlier);
   // Two warnings where it stands in both: who works for one purpose looks for that one.
-  if (earlier.synthesis) WarnOfSecond(*source, kSynthesis);
-  if (earlier.simulation) WarnOfSecond(*source, kSimulation);
+  if (earlier.synthesis) WarnOfSecond(source, kSynthesis);
+  if (earlier.simulation) WarnOfSecond(source, kSimulation);
 }
 
 void OrderReader::TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const {
@@ -368,7 +378,7 @@ void OrderReader::TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier&
 
 void OrderReader::WarnOfSecond(const Source& source, const char* purpose) const {
   kModule.Warning("%s - File %s:%s already exists in %s library\n", key.GetKey(),
-                  source.origin->library->GetKey(), source.location.GetTail(), purpose);
+                  source.origin->library->GetKey(), source.GetLocation().GetTail(), purpose);
 }
 
 void OrderReader::TellUnknown(std::string_view library) const {
@@ -404,7 +414,8 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
     TellIgnored(entry);
     return true;
   }
-  if (const auto* const known = order.FindIncludeDirectory(libKey)) {
+  // The first directory of a library counts; it is never replaced.
+  if (const auto* const known = order.Add({libKey, location, fileName, MarkOf(entry.name)})) {
     Diagnosis::Add([&] {
       return Diagnosis::With(
           Diagnosis::At(Codes::kDuplicateIncludeDirectory, SpanOf(entry.library),
@@ -414,8 +425,6 @@ bool OrderReader::AddDirectory(const LDXEntry& entry) {
     kModule.Warning("Library %s already has path %s defined\n", library, known->location.GetName());
     return false;
   }
-  // The first directory of a library counts; it is never replaced.
-  order.includeDirectories.push_back({libKey, location, fileName, MarkOf(entry.name)});
   return true;
 }
 
@@ -426,34 +435,46 @@ bool OrderReader::AddLibrary(const LDXEntry& entry) {
   return Guard(NoOutput(), Failure(kModule, "Unable to analyse library %s\n%s\n", library), [&] {
     const Kel_Key libKey(library);
     open.back().entry = MarkOf(entry.library);
-    const StringBase language = LanguageOf(libKey);
-    const FileName libFile = FindOrder(libKey, entry.library);
-    AddInclude(library, libKey);
-    // Not on the stack, of which each level of a deep chain needs some.
-    const auto nested =
-        std::make_unique<OrderReader>(index, analysis, libKey, root, language, libFile);
-    AnalyseOrder taken = nested->Read();
-    if (Diagnosis::GoesOn()) KeepIncludes(taken);
-    const AnalyseOrder::Known known = order.Append(std::move(taken));
-    TraceKnown(known.synthesis, kSynthesis, libKey);
-    TraceKnown(known.ForSimulation(), kSimulation, libKey);
+    TakeIn(entry.library, libKey, LanguageOf(libKey));
   });
 }
 
-// Entries of one core mostly share both keys with the one before.
-void OrderReader::AddInclude(const StringBase& library, const Kel_Key& libKey) {
-  const bool isFirst = order.includes.empty();
-  const bool isSame = !isFirst && order.includes.back().library == library;
-  auto from = isFirst ? std::make_shared<const Kel_Key>(core) : order.includes.back().from;
-  auto target =
-      isSame ? order.includes.back().core : std::make_shared<const Kel_Key>(Resolve(index, libKey));
-  order.includes.push_back(
-      {std::move(from), library, std::move(target), fileName, open.back().entry});
+// Adds the order of a core, read anew if need be.
+void OrderReader::TakeIn(std::string_view text, const Kel_Key& library,
+                         const StringBase& language) {
+  const Kel_Key included = Resolve(index, library);
+  auto& reading = analysis.cores[included.GetKey()].readings[language];
+  // The root is refused wherever it is included.
+  if (!(root.IsValid() && library == root) && analysis.MayReuse(reading)) {
+    AddInclude(text, included);
+    order.Add(*reading.part, std::nullopt);
+    return;
+  }
+  const FileName file = FindOrder(library, text);
+  AddInclude(text, included);
+  // Not on the stack, of which each level of a deep chain needs some.
+  const auto nested = std::make_unique<OrderReader>(index, analysis, library, root, language, file);
+  const OrderPart& part =
+      analysis.Read(reading, [&]() -> const OrderPart& { return nested->Read(); });
+  if (Diagnosis::GoesOn()) KeepIncludes(*nested);
+  const bool isFirst = &part == &nested->order.GetPart();
+  const AnalyseOrder::Known known =
+      order.Add(part, isFirst ? nested->order.TakeSum() : std::nullopt);
+  TraceKnown(known.synthesis, kSynthesis, library);
+  TraceKnown(known.ForSimulation(), kSimulation, library);
 }
 
-void OrderReader::KeepIncludes(const AnalyseOrder& taken) {
-  for (const auto* const includes : {&taken.includes, &taken.further}) {
-    order.further.insert(order.further.end(), includes->begin(), includes->end());
+// Those of the outermost file are asked for, and a checker wants all.
+void OrderReader::AddInclude(std::string_view text, const Kel_Key& included) {
+  if (open.size() > 1 && !Diagnosis::GoesOn()) return;
+  auto from = includes.empty() ? std::make_shared<const Kel_Key>(core) : includes.back().from;
+  includes.push_back({std::move(from), StringBase(text), std::make_shared<const Kel_Key>(included),
+                      fileName, open.back().entry});
+}
+
+void OrderReader::KeepIncludes(const OrderReader& nested) {
+  for (const auto* const taken : {&nested.includes, &nested.further}) {
+    further.insert(further.end(), taken->begin(), taken->end());
   }
 }
 
@@ -480,9 +501,9 @@ StringBase OrderReader::LanguageOf(const Kel_Key& library) const {
 
 void OrderReader::TraceKnown(const AnalyseOrder::SourcePointers& sources, const char* purpose,
                              const Kel_Key& from) const {
-  for (const SourcePointer& source : sources) {
+  for (const Source* const source : sources) {
     TARVO_TRACE("%s - File %s:%s included from %s already exists in %s library\n", key.GetKey(),
-                source->origin->library->GetKey(), source->location.GetTail(), from.GetKey(),
+                source->origin->library->GetKey(), source->GetLocation().GetTail(), from.GetKey(),
                 purpose);
   }
 }
@@ -492,8 +513,10 @@ void OrderReader::TraceKnown(const AnalyseOrder::SourcePointers& sources, const 
 AnalyseOrder ReadAnalyseOrder(const FileName& file, const Kel_Index& index, const Kel_Key& version,
                               const Kel_Key& root, const StringBase& language) {
   CheckRoot(version, root);
-  Analysis analysis;
-  return OrderReader(index, analysis, version, root, language, file).Read();
+  OrderAnalysis analysis;
+  OrderReader reader(index, analysis, version, root, language, file);
+  reader.Read();
+  return reader.TakeOrder();
 }
 
 LDXParser::LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,

@@ -16,9 +16,9 @@ namespace {
 std::vector<KelSource> DescribeSources(const AnalyseOrder::SourceList& list) {
   std::vector<KelSource> sources;
   for (const AnalyseOrder::Library& library : list.libraries) {
-    for (const auto& source : library.sources) {
+    for (const AnalyseOrder::Source* const source : library.sources) {
       const AnalyseOrder::Origin& origin = *source->origin;
-      sources.push_back({source->location.GetAbsolutePath(), *origin.library, origin.language,
+      sources.push_back({source->GetLocation().GetAbsolutePath(), *origin.library, origin.language,
                          source->mark.In(*origin.file)});
     }
   }
@@ -28,8 +28,8 @@ std::vector<KelSource> DescribeSources(const AnalyseOrder::SourceList& list) {
 StringList ListPaths(const AnalyseOrder::SourceList& list) {
   StringList paths;
   for (const AnalyseOrder::Library& library : list.libraries) {
-    for (const auto& source : library.sources) {
-      paths.push_back(source->location.GetAbsolutePath());
+    for (const AnalyseOrder::Source* const source : library.sources) {
+      paths.push_back(source->GetLocation().GetAbsolutePath());
     }
   }
   return paths;
@@ -81,7 +81,7 @@ StringList LDXParser::ListSimulationAnalyseOrder() const {
 
 StringList LDXParser::ListVerilogIncludeLibraryKeys() const {
   StringList keys;
-  for (const auto& entry : order.includeDirectories) keys.push_back(entry.library.GetKey());
+  for (const auto* const entry : order.includeDirectories) keys.push_back(entry->library.GetKey());
   return keys;
 }
 
@@ -95,9 +95,9 @@ std::vector<KelSource> LDXParser::GetSimulationSources() const {
 
 std::vector<KelIncludeDirectory> LDXParser::GetVerilogIncludeDirectories() const {
   std::vector<KelIncludeDirectory> directories;
-  for (const auto& entry : order.includeDirectories) {
+  for (const auto* const entry : order.includeDirectories) {
     directories.push_back(
-        {entry.library.GetKey(), entry.location.GetAbsolutePath(), entry.mark.In(*entry.file)});
+        {entry->library.GetKey(), entry->location.GetAbsolutePath(), entry->mark.In(*entry->file)});
   }
   return directories;
 }

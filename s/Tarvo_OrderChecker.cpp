@@ -64,9 +64,7 @@ void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringB
   CheckIncludeDirectories(order, key);
   AddEdges(order, key);
   tops.push_back(key.GetKey());
-  const bool isEmpty = order.GetSynthesis().libraries.empty() &&
-                       order.GetSimulation().libraries.empty() && order.includeDirectories.empty();
-  if (isEmpty && isGood) {
+  if (order.IsEmpty() && isGood) {
     Diagnosis::Add([&] {
       return Diagnosis::Of(Codes::kEmptyOrder, file.GetName(), "the order lists no source");
     });
@@ -92,12 +90,12 @@ bool OrderChecker::IsIncludeDirectory(const FileName& directory) const {
 void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
   bool isNormal = true;
   for (const AnalyseOrder::Library& library : sources.libraries) {
-    for (const auto& source : library.sources) {
+    for (const AnalyseOrder::Source* const source : library.sources) {
       isNormal = isNormal && IsNormal(source->fileKey.View());
-      if (IsThere(source->location)) continue;
+      const FileName location = source->GetLocation();
+      if (IsThere(location)) continue;
       Tell(Codes::kMissingSource, source->mark.In(*source->origin->file),
-           Say({"source does not exist: ",
-                ShortName(index, *library.key, source->location).View()}));
+           Say({"source does not exist: ", ShortName(index, *library.key, location).View()}));
     }
   }
   if (!isNormal) CheckNames(sources);
@@ -108,14 +106,14 @@ void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
 void OrderChecker::CheckNames(const AnalyseOrder::SourceList& sources) {
   std::unordered_map<StringBase, const AnalyseOrder::Source*> known;
   for (const AnalyseOrder::Library& library : sources.libraries) {
-    for (const auto& source : library.sources) {
-      const auto [first, isNew] = known.try_emplace(Normal(source->location), source.get());
+    for (const AnalyseOrder::Source* const source : library.sources) {
+      const auto [first, isNew] = known.try_emplace(Normal(source->GetLocation()), source);
       if (isNew) continue;
       const AnalyseOrder::Source& other = *first->second;
       Diagnosis::Add([&] {
         return Diagnosis::With(
             Diagnosis::AtPlace(Codes::kDuplicateSource, source->mark.In(*source->origin->file),
-                               Say({ShortName(index, *library.key, source->location).View(),
+                               Say({ShortName(index, *library.key, source->GetLocation()).View(),
                                     " is listed already under another name"})),
             other.mark.In(*other.origin->file), "first listed here");
       });
@@ -124,12 +122,12 @@ void OrderChecker::CheckNames(const AnalyseOrder::SourceList& sources) {
 }
 
 void OrderChecker::CheckIncludeDirectories(const AnalyseOrder& order, const Kel_Key& key) {
-  for (const AnalyseOrder::IncludeDirectory& directory : order.includeDirectories) {
-    includeDirectories.insert(Normal(directory.location));
-    if (IsDirectory(directory.location)) continue;
-    Tell(Codes::kMissingIncludeDirectory, directory.mark.In(*directory.file),
+  for (const auto* const directory : order.includeDirectories) {
+    includeDirectories.insert(Normal(directory->location));
+    if (IsDirectory(directory->location)) continue;
+    Tell(Codes::kMissingIncludeDirectory, directory->mark.In(*directory->file),
          Say({"include directory is not a directory: ",
-              ShortName(index, key, directory.location).View()}));
+              ShortName(index, key, directory->location).View()}));
   }
 }
 
@@ -159,7 +157,7 @@ void OrderChecker::AddSingleSources(const AnalyseOrder::Library& library,
                                     const std::unordered_map<StringBase, Kel_Key>& cores,
                                     std::unordered_map<StringBase, Edges>& own) {
   std::unordered_set<const StringBase*> seen;
-  for (const auto& source : library.sources) {
+  for (const AnalyseOrder::Source* const source : library.sources) {
     const StringBase& file = *source->origin->file;
     // Sources of one file share its name, so the pointer tells them apart.
     if (!seen.insert(&file).second) continue;

@@ -68,6 +68,11 @@ inline unsigned Raw(unsigned number) { return number; }
 #pragma GCC diagnostic ignored "-Wformat-nonliteral"
 #pragma GCC diagnostic ignored "-Wformat-security"
 
+inline thread_local unsigned messageCount = 0;
+
+// How many messages the library has issued in this thread; only differences say something.
+inline unsigned CountMessages() noexcept { return messageCount; }
+
 // What a source file puts on its messages: its path stem and its revision.
 struct Module {
   template <class... Arguments>
@@ -85,6 +90,7 @@ struct Module {
   void IssueAt(Port_Message::Severity severity, int line, const char* text,
                const Arguments&... arguments) const noexcept {
     if (Diagnosis::GoesOn()) return;
+    ++messageCount;
     Port_MsgManData& message = Port_MsgManData::createObject("tarvomsg", file, line, revision);
     switch (severity) {
       case Port_Message::Warning:

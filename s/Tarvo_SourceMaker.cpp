@@ -7,6 +7,7 @@
 
 #include "Tarvo_FileKey.h"
 #include "Tarvo_Kel_Index.h"
+#include "Tarvo_OrderPart.h"
 
 namespace Tarvo {
 
@@ -22,47 +23,59 @@ void SourceMaker::EnterLibrary(std::string_view entered) {
   library = std::move(key);
   // What was worked out for the library before counts no more.
   subdirectory.Empty();
-  origin.reset();
+  origin = nullptr;
 }
 
 void SourceMaker::EnterDirectory(const SourceLanguage& settled) {
-  // Sources of one file, library and language share what they have in common.
-  if (!origin || origin->language != settled.language) {
-    origin = std::make_shared<const AnalyseOrder::Origin>(
-        AnalyseOrder::Origin{library, file, settled.language});
+  if (subdirectory != settled.subdirectory) {
+    FileName hdl = location;
+    hdl.SetBase("");
+    hdl.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
+    hdl.PushPathEnd(settled.subdirectory);
+    subdirectory = settled.subdirectory;
+    directory = hdl.GetHead();
+    fileKeyPrefix = FileKey::OfLocation(hdl);
+    isLibraryOdd = fileKeyPrefix != FileKey::OfEntry(*library, {}, {});
+    origin = nullptr;
   }
-  if (subdirectory == settled.subdirectory) return;
-  FileName hdl = location;
-  hdl.SetBase("");
-  hdl.PushPathEnd(Kel_Index::KEL_HDL_SUBDIRECTORY);
-  hdl.PushPathEnd(settled.subdirectory);
-  subdirectory = settled.subdirectory;
-  directory = hdl.GetHead();
-  fileKeyPrefix = FileKey::OfLocation(hdl);
+  // Sources of one file, library and language share what they have in common.
+  if (origin && origin->language == settled.language) return;
+  part.origins.push_front({library, file, settled.language, directory});
+  origin = &part.origins.front();
 }
 
-// A name with levels may lead to another directory of a language, so its file key is read off the
-// whole location.
-AnalyseOrder::Source SourceMaker::Make(const StringBase& text, const FileName& name,
-                                       const SourceLanguage& settled,
-                                       const AnalyseOrder::Mark& mark) {
+// A name without levels is a file of the language's directory, whichever way one looks at it. One
+// with levels may lead elsewhere, so both its keys are made.
+AnalyseOrder::Source& SourceMaker::Make(const StringBase& text, const FileName& name,
+                                        const SourceLanguage& settled,
+                                        const AnalyseOrder::Mark& mark) {
   EnterDirectory(settled);
-  AnalyseOrder::Source source{origin, name, fileKeyPrefix, {}, mark};
-  const StringBase levels = name.GetPath();
-  source.location.SetHead(directory);
-  if (settled.missingExtension.GetLength() > 0) {
-    source.location.SetExtension(settled.missingExtension);
+  AnalyseOrder::Source& source = part.sources.emplace_back();
+  source.origin = origin;
+  source.mark = mark;
+  source.nameAt = fileKeyPrefix.GetLength();
+  if (isLibraryOdd || text.View().find('/') != std::string_view::npos) {
+    NameOddly(source, text, name, settled.missingExtension);
+    return source;
   }
-  if (levels.GetLength() > 0) {
-    source.location.PushPathEnd(levels);
-    source.fileKey = FileKey::OfLocation(source.location);
-  } else {
-    source.fileKey.Append(source.location.GetTail());
-  }
-  source.entryKey = FileKey::OfEntry(*library, text, settled.missingExtension);
-  // They differ for odd names alone; see AnalyseOrder.
-  if (source.entryKey == source.fileKey) source.entryKey.Empty();
+  source.fileKey = fileKeyPrefix;
+  FileKey::AppendName(source.fileKey, text, settled.missingExtension);
   return source;
+}
+
+void SourceMaker::NameOddly(AnalyseOrder::Source& source, const StringBase& text,
+                            const FileName& name, const StringBase& missingExtension) const {
+  FileName full = name;
+  const StringBase levels = name.GetPath();
+  full.SetHead(directory);
+  if (missingExtension.GetLength() > 0) full.SetExtension(missingExtension);
+  full.PushPathEnd(levels);
+  source.fileKey = FileKey::OfLocation(full);
+  StringBase entryKey = FileKey::OfEntry(*library, text, missingExtension);
+  // They differ for odd names alone; see AnalyseOrder.
+  if (entryKey == source.fileKey) return;
+  source.odd = std::make_unique<const AnalyseOrder::OddName>(
+      AnalyseOrder::OddName{std::move(full), std::move(entryKey)});
 }
 
 }  // namespace Tarvo
