@@ -2,6 +2,7 @@
 #define TARVO_ANALYSEORDER_H
 
 #include <cstddef>
+#include <cstdint>
 #include <memory>
 #include <string_view>
 #include <unordered_map>
@@ -14,7 +15,7 @@
 
 namespace Tarvo {
 
-struct OrderPart;
+class OrderPart;
 
 // An analyse order (a compile order, as many say): the sources for synthesis and for simulation,
 // the Verilog include directories, and the cores that were taken in. A plain value that LDXParser
@@ -47,21 +48,48 @@ class AnalyseOrder {
     Port::FileName location;
     StringBase entryKey;  // its file key by its entry
   };
+  // Held by the part that it was read into, with all that it points at.
   struct Source {
     Port::FileName GetLocation() const;
-    const StringBase& GetEntryKey() const { return odd ? odd->entryKey : fileKey; }
+    std::string_view GetEntryKey() const { return odd ? odd->entryKey.View() : fileKey; }
 
-    const Origin* origin;
-    StringBase fileKey;  // by its location
-    unsigned nameAt;     // where in that key its name below the language's directory begins
-    std::unique_ptr<const OddName> odd;
-    Mark mark;
+    const Origin* origin = nullptr;
+    std::string_view fileKey;      // by its location
+    const OddName* odd = nullptr;  // null for most
+    Mark mark = {};
+    unsigned nameAt = 0;  // where in its file key its name below the language's directory begins
+    bool forSynthesis = false;  // what its entry added it for
+    bool forSimulation = false;
   };
   using SourcePointers = std::vector<const Source*>;
 
   struct Library {
     std::shared_ptr<const Kel_Key> key;
     SourcePointers sources;
+  };
+
+  // Sources by their file keys, for tables of many: without a block of memory for each.
+  class KeyTable {
+   public:
+    // The source of that key, which for one that was not there is this one.
+    const Source* FindOrAdd(std::string_view key, const Source& source);
+    const Source* Find(std::string_view key) const;
+
+   private:
+    // Free without a source.
+    struct Slot {
+      std::string_view GetKey() const { return byEntry ? source->GetEntryKey() : source->fileKey; }
+
+      const Source* source = nullptr;
+      std::uint32_t hash = 0;
+      bool byEntry = false;  // which of its keys it is found by
+    };
+
+    std::size_t Probe(std::string_view key, std::uint32_t hash) const;
+    void Grow();
+
+    std::vector<Slot> slots;  // a power of two, or none
+    std::size_t count = 0;
   };
 
   // The sources for one purpose, library by library. No library is without sources.
@@ -74,16 +102,16 @@ class AnalyseOrder {
     // were there.
     SourcePointers Append(const SourceList& other);
     // The source with that file key, or null.
-    const Source* Find(const StringBase& fileKey) const;
+    const Source* Find(std::string_view fileKey) const;
 
     std::vector<Library> libraries;
 
    private:
     void AppendSource(const Source& source);
 
-    // Views of the texts in keys and sources that the libraries hold.
-    std::unordered_map<std::string_view, std::size_t> libraryIndex;    // by the key's text
-    std::unordered_map<std::string_view, const Source*> sourcesByKey;  // by file key
+    // Views of the texts of keys that the libraries hold.
+    std::unordered_map<std::string_view, std::size_t> libraryIndex;
+    KeyTable sourcesByKey;
   };
 
   struct IncludeDirectory {

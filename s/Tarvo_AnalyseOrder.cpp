@@ -4,6 +4,8 @@
 
 #include "Tarvo_AnalyseOrder.h"
 
+#include <algorithm>
+#include <functional>
 #include <utility>
 
 namespace Tarvo {
@@ -13,13 +15,62 @@ Port::FileName AnalyseOrder::Source::GetLocation() const {
   if (odd) return odd->location;
   StringBase name = origin->directory;
   name.Append("/");
-  name.Append(fileKey.GetText() + nameAt);
+  const std::string_view below = fileKey.substr(nameAt);
+  name.Append(below.data(), static_cast<unsigned>(below.size()));
   return Port::FileName(name);
 }
 
+namespace {
+
+// Of the standard library's hash 32 bits are enough: whoever shares them is told apart by the key.
+std::uint32_t HashOf(std::string_view key) {
+  return static_cast<std::uint32_t>(std::hash<std::string_view>()(key));
+}
+
+}  // namespace
+
+// The slot of the key, or the free one where it belongs. There is always a free one.
+std::size_t AnalyseOrder::KeyTable::Probe(std::string_view key, std::uint32_t hash) const {
+  const std::size_t mask = slots.size() - 1;
+  std::size_t at = hash & mask;
+  while (slots[at].source && (slots[at].hash != hash || slots[at].GetKey() != key)) {
+    at = (at + 1) & mask;
+  }
+  return at;
+}
+
+const AnalyseOrder::Source* AnalyseOrder::KeyTable::FindOrAdd(std::string_view key,
+                                                              const Source& source) {
+  if (slots.size() * 2 <= count * 3) Grow();
+  const std::uint32_t hash = HashOf(key);
+  Slot& slot = slots[Probe(key, hash)];
+  if (slot.source) return slot.source;
+  slot = {&source, hash, key != source.fileKey};
+  ++count;
+  return &source;
+}
+
+const AnalyseOrder::Source* AnalyseOrder::KeyTable::Find(std::string_view key) const {
+  return slots.empty() ? nullptr : slots[Probe(key, HashOf(key))].source;
+}
+
+// The hashes are kept, so that no key is looked at again.
+void AnalyseOrder::KeyTable::Grow() {
+  constexpr std::size_t kFirstSize = 64;
+  const std::vector<Slot> former =
+      std::exchange(slots, std::vector<Slot>(std::max(kFirstSize, slots.size() * 2)));
+  const std::size_t mask = slots.size() - 1;
+  for (const Slot& slot : former) {
+    if (!slot.source) continue;
+    std::size_t at = slot.hash & mask;
+    while (slots[at].source) at = (at + 1) & mask;
+    slots[at] = slot;
+  }
+}
+
 const AnalyseOrder::Source* AnalyseOrder::SourceList::Add(const Source& source) {
-  const auto [known, isNew] = sourcesByKey.try_emplace(source.GetEntryKey().View(), &source);
-  if (!isNew) return known->second;
+  const Source* const known = sourcesByKey.FindOrAdd(source.GetEntryKey(), source);
+  if (known != &source) return known;
   AppendSource(source);
   return nullptr;
 }
@@ -42,7 +93,7 @@ AnalyseOrder::SourcePointers AnalyseOrder::SourceList::Append(const SourceList& 
   SourcePointers known;
   for (const Library& library : other.libraries) {
     for (const Source* const source : library.sources) {
-      if (sourcesByKey.try_emplace(source->fileKey.View(), source).second) {
+      if (sourcesByKey.FindOrAdd(source->fileKey, *source) == source) {
         AppendSource(*source);
       } else {
         known.push_back(source);
@@ -52,9 +103,8 @@ AnalyseOrder::SourcePointers AnalyseOrder::SourceList::Append(const SourceList& 
   return known;
 }
 
-const AnalyseOrder::Source* AnalyseOrder::SourceList::Find(const StringBase& fileKey) const {
-  const auto found = sourcesByKey.find(fileKey.View());
-  return found == sourcesByKey.end() ? nullptr : found->second;
+const AnalyseOrder::Source* AnalyseOrder::SourceList::Find(std::string_view fileKey) const {
+  return sourcesByKey.Find(fileKey);
 }
 
 AnalyseOrder::Earlier AnalyseOrder::Add(const Source& source, bool forSynthesis,

@@ -118,7 +118,7 @@ class OrderReader {
   [[gnu::noinline]] bool AddFile(const LDXEntry& entry);
   [[gnu::noinline]] bool AddDirectory(const LDXEntry& entry);
   bool AddLibrary(const LDXEntry& entry);
-  void AddSource(const LDXEntry& entry, const Source& source);
+  void AddSource(const LDXEntry& entry, Source& source);
 
   StringBase LanguageOf(const Kel_Key& library) const;
 
@@ -354,7 +354,7 @@ bool OrderReader::ReportUnsettled(const LDXEntry& entry, const SourceLanguage& s
   return false;
 }
 
-void OrderReader::AddSource(const LDXEntry& entry, const Source& source) {
+void OrderReader::AddSource(const LDXEntry& entry, Source& source) {
   const AnalyseOrder::Earlier earlier = order.Add(source, entry.forSynthesis, entry.forSimulation);
   if (!earlier.synthesis && !earlier.simulation) return;
   TellSecond(entry, earlier);

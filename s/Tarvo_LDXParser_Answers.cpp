@@ -53,9 +53,9 @@ StringBase LDXParser::GetFileLanguage(const FileName& file) const {
 
 Kel_Key LDXParser::GetFileLibrary(const FileName& file) const {
   const StringBase fileKey = FileKey::OfLocation(file);
-  const AnalyseOrder::Source* source = order.GetSynthesis().Find(fileKey);
+  const AnalyseOrder::Source* source = order.GetSynthesis().Find(fileKey.View());
   // A source for one purpose stands in one list alone.
-  if (!source) source = order.GetSimulation().Find(fileKey);
+  if (!source) source = order.GetSimulation().Find(fileKey.View());
   return source ? *source->origin->library : Kel_Key();
 }
 

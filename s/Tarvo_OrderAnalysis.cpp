@@ -11,7 +11,7 @@ namespace Tarvo {
 
 bool OrderAnalysis::MayReuse(const Reading& reading) const {
   return reading.part && reading.isSilent && !Report::IsTracing() &&
-         open.size() + reading.part->levels <= kDeepestLevel;
+         open.size() + reading.part->GetLevels() <= kDeepestLevel;
 }
 
 const OrderPart& OrderAnalysis::Read(Reading& reading,
@@ -62,22 +62,19 @@ auto CoreOrder::AddOwn(const AddTo& add) {
   return !sum && (isOutermost || !earlier) ? earlier : add(GetSum());
 }
 
-AnalyseOrder::Earlier CoreOrder::Add(const AnalyseOrder::Source& source, bool forSynthesis,
+AnalyseOrder::Earlier CoreOrder::Add(AnalyseOrder::Source& source, bool forSynthesis,
                                      bool forSimulation) {
   if (source.odd) analysis.StopSharing();
   const auto earlier =
       AddOwn([&](AnalyseOrder& order) { return order.Add(source, forSynthesis, forSimulation); });
-  const bool isNewForSynthesis = forSynthesis && !earlier.synthesis;
-  const bool isNewForSimulation = forSimulation && !earlier.simulation;
-  if (isNewForSynthesis || isNewForSimulation) {
-    part.Add(source, isNewForSynthesis, isNewForSimulation);
-  }
+  source.forSynthesis = forSynthesis && !earlier.synthesis;
+  source.forSimulation = forSimulation && !earlier.simulation;
+  if (source.forSynthesis || source.forSimulation) part.Add(source);
   return earlier;
 }
 
 const AnalyseOrder::IncludeDirectory* CoreOrder::Add(AnalyseOrder::IncludeDirectory directory) {
-  part.directories.push_front(std::move(directory));
-  const AnalyseOrder::IncludeDirectory& added = part.directories.front();
+  const AnalyseOrder::IncludeDirectory& added = part.Keep(std::move(directory));
   const auto* const earlier = AddOwn([&](AnalyseOrder& order) { return order.Add(added); });
   if (!earlier) part.Add(added);
   return earlier;
@@ -88,7 +85,7 @@ AnalyseOrder::Known CoreOrder::Add(const OrderPart& core, std::optional<AnalyseO
   if (sum || !analysis.IsShared() || Report::IsTracing()) {
     if (!coreSum) coreSum = AddUp(core);
     // Odd names are told apart by other keys in their own core than above it.
-    if (GetSum().IsEmpty() && !core.hasOdd) {
+    if (GetSum().IsEmpty() && !core.HasOdd()) {
       sum = std::move(coreSum);
     } else {
       known = GetSum().Append(*coreSum);

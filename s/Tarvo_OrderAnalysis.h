@@ -78,8 +78,7 @@ class CoreOrder {
       : analysis(theAnalysis), isOutermost(isRoot), part(theAnalysis.NewPart()) {}
 
   // Add what an entry states, and give what stands in this core's order already.
-  AnalyseOrder::Earlier Add(const AnalyseOrder::Source& source, bool forSynthesis,
-                            bool forSimulation);
+  AnalyseOrder::Earlier Add(AnalyseOrder::Source& source, bool forSynthesis, bool forSimulation);
   const AnalyseOrder::IncludeDirectory* Add(AnalyseOrder::IncludeDirectory directory);
   // Adds a core that is included, with what it adds up to if that is known. What stands in the
   // order already is given while the logger is on.

@@ -91,7 +91,7 @@ void OrderChecker::CheckSources(const AnalyseOrder::SourceList& sources) {
   bool isNormal = true;
   for (const AnalyseOrder::Library& library : sources.libraries) {
     for (const AnalyseOrder::Source* const source : library.sources) {
-      isNormal = isNormal && IsNormal(source->fileKey.View());
+      isNormal = isNormal && IsNormal(source->fileKey);
       const FileName location = source->GetLocation();
       if (IsThere(location)) continue;
       Tell(Codes::kMissingSource, source->mark.In(*source->origin->file),

@@ -5,6 +5,8 @@
 #include "Tarvo_OrderPart.h"
 
 #include <algorithm>
+#include <cstring>
+#include <type_traits>
 #include <unordered_map>
 #include <unordered_set>
 #include <utility>
@@ -13,18 +15,28 @@ namespace Tarvo {
 
 namespace {
 
-void AddOwn(AnalyseOrder& order, const OrderPart::Entry& entry) {
-  if (entry.source) order.Add(*entry.source, entry.forSynthesis, entry.forSimulation);
-  if (entry.directory) order.Add(*entry.directory);
+using Source = AnalyseOrder::Source;
+using IncludeDirectory = AnalyseOrder::IncludeDirectory;
+
+// Adds what is no core. Gives the core, or null.
+const OrderPart* AddOwn(AnalyseOrder& order, const OrderPart::Entry& entry) {
+  if (const auto* const source = std::get_if<const Source*>(&entry)) {
+    order.Add(**source, (*source)->forSynthesis, (*source)->forSimulation);
+    return nullptr;
+  }
+  if (const auto* const directory = std::get_if<const IncludeDirectory*>(&entry)) {
+    order.Add(**directory);
+    return nullptr;
+  }
+  return std::get<const OrderPart*>(entry);
 }
 
 using Parts = std::unordered_set<const OrderPart*>;
 
 void AddPlain(AnalyseOrder& order, const OrderPart& part, Parts& added) {
   if (!added.insert(&part).second) return;
-  for (const OrderPart::Entry& entry : part.entries) {
-    AddOwn(order, entry);
-    if (entry.core) AddPlain(order, *entry.core, added);
+  for (const OrderPart::Entry& entry : part.GetEntries()) {
+    if (const OrderPart* const core = AddOwn(order, entry)) AddPlain(order, *core, added);
   }
 }
 
@@ -34,32 +46,48 @@ const AnalyseOrder& AddUpOdd(const OrderPart& part, Orders& orders) {
   const auto known = orders.find(&part);
   if (known != orders.end()) return known->second;
   AnalyseOrder order;
-  for (const OrderPart::Entry& entry : part.entries) {
-    AddOwn(order, entry);
-    if (entry.core) order.Append(AddUpOdd(*entry.core, orders));
+  for (const OrderPart::Entry& entry : part.GetEntries()) {
+    if (const OrderPart* const core = AddOwn(order, entry)) order.Append(AddUpOdd(*core, orders));
   }
   return orders.emplace(&part, std::move(order)).first->second;
 }
 
 }  // namespace
 
-void OrderPart::Add(const AnalyseOrder::Source& source, bool forSynthesis, bool forSimulation) {
-  entries.push_back({&source, nullptr, nullptr, forSynthesis, forSimulation});
+AnalyseOrder::Source& OrderPart::MakeSource(std::string_view fileKey) {
+  static_assert(std::is_trivially_destructible_v<Source>);
+  auto* const text = static_cast<char*>(memory.allocate(fileKey.size(), 1));
+  std::memcpy(text, fileKey.data(), fileKey.size());
+  auto* const source = new (memory.allocate(sizeof(Source), alignof(Source))) Source;
+  source->fileKey = {text, fileKey.size()};
+  return *source;
+}
+
+const AnalyseOrder::Origin* OrderPart::Keep(AnalyseOrder::Origin origin) {
+  return &origins.emplace_front(std::move(origin));
+}
+
+const AnalyseOrder::OddName* OrderPart::Keep(AnalyseOrder::OddName name) {
+  return &oddNames.emplace_front(std::move(name));
+}
+
+const IncludeDirectory& OrderPart::Keep(IncludeDirectory directory) {
+  return directories.emplace_front(std::move(directory));
+}
+
+void OrderPart::Add(const Source& source) {
+  entries.emplace_back(&source);
   hasOdd = hasOdd || source.odd;
 }
 
-void OrderPart::Add(const AnalyseOrder::IncludeDirectory& directory) {
-  entries.push_back({nullptr, &directory, nullptr});
-}
-
 void OrderPart::Add(const OrderPart& core) {
-  entries.push_back({nullptr, nullptr, &core});
+  entries.emplace_back(&core);
   levels = std::max(levels, core.levels + 1);
   hasOdd = hasOdd || core.hasOdd;
 }
 
 AnalyseOrder AddUp(const OrderPart& part) {
-  if (part.hasOdd) {
+  if (part.HasOdd()) {
     Orders orders;
     AddUpOdd(part, orders);
     return std::move(orders.at(&part));

@@ -1,8 +1,10 @@
 #ifndef TARVO_ORDERPART_H
 #define TARVO_ORDERPART_H
 
-#include <deque>
+#include <cstddef>
 #include <forward_list>
+#include <memory_resource>
+#include <variant>
 #include <vector>
 
 #include "Tarvo_AnalyseOrder.h"
@@ -12,26 +14,38 @@ namespace Tarvo {
 // What one file adds to an order, in the order of its lines: sources and include directories of its
 // own, and the parts of cores that it includes. Parts are shared: one that several files include is
 // read once. A part owns its own entries; whoever reads owns the parts.
-struct OrderPart {
-  // One of the three.
-  struct Entry {
-    const AnalyseOrder::Source* source = nullptr;
-    const AnalyseOrder::IncludeDirectory* directory = nullptr;
-    const OrderPart* core = nullptr;
-    bool forSynthesis = false;  // of a source
-    bool forSimulation = false;
-  };
+class OrderPart {
+ public:
+  using Entry = std::variant<const AnalyseOrder::Source*, const AnalyseOrder::IncludeDirectory*,
+                             const OrderPart*>;
 
-  void Add(const AnalyseOrder::Source& source, bool forSynthesis, bool forSimulation);
-  void Add(const AnalyseOrder::IncludeDirectory& directory);
+  OrderPart() : entries(&memory) {}
+
+  // Makes what may become entries: from here on it lives as long as the part.
+  AnalyseOrder::Source& MakeSource(std::string_view fileKey);
+  const AnalyseOrder::Origin* Keep(AnalyseOrder::Origin origin);
+  const AnalyseOrder::OddName* Keep(AnalyseOrder::OddName name);
+  const AnalyseOrder::IncludeDirectory& Keep(AnalyseOrder::IncludeDirectory directory);
+
+  void Add(const AnalyseOrder::Source& source);
+  void Add(const AnalyseOrder::IncludeDirectory& directory) { entries.emplace_back(&directory); }
   void Add(const OrderPart& core);
 
-  std::vector<Entry> entries;
+  const std::pmr::vector<Entry>& GetEntries() const { return entries; }
+  // With those of the cores that it includes.
+  unsigned GetLevels() const { return levels; }
+  // Whether a source here or below has an odd name.
+  bool HasOdd() const { return hasOdd; }
+
+ private:
+  // For what needs no end: sources, their keys, and the list of entries.
+  std::pmr::monotonic_buffer_resource memory;
+  std::pmr::vector<Entry> entries;
   std::forward_list<AnalyseOrder::Origin> origins;
-  std::deque<AnalyseOrder::Source> sources;
+  std::forward_list<AnalyseOrder::OddName> oddNames;
   std::forward_list<AnalyseOrder::IncludeDirectory> directories;
-  unsigned levels = 1;  // with those of the cores that it includes
-  bool hasOdd = false;  // whether a source here or below has an odd name
+  unsigned levels = 1;
+  bool hasOdd = false;
 };
 
 // The order that a part adds up to, without the includes.

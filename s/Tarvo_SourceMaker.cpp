@@ -40,42 +40,46 @@ void SourceMaker::EnterDirectory(const SourceLanguage& settled) {
   }
   // Sources of one file, library and language share what they have in common.
   if (origin && origin->language == settled.language) return;
-  part.origins.push_front({library, file, settled.language, directory});
-  origin = &part.origins.front();
+  origin = part.Keep({library, file, settled.language, directory});
 }
 
-// A name without levels is a file of the language's directory, whichever way one looks at it. One
-// with levels may lead elsewhere, so both its keys are made.
 AnalyseOrder::Source& SourceMaker::Make(const StringBase& text, const FileName& name,
                                         const SourceLanguage& settled,
                                         const AnalyseOrder::Mark& mark) {
   EnterDirectory(settled);
-  AnalyseOrder::Source& source = part.sources.emplace_back();
+  AnalyseOrder::Source& source = MakeSource(text, name, settled.missingExtension);
   source.origin = origin;
   source.mark = mark;
   source.nameAt = fileKeyPrefix.GetLength();
-  if (isLibraryOdd || text.View().find('/') != std::string_view::npos) {
-    NameOddly(source, text, name, settled.missingExtension);
-    return source;
-  }
-  source.fileKey = fileKeyPrefix;
-  FileKey::AppendName(source.fileKey, text, settled.missingExtension);
   return source;
 }
 
-void SourceMaker::NameOddly(AnalyseOrder::Source& source, const StringBase& text,
-                            const FileName& name, const StringBase& missingExtension) const {
+// A name without levels is a file of the language's directory, whichever way one looks at it. One
+// with levels may lead elsewhere, so both its keys are made.
+AnalyseOrder::Source& SourceMaker::MakeSource(const StringBase& text, const FileName& name,
+                                              const StringBase& missingExtension) {
+  if (isLibraryOdd || text.View().find('/') != std::string_view::npos) {
+    return MakeOddSource(text, name, missingExtension);
+  }
+  fileKey = fileKeyPrefix;
+  FileKey::AppendName(fileKey, text, missingExtension);
+  return part.MakeSource(fileKey.View());
+}
+
+AnalyseOrder::Source& SourceMaker::MakeOddSource(const StringBase& text, const FileName& name,
+                                                 const StringBase& missingExtension) {
   FileName full = name;
   const StringBase levels = name.GetPath();
   full.SetHead(directory);
   if (missingExtension.GetLength() > 0) full.SetExtension(missingExtension);
   full.PushPathEnd(levels);
-  source.fileKey = FileKey::OfLocation(full);
+  AnalyseOrder::Source& source = part.MakeSource(FileKey::OfLocation(full).View());
   StringBase entryKey = FileKey::OfEntry(*library, text, missingExtension);
   // They differ for odd names alone; see AnalyseOrder.
-  if (entryKey == source.fileKey) return;
-  source.odd = std::make_unique<const AnalyseOrder::OddName>(
-      AnalyseOrder::OddName{std::move(full), std::move(entryKey)});
+  if (entryKey.View() != source.fileKey) {
+    source.odd = part.Keep(AnalyseOrder::OddName{std::move(full), std::move(entryKey)});
+  }
+  return source;
 }
 
 }  // namespace Tarvo

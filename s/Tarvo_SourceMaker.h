@@ -11,7 +11,7 @@
 namespace Tarvo {
 
 class Kel_Index;
-struct OrderPart;
+class OrderPart;
 
 // Makes the sources of a file's entries, one after another. An entry mostly shares library and
 // language with the one before, so both are kept from one to the next.
@@ -25,15 +25,17 @@ class SourceMaker {
   // that of the entry before stays.
   void EnterLibrary(std::string_view entered);
 
-  // The source of that name, given as text too, in the library that was entered last. It is put
-  // behind the sources of the part.
+  // The source of that name, given as text too, in the library that was entered last. The part
+  // holds it.
   AnalyseOrder::Source& Make(const StringBase& text, const Port::FileName& name,
                              const SourceLanguage& settled, const AnalyseOrder::Mark& mark);
 
  private:
   void EnterDirectory(const SourceLanguage& settled);
-  void NameOddly(AnalyseOrder::Source& source, const StringBase& text, const Port::FileName& name,
-                 const StringBase& missingExtension) const;
+  AnalyseOrder::Source& MakeSource(const StringBase& text, const Port::FileName& name,
+                                   const StringBase& missingExtension);
+  AnalyseOrder::Source& MakeOddSource(const StringBase& text, const Port::FileName& name,
+                                      const StringBase& missingExtension);
 
   const Kel_Index& index;
   std::shared_ptr<const StringBase> file;
@@ -44,6 +46,7 @@ class SourceMaker {
   StringBase subdirectory;  // of the language
   StringBase directory;
   StringBase fileKeyPrefix;
+  StringBase fileKey;  // kept for its memory
   bool isLibraryOdd = false;  // whether its directory is not named as its key
   const AnalyseOrder::Origin* origin = nullptr;
 };
