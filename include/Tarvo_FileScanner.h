@@ -5,6 +5,7 @@
 #include <string>
 #include <string_view>
 
+#include "Port_File.h"
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
 
@@ -22,6 +23,8 @@ class TARVO_EXPORT FileScanner {
   // Throws AppException with level Failure, the file's name in its text, if the file can't be read,
   // opened or closed. May throw std::bad_alloc.
   explicit FileScanner(const Port::FileName& file);
+  // The same for a file that was looked for already, under that name.
+  FileScanner(const Port::FileName& file, Port::FoundFile found);
   ~FileScanner();
 
   // Gives the next line. False, with an empty line, when none is left. May throw std::bad_alloc,

@@ -6,6 +6,7 @@
 #include <utility>
 #include <vector>
 
+#include "Port_File.h"
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
 #include "Tarvo_Kel_Key.h"
@@ -64,6 +65,9 @@ class TARVO_EXPORT Kel_Index {
   // Throws AppException if the version's core description exists but can't be read or parsed. Then,
   // and when memory runs out while it is read, the version is there, without options.
   bool AddIP(const Kel_Key& key, const Port::FileName& location);
+  // The same for a version whose core description, by that name, was looked for already.
+  bool AddIP(const Kel_Key& key, const Port::FileName& location, const Port::FileName& description,
+             Port::FoundFile found);
 
   // Empties the index.
   void ClearIP();
@@ -88,6 +92,12 @@ class TARVO_EXPORT Kel_Index {
   Port::FileName GetIPLocation(const Kel_Key& key) const;
   Kel_Key GetIPKey(const Kel_Key& key) const;
 
+  // A version: its key as it was added, and its directory.
+  using Version = std::pair<const Kel_Key, Port::FileName>;
+  // Both of these at once, or null for what is not in the index. Good until ClearIP or the end of
+  // the index.
+  const Version* FindVersion(const Kel_Key& key) const;
+
   // The keys of all versions that have a location, those without options too, in the order of their
   // bytes.
   StringList GetAllVersionKeys() const;
@@ -104,7 +114,8 @@ class TARVO_EXPORT Kel_Index {
   template <class Value>
   using Table = std::unordered_map<StringBase, std::multimap<Kel_Key, Value, NewestFirst>>;
 
-  TARVO_LOCAL void AddIPOptions(const Kel_Key& key, const Port::FileName& description);
+  TARVO_LOCAL void AddIPOptions(const Kel_Key& key, const Port::FileName& description,
+                                Port::FoundFile found);
 
   Table<Port::FileName> locations;
   std::vector<std::pair<Kel_Key, Port::FileName>> hidden;  // in the order in which they came

@@ -1,6 +1,7 @@
 #ifndef TARVO_OPTIONSCANNER_H
 #define TARVO_OPTIONSCANNER_H
 
+#include "Port_File.h"
 #include "Port_FileName.h"
 #include "Tarvo_Export.h"
 #include "Tarvo_Kel_Key.h"
@@ -31,6 +32,8 @@ class TARVO_EXPORT OptionScanner {
   // statement was bad: each bad one was then issued as an error with its line. May throw
   // std::bad_alloc, and std::length_error for a line beyond 4 GiB.
   OptionScanner(const Kel_Key& key, const Port::FileName& file);
+  // The same for a file that was looked for already, under that name.
+  OptionScanner(const Kel_Key& key, const Port::FileName& file, Port::FoundFile found);
   ~OptionScanner();
 
   // NAME and VERSION, then the options of the file in its order, duplicates included, then the

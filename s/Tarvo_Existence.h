@@ -3,22 +3,14 @@
 
 #include <boost/filesystem.hpp>
 
+#include "Port_File.h"
 #include "Port_FileName.h"
 
 namespace Tarvo {
 
-// What a look at the disk tells of a name. Unknown is what can't be asked for, as behind a
-// directory without permission; a name that is too long for a file is known to be missing.
-enum class Existence { No, Unknown, Yes };
+using Port::Existence;
 
-inline Existence LookFor(const Port::FileName& name) {
-  boost::system::error_code error;
-  const auto status = boost::filesystem::status(name.GetName().GetText(), error);
-  if (boost::filesystem::exists(status)) return Existence::Yes;
-  const bool missing = status.type() == boost::filesystem::file_not_found ||
-                       error == boost::system::errc::filename_too_long;
-  return missing ? Existence::No : Existence::Unknown;
-}
+inline Existence LookFor(const Port::FileName& name) { return Port::File::LookFor(name.GetName()); }
 
 // Whether something of that name is known to exist.
 inline bool Exists(const Port::FileName& name) { return LookFor(name) == Existence::Yes; }

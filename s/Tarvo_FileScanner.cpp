@@ -7,7 +7,6 @@
 #include <string_view>
 #include <utility>
 
-#include "Port_File.h"
 #include "Tarvo_Report.h"
 
 namespace Tarvo {
@@ -43,8 +42,8 @@ bool HasTabs(std::string_view text) noexcept {
 }
 
 // Whether it can be read is asked only where it could not be opened.
-OpenStream Open(const StringBase& name) {
-  OpenStream stream(Port::File::open(name, Port::File::Read));
+OpenStream Open(const StringBase& name, Port::FoundFile& found) {
+  OpenStream stream(found.TakeStream());
   if (stream) return stream;
   if (!Port::File::canread(name)) {
     throw Report::Exception(AppException::Failure, "Cannot read file %s\n", name);
@@ -54,9 +53,13 @@ OpenStream Open(const StringBase& name) {
 
 }  // namespace
 
-FileScanner::FileScanner(const Port::FileName& file) : fileName(file.GetName()) {
+FileScanner::FileScanner(const Port::FileName& file)
+    : FileScanner(file, Port::FoundFile(file.GetName())) {}
+
+FileScanner::FileScanner(const Port::FileName& file, Port::FoundFile found)
+    : fileName(file.GetName()) {
   TARVO_TRACE("Opening File %s\n", fileName);
-  OpenStream stream = Open(fileName);
+  OpenStream stream = Open(fileName, found);
   text = stream->TakeRest();
   // A search through the whole text, for a trace alone.
   if (Report::IsTracing() && HasTabs(text)) TARVO_TRACE("  Tabs found in file %s\n", fileName);

@@ -128,11 +128,17 @@ Kel_Index::Kel_Index() : locations(kBucketHint), options(kBucketHint) {
 
 Kel_Index::~Kel_Index() = default;
 
-// A description that is there shows that its location is there too: the disk is asked once for most
-// versions.
 bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
   const FileName description = GetDataFile(location, key, KEL_QVR_EXTENSION);
-  const Existence described = key.IsValid() ? LookFor(description) : Existence::No;
+  return AddIP(key, location, description,
+               key.IsValid() ? Port::FoundFile(description.GetName()) : Port::FoundFile());
+}
+
+// A description that is there shows that its location is there too: the disk is asked once for most
+// versions.
+bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location, const FileName& description,
+                      Port::FoundFile found) {
+  const Existence described = found.GetExistence();
   if (!key.IsValid() || (described != Existence::Yes && !Exists(location))) {
     TellRefused(key, location);
     kModule.Error("Invalid IP index entry %s at %s\n", key.GetKey(), location.GetName());
@@ -147,7 +153,7 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
   } else if (described == Existence::No) {
     TARVO_TRACE("Unable to define options for IP %s at %s\n", key.GetKey(), location.GetName());
   } else {
-    AddIPOptions(key, description);
+    AddIPOptions(key, description, std::move(found));
     return true;
   }
   TARVO_TRACE("Library IP %s found at %s\n", key.GetKey(), location.GetName());
@@ -156,8 +162,9 @@ bool Kel_Index::AddIP(const Kel_Key& key, const FileName& location) {
 
 // The reader throws for a bad description. The version is in `locations` by then, and stays there
 // without options.
-void Kel_Index::AddIPOptions(const Kel_Key& key, const FileName& description) {
-  PropertyList taken = OptionScanner(key, description).TakeOptions();
+void Kel_Index::AddIPOptions(const Kel_Key& key, const FileName& description,
+                             Port::FoundFile found) {
+  PropertyList taken = OptionScanner(key, description, std::move(found)).TakeOptions();
   const auto first = std::make_move_iterator(taken.begin());
   const auto last = std::make_move_iterator(taken.end());
   Insert(options, key, PropertyList(first, last));  // without the room for more
@@ -205,16 +212,20 @@ StringList Kel_Index::GetLatestIPKeys() const {
   });
 }
 
+const Kel_Index::Version* Kel_Index::FindVersion(const Kel_Key& key) const {
+  return Find(locations, key);
+}
+
 FileName Kel_Index::GetIPLocation(const Kel_Key& key) const {
-  const auto* const entry = Find(locations, key);
-  if (entry) return entry->second;
+  const Version* const version = FindVersion(key);
+  if (version) return version->second;
   throw Report::Exception(AppException::NotFound, "Cannot find IP index entry for %s\n",
                           key.GetKey());
 }
 
 Kel_Key Kel_Index::GetIPKey(const Kel_Key& key) const {
-  const auto* const entry = Find(locations, key);
-  if (entry) return entry->first;
+  const Version* const version = FindVersion(key);
+  if (version) return version->first;
   throw Report::Exception(AppException::NotFound, "Cannot find IP key for %s\n", key.GetKey());
 }
 

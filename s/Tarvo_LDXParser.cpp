@@ -62,33 +62,38 @@ const Kel_Key& CheckRoot(const Kel_Key& key, const Kel_Key& root) {
   throw Circular(root);
 }
 
+// A file that was looked for.
+struct OrderFile {
+  explicit OrderFile(const FileName& file) : name(file), found(file.GetName()) {}
+
+  FileName name;
+  Port::FoundFile found;
+};
+
 // The analyse-order file of a version, which must be there.
-FileName GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
-  FileName file =
-      Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION);
-  // A file that can't be looked at is opened all the same: then the error says why.
-  if (MayExist(file)) return file;
-  Diagnosis::Add([&] {
-    return Diagnosis::Of(Codes::kMissingOrder, file.GetName(), "the file does not exist");
-  });
-  throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", file.GetName()));
+OrderFile GetLdxFile(const Kel_Index& index, const Kel_Key& key) {
+  OrderFile file(
+      Kel_Index::GetDataFile(index.GetIPLocation(key), key, Kel_Index::KEL_LDX_EXTENSION));
+  // One that can't be looked at is read all the same: then the error says why.
+  if (file.found.GetExistence() != Existence::No) return file;
+  const StringBase name = file.name.GetName();
+  Diagnosis::Add(
+      [&] { return Diagnosis::Of(Codes::kMissingOrder, name, "the file does not exist"); });
+  throw Report::Told(Report::Exception(AppException::Failure, "Invalid LDX %s\n", name));
 }
 
 // The key as the index stores it, or as it is if the index does not know it: a file may be read for
 // a core that is in no index.
-Kel_Key Resolve(const Kel_Index& index, const Kel_Key& key) {
-  try {
-    return index.GetIPKey(key);
-  } catch (const AppException&) {
-    return key;
-  }
+const Kel_Key& Resolve(const Kel_Index& index, const Kel_Key& key) {
+  const Kel_Index::Version* const version = index.FindVersion(key);
+  return version ? version->first : key;
 }
 
 // Reads one file. An include makes a further reader, and both work on one list of open files.
 class OrderReader {
  public:
   OrderReader(const Kel_Index& theIndex, OrderAnalysis& theAnalysis, const Kel_Key& version,
-              const Kel_Key& theRoot, StringBase language, FileName theFile)
+              const Kel_Key& theRoot, StringBase language, OrderFile theFile)
       : index(theIndex),
         analysis(theAnalysis),
         open(analysis.open),
@@ -99,7 +104,7 @@ class OrderReader {
         isRoot(theRoot.IsValid() && version == theRoot),
         hdl(std::move(language)),
         ldxFile(std::move(theFile)),
-        fileName(std::make_shared<const StringBase>(ldxFile.GetName())),
+        fileName(std::make_shared<const StringBase>(ldxFile.name.GetName())),
         state(analysis.cores[core.GetKey()]),
         order(analysis, open.empty()),
         maker(index, fileName, order.GetPart()) {}
@@ -125,7 +130,7 @@ class OrderReader {
   void TakeIn(std::string_view text, const Kel_Key& library, const StringBase& language);
   void AddInclude(std::string_view text, const Kel_Key& included);
   void KeepIncludes(const OrderReader& nested);
-  FileName FindOrder(const Kel_Key& library, std::string_view text) const;
+  OrderFile FindOrder(const Kel_Key& library, std::string_view text) const;
   bool ReportUnsettled(const LDXEntry& entry, const SourceLanguage& settled) const;
   void WarnOfSecond(const Source& source, const char* purpose) const;
   void TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const;
@@ -154,7 +159,7 @@ class OrderReader {
   Kel_Key root;
   bool isRoot;  // whether the key is that of the root again
   StringBase hdl;
-  FileName ldxFile;
+  OrderFile ldxFile;
   std::shared_ptr<const StringBase> fileName;
   std::unique_ptr<FileScanner> lines;
   OrderAnalysis::Core& state;
@@ -248,7 +253,7 @@ void OrderReader::Parse() {
   TARVO_TRACE("  Parsing LDX File %s\n", *fileName);
   Port_Input input(*fileName);
   // NOLINTNEXTLINE(modernize-make-unique): made in place, since it can't be moved
-  lines.reset(new FileScanner(ScanFile(ldxFile, Codes::kMissingOrder)));
+  lines.reset(new FileScanner(ScanFile(ldxFile.name, std::move(ldxFile.found), Codes::kMissingOrder)));
   std::string_view line;
   for (unsigned lineNumber = 0; lines->GetNextLine(line, lineNumber);) {
     if (line.empty()) continue;
@@ -442,7 +447,7 @@ bool OrderReader::AddLibrary(const LDXEntry& entry) {
 // Adds the order of a core, read anew if need be.
 void OrderReader::TakeIn(std::string_view text, const Kel_Key& library,
                          const StringBase& language) {
-  const Kel_Key included = Resolve(index, library);
+  const Kel_Key& included = Resolve(index, library);
   auto& reading = analysis.cores[included.GetKey()].readings[language];
   // The root is refused wherever it is included.
   if (!(root.IsValid() && library == root) && analysis.MayReuse(reading)) {
@@ -450,10 +455,10 @@ void OrderReader::TakeIn(std::string_view text, const Kel_Key& library,
     order.Add(*reading.part, std::nullopt);
     return;
   }
-  const FileName file = FindOrder(library, text);
+  OrderFile file = FindOrder(library, text);
   AddInclude(text, included);
   // Not on the stack, of which each level of a deep chain needs some.
-  const auto nested = std::make_unique<OrderReader>(index, analysis, library, root, language, file);
+  const auto nested = std::make_unique<OrderReader>(index, analysis, library, root, language, std::move(file));
   const OrderPart& part =
       analysis.Read(reading, [&]() -> const OrderPart& { return nested->Read(); });
   if (Diagnosis::GoesOn()) KeepIncludes(*nested);
@@ -478,7 +483,7 @@ void OrderReader::KeepIncludes(const OrderReader& nested) {
   }
 }
 
-FileName OrderReader::FindOrder(const Kel_Key& library, std::string_view text) const {
+OrderFile OrderReader::FindOrder(const Kel_Key& library, std::string_view text) const {
   try {
     return GetLdxFile(index, library);
   } catch (AppException& exception) {
@@ -508,21 +513,27 @@ void OrderReader::TraceKnown(const AnalyseOrder::SourcePointers& sources, const 
   }
 }
 
+AnalyseOrder ReadOrder(OrderFile file, const Kel_Index& index, const Kel_Key& version,
+                       const Kel_Key& root, const StringBase& language) {
+  OrderAnalysis analysis;
+  OrderReader reader(index, analysis, version, root, language, std::move(file));
+  reader.Read();
+  return reader.TakeOrder();
+}
+
 }  // namespace
 
 AnalyseOrder ReadAnalyseOrder(const FileName& file, const Kel_Index& index, const Kel_Key& version,
                               const Kel_Key& root, const StringBase& language) {
   CheckRoot(version, root);
-  OrderAnalysis analysis;
-  OrderReader reader(index, analysis, version, root, language, file);
-  reader.Read();
-  return reader.TakeOrder();
+  return ReadOrder(OrderFile(file), index, version, root, language);
 }
 
 LDXParser::LDXParser(const Kel_Index& theIndex, const Kel_Key& version, const Kel_Key& root,
                      const StringBase& language)
-    : LDXParser(GetLdxFile(theIndex, CheckRoot(version, root)), theIndex, version, root, language) {
-}
+    : index(theIndex),
+      order(ReadOrder(GetLdxFile(theIndex, CheckRoot(version, root)), theIndex, version, root,
+                      language)) {}
 
 LDXParser::LDXParser(const FileName& ldxFile, const Kel_Index& theIndex, const Kel_Key& version,
                      const Kel_Key& root, const StringBase& language)

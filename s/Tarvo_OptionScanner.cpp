@@ -50,8 +50,13 @@ StringBase ValueOrEmpty(const PropertyList& options, const StringBase& name) {
 
 }  // namespace
 
+OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file)
+    : OptionScanner(key, file,
+                    key.IsValid() ? Port::FoundFile(file.GetName()) : Port::FoundFile()) {}
+
 // Goes on behind a bad statement, so that each gets its own error.
-OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
+OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file,
+                             Port::FoundFile found) {
   const StringBase name = file.GetName();
   if (!key.IsValid()) {
     throw Report::Exception(AppException::Failure, "Invalid IP key %s for file %s\n", key.GetKey(),
@@ -59,7 +64,7 @@ OptionScanner::OptionScanner(const Kel_Key& key, const Port::FileName& file) {
   }
   TARVO_TRACE("  Parsing QVR File %s\n", name);
   Port_Input input(name);
-  FileScanner lines = ScanFile(file, Codes::kMissingDescription);
+  FileScanner lines = ScanFile(file, std::move(found), Codes::kMissingDescription);
   // In front of what the file states, so that the first match gives those of the version.
   options = {{QVR_OPTION_NAME, key.GetName()}, {QVR_OPTION_VERSION, key.GetVersion()}};
   bool ok = true;

@@ -2,6 +2,7 @@
 #define TARVO_TELLFAULT_H
 
 #include <string_view>
+#include <utility>
 
 #include "Tarvo_AppException.h"
 #include "Tarvo_Diagnosis.h"
@@ -24,11 +25,12 @@ inline KelDiagnostic TellFault(const KelDiagnosticCode& code, const FileScanner&
                        isCut ? "'#' begins a comment, in quotes too" : "");
 }
 
-// Opens a data file of a core. One that can't be read is told, with the code for a missing one
+// Reads a data file of a core that was looked for. One that can't be read is told, with the code for a missing one
 // where that is what is wrong; the exception passes.
-inline FileScanner ScanFile(const Port::FileName& file, const KelDiagnosticCode& missing) {
+inline FileScanner ScanFile(const Port::FileName& file, Port::FoundFile found,
+                            const KelDiagnosticCode& missing) {
   try {
-    return FileScanner(file);
+    return {file, std::move(found)};
   } catch (AppException& exception) {
     Diagnosis::Add([&] {
       return MayExist(file)
@@ -38,6 +40,10 @@ inline FileScanner ScanFile(const Port::FileName& file, const KelDiagnosticCode&
     exception.told = true;
     throw;
   }
+}
+
+inline FileScanner ScanFile(const Port::FileName& file, const KelDiagnosticCode& missing) {
+  return ScanFile(file, Port::FoundFile(file.GetName()), missing);
 }
 
 }  // namespace Tarvo

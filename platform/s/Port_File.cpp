@@ -1,5 +1,9 @@
-// A file is read whole when it is opened, and only if it is a plain one: no pipe or device can hold
-// up a reader, and no other program's changes can reach it afterwards.
+// A file is read whole, and only if it is a plain one: no pipe or device can hold up a reader, and no
+// other program's changes can reach it afterwards.
+//
+// Where files lie on a network, each look at a name may take as long as reading a hundred files, so
+// there is one for a plain file: it is opened, and then asked what it is. A link may lead out of the
+// repository, to a device that opening alone sets going, so what is behind one is looked at before.
 
 #include "Port_File.h"
 
@@ -49,24 +53,35 @@ bool Stream::Close() noexcept {
   return open < 0 || ::close(open) == 0;
 }
 
-// Nothing else is opened at all, since that alone may set a device or a pipe's writer going.
-// Without O_NONBLOCK a pipe that took the file's place meanwhile would block until somebody writes
-// to it.
 bool Stream::Open(const char* name) noexcept {
-  if (!IsRegular(name)) return false;
-  descriptor = ::open(name, O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK);
-  return descriptor >= 0;
+  if (OpenPlain(name, O_NOFOLLOW)) return true;
+  return errno == ELOOP && IsRegular(name) && OpenPlain(name, 0);
 }
 
-// Up to the length that the file has now: what is added meanwhile does not count.
-bool Stream::ReadAll() {
+// Without O_NONBLOCK a pipe would block until somebody writes to it. False, with the reason in
+// errno, for what is no plain file.
+bool Stream::OpenPlain(const char* name, int further) noexcept {
+  descriptor = ::open(name, O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK | further);
+  if (descriptor < 0) return false;
   struct stat status = {};
-  if (::fstat(descriptor, &status) != 0 || !S_ISREG(status.st_mode)) return false;
-  content.resize(static_cast<std::size_t>(status.st_size));
+  if (::fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode)) {
+    length = static_cast<std::size_t>(status.st_size);
+    return true;
+  }
+  Close();
+  errno = EINVAL;
+  return false;
+}
+
+// Up to the length that the file had when it was opened: what is added meanwhile does not count.
+bool Stream::ReadAll() {
+  if (isRead) return true;
+  content.resize(length);
   if (!ReadBytes()) return false;
   if (std::string_view(content).substr(0, kByteOrderMark.size()) == kByteOrderMark) {
     position = kByteOrderMark.size();
   }
+  isRead = true;
   return true;
 }
 
@@ -101,13 +116,39 @@ std::string Stream::TakeRest() {
   return std::exchange(content, {});
 }
 
+// What does not open may be there all the same.
+FoundFile::FoundFile(const char* name) : stream(new Stream) {
+  if (stream->Open(name)) {
+    existence = Existence::Yes;
+    return;
+  }
+  existence = errno == ENOENT ? Existence::No : File::LookFor(name);
+  stream.reset();
+}
+
+Stream* FoundFile::TakeStream() {
+  std::unique_ptr<Stream> taken = std::move(stream);
+  return taken && taken->ReadAll() ? taken.release() : nullptr;
+}
+
+bool FoundFile::ReadAhead(std::size_t longest) {
+  if (existence == Existence::No) return true;
+  return stream && stream->length <= longest && stream->ReadAll() && stream->Close();
+}
+
+Existence File::LookFor(const char* name) noexcept {
+  struct stat status = {};
+  if (::stat(name, &status) == 0) return Existence::Yes;
+  const bool isMissing = errno == ENOENT || errno == ENOTDIR || errno == ENAMETOOLONG;
+  return isMissing ? Existence::No : Existence::Unknown;
+}
+
 bool File::canread(const char* name) noexcept {
   return IsRegular(name) && ::faccessat(AT_FDCWD, name, R_OK, AT_EACCESS) == 0;
 }
 
 Stream* File::open(const char* name, Access /*access*/, bool /*reserved*/) {
-  std::unique_ptr<Stream> stream(new Stream);
-  return stream->Open(name) && stream->ReadAll() ? stream.release() : nullptr;
+  return FoundFile(name).TakeStream();
 }
 
 bool File::close(Stream* stream) noexcept {
