@@ -71,8 +71,8 @@ class AnalyseOrder {
   // Sources by their file keys, for tables of many: without a block of memory for each.
   class KeyTable {
    public:
-    // The source of that key, which for one that was not there is this one.
-    const Source* FindOrAdd(std::string_view key, const Source& source);
+    // Adds a source under a key, and gives null. Gives the source that has the key already.
+    const Source* Add(std::string_view key, const Source& source);
     const Source* Find(std::string_view key) const;
 
    private:

@@ -39,15 +39,15 @@ std::size_t AnalyseOrder::KeyTable::Probe(std::string_view key, std::uint32_t ha
   return at;
 }
 
-const AnalyseOrder::Source* AnalyseOrder::KeyTable::FindOrAdd(std::string_view key,
-                                                              const Source& source) {
+const AnalyseOrder::Source* AnalyseOrder::KeyTable::Add(std::string_view key,
+                                                        const Source& source) {
   if (slots.size() * 2 <= count * 3) Grow();
   const std::uint32_t hash = HashOf(key);
   Slot& slot = slots[Probe(key, hash)];
   if (slot.source) return slot.source;
   slot = {&source, hash, key != source.fileKey};
   ++count;
-  return &source;
+  return nullptr;
 }
 
 const AnalyseOrder::Source* AnalyseOrder::KeyTable::Find(std::string_view key) const {
@@ -69,10 +69,9 @@ void AnalyseOrder::KeyTable::Grow() {
 }
 
 const AnalyseOrder::Source* AnalyseOrder::SourceList::Add(const Source& source) {
-  const Source* const known = sourcesByKey.FindOrAdd(source.GetEntryKey(), source);
-  if (known != &source) return known;
-  AppendSource(source);
-  return nullptr;
+  const Source* const known = sourcesByKey.Add(source.GetEntryKey(), source);
+  if (!known) AppendSource(source);
+  return known;
 }
 
 // Most sources follow one of the same library, so that its text is seldom looked up.
@@ -93,10 +92,10 @@ AnalyseOrder::SourcePointers AnalyseOrder::SourceList::Append(const SourceList& 
   SourcePointers known;
   for (const Library& library : other.libraries) {
     for (const Source* const source : library.sources) {
-      if (sourcesByKey.FindOrAdd(source->fileKey, *source) == source) {
-        AppendSource(*source);
-      } else {
+      if (sourcesByKey.Add(source->fileKey, *source)) {
         known.push_back(source);
+      } else {
+        AppendSource(*source);
       }
     }
   }

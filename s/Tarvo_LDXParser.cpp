@@ -89,7 +89,8 @@ const Kel_Key& Resolve(const Kel_Index& index, const Kel_Key& key) {
   return version ? version->first : key;
 }
 
-// Reads one file. An include makes a further reader, and both work on one list of open files.
+// Reads one file. An include makes a further reader, and both work on one list of open files. The
+// keys that it is given outlive it.
 class OrderReader {
  public:
   OrderReader(const Kel_Index& theIndex, OrderAnalysis& theAnalysis, const Kel_Key& version,
@@ -154,9 +155,9 @@ class OrderReader {
   const Kel_Index& index;
   OrderAnalysis& analysis;
   OpenOrders& open;
-  Kel_Key key;   // as given
-  Kel_Key core;  // the version that it stands for
-  Kel_Key root;
+  const Kel_Key& key;   // as given
+  const Kel_Key& core;  // the version that it stands for
+  const Kel_Key& root;
   bool isRoot;  // whether the key is that of the root again
   StringBase hdl;
   OrderFile ldxFile;
@@ -174,7 +175,7 @@ class OrderReader {
 const OrderPart& OrderReader::Read() {
   CheckNesting();
   if (Diagnosis::GoesOn() && !analysis.done.insert(*fileName).second) return order.GetPart();
-  open.push_back({fileName, core, {}});
+  open.push_back({fileName, &core, {}});
   ++state.timesOpen;
   try {
     Parse();
@@ -206,7 +207,7 @@ void OrderReader::CheckNesting() const {
   auto same = open.cend();
   if (state.timesOpen > 0) {
     same = std::find_if(open.cbegin(), open.cend(), [&](const OpenOrder& outer) {
-      return outer.core == core && (isRoot || *outer.file == *fileName);
+      return *outer.core == core && (isRoot || *outer.file == *fileName);
     });
   }
   // The root is refused by its key, all others by file and core.
@@ -234,14 +235,14 @@ void OrderReader::TellCircle(OpenOrders::const_iterator first) const {
                            : std::prev(circle.end());
     std::rotate(circle.begin(), start, circle.end());
     std::string cores;
-    for (const OpenOrder& step : circle) cores += std::string(step.core.GetKey()) + ", ";
+    for (const OpenOrder& step : circle) cores += std::string(step.core->GetKey()) + ", ";
     KelDiagnostic told =
         Diagnosis::AtPlace(Codes::kIncludeCircle, PlaceOf(circle[0]),
-                           Say({"circle of includes: ", cores, circle[0].core.GetKey().View()}),
+                           Say({"circle of includes: ", cores, circle[0].core->GetKey().View()}),
                            "take one of the includes out");
     // Otherwise the includes are told as those that lead here.
     for (std::size_t i = 1; Diagnosis::GoesOn() && i < circle.size(); ++i) {
-      const Kel_Key& next = circle[(i + 1) % circle.size()].core;
+      const Kel_Key& next = *circle[(i + 1) % circle.size()].core;
       told.related.push_back({PlaceOf(circle[i]), Say({"includes ", next.GetKey().View()})});
     }
     return told;

@@ -36,14 +36,17 @@ const OrderPart& OrderAnalysis::ReadAgain(const Reading& reading,
                                           const std::function<const OrderPart&()>& read) {
   const std::size_t before = parts.size();
   const bool wasAgain = std::exchange(isAgain, true);
+  // Of its own, so that what is read many times needs memory once.
+  const auto former = std::exchange(memory, std::make_shared<OrderPart::Memory>());
   read();
+  memory = former;
   isAgain = wasAgain;
   parts.resize(before);
   return *reading.part;
 }
 
 OrderPart& OrderAnalysis::NewPart() {
-  auto part = std::make_shared<OrderPart>();
+  auto part = std::make_shared<OrderPart>(memory);
   parts.push_back(part);
   return *part;
 }

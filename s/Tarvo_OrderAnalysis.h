@@ -18,7 +18,7 @@ namespace Tarvo {
 // A file that is being read, and the entry that it has come to.
 struct OpenOrder {
   std::shared_ptr<const StringBase> file;
-  Kel_Key core;
+  const Kel_Key* core;
   AnalyseOrder::Mark entry;
 };
 // The outermost first.
@@ -65,6 +65,7 @@ class OrderAnalysis {
  private:
   const OrderPart& ReadAgain(const Reading& reading, const std::function<const OrderPart&()>& read);
 
+  std::shared_ptr<OrderPart::Memory> memory = std::make_shared<OrderPart::Memory>();
   bool isShared = true;
   bool isAgain = false;
 };

@@ -56,9 +56,9 @@ const AnalyseOrder& AddUpOdd(const OrderPart& part, Orders& orders) {
 
 AnalyseOrder::Source& OrderPart::MakeSource(std::string_view fileKey) {
   static_assert(std::is_trivially_destructible_v<Source>);
-  auto* const text = static_cast<char*>(memory.allocate(fileKey.size(), 1));
+  auto* const text = static_cast<char*>(memory->allocate(fileKey.size(), 1));
   std::memcpy(text, fileKey.data(), fileKey.size());
-  auto* const source = new (memory.allocate(sizeof(Source), alignof(Source))) Source;
+  auto* const source = new (memory->allocate(sizeof(Source), alignof(Source))) Source;
   source->fileKey = {text, fileKey.size()};
   return *source;
 }
@@ -76,12 +76,12 @@ const IncludeDirectory& OrderPart::Keep(IncludeDirectory directory) {
 }
 
 void OrderPart::Add(const Source& source) {
-  entries.emplace_back(&source);
+  Append(&source);
   hasOdd = hasOdd || source.odd;
 }
 
 void OrderPart::Add(const OrderPart& core) {
-  entries.emplace_back(&core);
+  Append(&core);
   levels = std::max(levels, core.levels + 1);
   hasOdd = hasOdd || core.hasOdd;
 }
