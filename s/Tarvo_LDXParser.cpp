@@ -254,7 +254,8 @@ void OrderReader::Parse() {
   TARVO_TRACE("  Parsing LDX File %s\n", *fileName);
   Port_Input input(*fileName);
   // NOLINTNEXTLINE(modernize-make-unique): made in place, since it can't be moved
-  lines.reset(new FileScanner(ScanFile(ldxFile.name, std::move(ldxFile.found), Codes::kMissingOrder)));
+  lines.reset(
+      new FileScanner(ScanFile(ldxFile.name, std::move(ldxFile.found), Codes::kMissingOrder)));
   std::string_view line;
   for (unsigned lineNumber = 0; lines->GetNextLine(line, lineNumber);) {
     if (line.empty()) continue;
@@ -459,7 +460,8 @@ void OrderReader::TakeIn(std::string_view text, const Kel_Key& library,
   OrderFile file = FindOrder(library, text);
   AddInclude(text, included);
   // Not on the stack, of which each level of a deep chain needs some.
-  const auto nested = std::make_unique<OrderReader>(index, analysis, library, root, language, std::move(file));
+  const auto nested =
+      std::make_unique<OrderReader>(index, analysis, library, root, language, std::move(file));
   const OrderPart& part =
       analysis.Read(reading, [&]() -> const OrderPart& { return nested->Read(); });
   if (Diagnosis::GoesOn()) KeepIncludes(*nested);

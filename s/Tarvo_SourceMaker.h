@@ -46,7 +46,7 @@ class SourceMaker {
   StringBase subdirectory;  // of the language
   StringBase directory;
   StringBase fileKeyPrefix;
-  StringBase fileKey;  // kept for its memory
+  StringBase fileKey;         // kept for its memory
   bool isLibraryOdd = false;  // whether its directory is not named as its key
   const AnalyseOrder::Origin* origin = nullptr;
 };

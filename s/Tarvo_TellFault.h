@@ -25,8 +25,8 @@ inline KelDiagnostic TellFault(const KelDiagnosticCode& code, const FileScanner&
                        isCut ? "'#' begins a comment, in quotes too" : "");
 }
 
-// Reads a data file of a core that was looked for. One that can't be read is told, with the code for a missing one
-// where that is what is wrong; the exception passes.
+// Reads a data file of a core that was looked for. One that can't be read is told, with the code
+// for a missing one where that is what is wrong; the exception passes.
 inline FileScanner ScanFile(const Port::FileName& file, Port::FoundFile found,
                             const KelDiagnosticCode& missing) {
   try {

@@ -61,8 +61,8 @@ class PORT_EXPORT Stream {
   std::size_t position = 0;
 };
 
-// What a look at the disk tells of a name. Unknown is what can't be looked at, as behind a directory
-// without permission; a name that is too long for a file is known to be missing.
+// What a look at the disk tells of a name. Unknown is what can't be looked at, as behind a
+// directory without permission; a name that is too long for a file is known to be missing.
 enum class Existence { No, Unknown, Yes };
 
 // What one look at a name found: whether something is there and, if it is a plain file that this

@@ -1,9 +1,10 @@
-// A file is read whole, and only if it is a plain one: no pipe or device can hold up a reader, and no
-// other program's changes can reach it afterwards.
+// A file is read whole, and only if it is a plain one: no pipe or device can hold up a reader, and
+// no other program's changes can reach it afterwards.
 //
 // Where files lie on a network, each look at a name may take as long as reading a hundred files, so
-// there is one for a plain file: it is opened, and then asked what it is. A link may lead out of the
-// repository, to a device that opening alone sets going, so what is behind one is looked at before.
+// there is one for a plain file: it is opened, and then asked what it is. A link may lead out of
+// the repository, to a device that opening alone sets going, so what is behind one is looked at
+// before.
 
 #include "Port_File.h"
 
