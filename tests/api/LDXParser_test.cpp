@@ -116,6 +116,22 @@ TEST_F(AnalyseOrder, ReadsAnyFileForACore) {
   EXPECT_EQ(ReadOther("other", "abc_v1_00_a"), refused);
   EXPECT_EQ(ReadOther("other", "abc_v1_00_a", "xyz_v1_00_a"), refused);
   EXPECT_EQ(Read("abc"), "abc_v1_00_a/hdl/vhdl/a.vhd, xyz_v1_00_a/hdl/vhdl/x.vhd");
+  // By its bare name the root's core may be included, by its key never.
+  repo.File("twice", "lib abc all\nlib abc_v1_00_a all");
+  EXPECT_EQ(ReadOther("twice", "abc_v1_00_a"), "failure: Invalid LDX " + repo / "twice" + "\n");
+}
+
+// A core that is read again, for its warnings, adds nothing: not even what was written meanwhile.
+TEST_F(AnalyseOrder, KeepsWhatItReadFirst) {
+  const std::string known = "lib a a.vhd\nlib a a.vhd";
+  Core("a_v1_00_a", known);
+  Core("n_v1_00_a", "lib n n.vhd");
+  Core("b_v1_00_a", "lib a all");
+  Core("top_v1_00_a", "lib a all\nlib b all");
+  const auto previous = Port_MsgManData::setHandler(
+      [&](const Port_Message&) { repo.Core("a_v1_00_a").Ldx(known + "\nlib a x.vhd\nlib n all"); });
+  EXPECT_EQ(Read("top_v1_00_a"), "a_v1_00_a/hdl/vhdl/a.vhd");
+  Port_MsgManData::setHandler(previous);
 }
 
 // The root is told by the text of its key alone; all else is left to the levels between.
