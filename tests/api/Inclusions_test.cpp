@@ -38,6 +38,8 @@ struct Order {
 
 std::string KeyOf(int core) { return "c" + std::to_string(core) + "_v1_00_a"; }
 
+// Some cores have one, and some the same.
+bool HasDirectory(int core) { return core % 2 == 1; }
 std::string DirectoryOf(int core) { return "d" + std::to_string(core % 3); }
 
 // How the file's name is written once its location is known.
@@ -64,7 +66,7 @@ class Rule {
 
   Order Read(int core) {
     Order order;
-    order.directories = {DirectoryOf(core)};
+    if (HasDirectory(core)) order.directories = {DirectoryOf(core)};
     for (const Entry& entry : cores[static_cast<std::size_t>(core)]) {
       if (entry.file.empty()) {
         Append(order, core, entry.library);
@@ -137,7 +139,7 @@ class Inclusions : public testing::Test, protected IndexedRepository {
 
   void Write(int core, const Entries& entries) {
     const char* const keywords[][2] = {{"", "simlib "}, {"synlib ", "lib "}};
-    std::string ldx = "vlgincdir " + DirectoryOf(core) + " data\n";
+    std::string ldx = HasDirectory(core) ? "vlgincdir " + DirectoryOf(core) + " data\n" : "";
     for (const Entry& entry : entries) {
       ldx += keywords[entry.forSide[0]][entry.forSide[1]] + KeyOf(entry.library) + " " +
              (entry.file.empty() ? "all" : entry.file) + "\n";
@@ -178,7 +180,7 @@ TEST_F(Inclusions, TellTheSameAsTheRule) {
     return text.find("already exists") != std::string::npos;
   };
   const auto isTrace = [](const std::string& text) { return text.find("trace: ") == 0; };
-  for (int round = 0; round < 200; ++round) {
+  for (int round = 0; round < 150; ++round) {
     SCOPED_TRACE(round);
     index.ClearIP();
     const bool withOdd = round % 2 == 0;
