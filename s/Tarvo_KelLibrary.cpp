@@ -4,8 +4,8 @@
 #include "Tarvo_KelLibrary.h"
 
 #include <boost/filesystem.hpp>
+#include <utility>
 
-#include "Port_FileName.h"
 #include "Tarvo_Guard.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary_Utils.h"
@@ -16,6 +16,7 @@
 #include "Tarvo_PropertyList.h"
 #include "Tarvo_Report.h"
 #include "Tarvo_TellUnknown.h"
+#include "Tarvo_VersionWalk.h"
 
 namespace Tarvo {
 
@@ -24,16 +25,6 @@ namespace fs = boost::filesystem;
 namespace {
 
 constexpr Report::Module kModule{"s/Tarvo_KelLibrary", "1.0"};
-
-// True for a directory, and for what can't be looked at, which the index then reports. False for
-// all else, as a file or a link that leads nowhere or back to itself.
-bool MayBeVersion(const fs::directory_entry& entry) {
-  namespace errc = boost::system::errc;
-  boost::system::error_code error;
-  const fs::file_status status = entry.status(error);
-  if (status.type() != fs::status_error) return fs::is_directory(status);
-  return error != errc::too_many_symbolic_link_levels;
-}
 
 }  // namespace
 
@@ -49,7 +40,7 @@ class KelLibraryImpl {
 
  private:
   bool AddRepository(const StringBase& repository);
-  bool AddVersion(const fs::directory_entry& entry);
+  bool AddVersion(VersionWalk::Version version);
 };
 
 KelLibraryImpl::KelLibraryImpl() { TARVO_TRACE("Constructing empty KEL Library\n"); }
@@ -83,26 +74,22 @@ bool KelLibraryImpl::AddRepository(const StringBase& repository) {
     return false;
   }
   bool all = true;
-  for (const fs::directory_entry& entry : fs::directory_iterator(versions)) {
+  for (VersionWalk walk(versions); !walk.IsOver();) {
     // In this order of operands, so that a bad version keeps no other out.
-    all = AddVersion(entry) && all;
+    all = AddVersion(walk.Take()) && all;
   }
   return all;
 }
 
 // Passes over what is no version. A description that can't be read costs the version its options,
 // and nobody else anything.
-bool KelLibraryImpl::AddVersion(const fs::directory_entry& entry) {
-  // A look at the name costs nothing; only what may be a version is looked at on disk.
-  const Kel_Key key(StringBase(entry.path().filename().c_str()));
-  if (!key.IsValid() || !MayBeVersion(entry)) return true;
-  Port::FileName location;
-  // The whole path as a directory: a name with a dot is not to be split.
-  location.SetHead(entry.path().c_str());
+bool KelLibraryImpl::AddVersion(VersionWalk::Version version) {
+  if (!version.MayBeOne()) return true;
+  const Port::FileName& location = version.location;
   try {
-    return index.AddIP(key, location);
+    return index.AddIP(version.key, location, version.description, std::move(version.found));
   } catch (const AppException& exception) {
-    kModule.Error("Invalid IP index entry %s at %s\n%s\n", key.GetKey(), location.GetName(),
+    kModule.Error("Invalid IP index entry %s at %s\n%s\n", version.key.GetKey(), location.GetName(),
                   exception.what());
     return true;
   }

@@ -43,7 +43,7 @@ RANKS = [
     (13, r"s/Tarvo_(OrderAnalysis|SourceMaker)\..*"),
     (14, r"(include|s)/Tarvo_(LDXParser(_Hdl|_Answers)?|TEWParser)\..*"),
     (15, r"(include|s)/Tarvo_KelIP\..*"),
-    (16, r"(include|s)/Tarvo_KelLibrary\..*"),
+    (16, r"(include|s)/Tarvo_(KelLibrary|VersionWalk)\..*"),
     (17, r"s/Tarvo_(DescriptionChecker|OrderChecker)\..*"),
     (18, r"s/Tarvo_TableChecker\..*"),
     (19, r"(include|s)/Tarvo_KelChecker\..*"),

@@ -49,7 +49,7 @@ class PORT_EXPORT Stream {
   Stream() noexcept = default;
 
   PORT_LOCAL bool Open(const char* name) noexcept;
-  PORT_LOCAL bool OpenPlain(const char* name, int further) noexcept;
+  PORT_LOCAL bool OpenPlain(const char* name, bool followsLink) noexcept;
   PORT_LOCAL bool ReadAll();
   PORT_LOCAL bool ReadBytes();
   PORT_LOCAL bool Close() noexcept;

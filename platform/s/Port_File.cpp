@@ -55,14 +55,15 @@ bool Stream::Close() noexcept {
 }
 
 bool Stream::Open(const char* name) noexcept {
-  if (OpenPlain(name, O_NOFOLLOW)) return true;
-  return errno == ELOOP && IsRegular(name) && OpenPlain(name, 0);
+  if (OpenPlain(name, false)) return true;
+  return errno == ELOOP && IsRegular(name) && OpenPlain(name, true);
 }
 
 // Without O_NONBLOCK a pipe would block until somebody writes to it. False, with the reason in
 // errno, for what is no plain file.
-bool Stream::OpenPlain(const char* name, int further) noexcept {
-  descriptor = ::open(name, O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK | further);
+bool Stream::OpenPlain(const char* name, bool followsLink) noexcept {
+  constexpr int how = O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK;
+  descriptor = followsLink ? ::open(name, how) : ::open(name, how | O_NOFOLLOW);
   if (descriptor < 0) return false;
   struct stat status = {};
   if (::fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode)) {

@@ -1,7 +1,8 @@
 // Preloaded, lets chosen calls to the system fail: those that concern a path below the directory
 // FAILING_BELOW, or a descriptor that was opened there, are counted from 1, and each whose number
 // stands in FAILING_CALLS fails with the error number FAILING_ERROR. All that were counted are
-// written to the file FAILING_LOG, one on a line.
+// written to the file FAILING_LOG, one on a line. Each that gives a path takes FAILING_DELAY
+// microseconds longer, as on a disk that is far away.
 
 #undef _FORTIFY_SOURCE  // which makes some of these functions inline ones
 
@@ -13,11 +14,14 @@
 #include <unistd.h>
 
 #include <array>
+#include <atomic>
 #include <cerrno>
 #include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
+#include <ctime>
 #include <string>
+#include <string_view>
 
 namespace {
 
@@ -45,6 +49,7 @@ std::string PathOf(int directory, const char* path) {
 
 void Log(const std::string& line) {
   const char* const file = Setting("FAILING_LOG");
+  if (*file == 0) return;
   const long log =
       ::syscall(SYS_openat, AT_FDCWD, file, O_WRONLY | O_APPEND | O_CREAT | O_CLOEXEC, 0600);
   if (log < 0) return;
@@ -60,13 +65,27 @@ bool IsChosen(unsigned long number) {
   }
 }
 
+// Those that are given a descriptor need not look for anything.
+bool IsLook(std::string_view call) {
+  return call != "read" && call != "fstat" && call != "fstat64" && call != "fdopendir" &&
+         call != "readdir" && call != "readdir64";
+}
+
+void Delay() {
+  static const long delay = std::atol(Setting("FAILING_DELAY"));
+  if (delay == 0) return;
+  const timespec time = {0, delay * 1000};
+  ::nanosleep(&time, nullptr);
+}
+
 // Counts a call. True, with the error number set, if it is to fail.
 bool Fails(const char* call, const std::string& path) {
-  static unsigned long count = 0;
+  static std::atomic<unsigned long> count = 0;
   const int kept = errno;
   const std::string below = std::string(Setting("FAILING_BELOW")) + '/';
   const bool counts = (path + '/').compare(0, below.size(), below) == 0;
   if (counts) Log(std::string(call) + ' ' + path + '\n');
+  if (counts && IsLook(call)) Delay();
   const bool fails = counts && IsChosen(++count);
   errno = fails ? std::atoi(Setting("FAILING_ERROR")) : kept;
   return fails;
