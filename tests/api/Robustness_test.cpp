@@ -7,14 +7,19 @@
 
 #include <algorithm>
 #include <array>
+#include <atomic>
+#include <chrono>
 #include <filesystem>
 #include <fstream>
 #include <memory>
+#include <optional>
 #include <string>
+#include <thread>
 #include <utility>
 
 #include "AllocationFault.h"
 #include "MessageRecorder.h"
+#include "OpenHook.h"
 #include "OrdinaryUser.h"
 #include "Outcome.h"
 #include "RepositoryBuilder.h"
@@ -112,6 +117,28 @@ TEST_F(Request, SurvivesEachFailedAllocation) {
       EXPECT_THAT(recorder.Take(), IsEmpty());
     }
   }
+}
+
+// Where memory runs out for who reads ahead, the walk reads itself.
+TEST_F(Request, NeedsNoMemoryToReadAhead) {
+  for (int i = 0; i < 60; ++i) {
+    repo.Core("c" + std::to_string(i) + "_v1_00_a").Qvr("OPTION DESC = some text of some length");
+  }
+  static const auto self = std::this_thread::get_id();
+  static std::atomic<int> others;
+  const OpenHook slow([](const char*) {
+    std::this_thread::sleep_for(std::chrono::microseconds(300));
+    thread_local std::optional<AllocationFault> fault;
+    if (std::this_thread::get_id() == self) return 0;
+    fault.emplace(0,
+                  ++others % 2 == 0 ? AllocationFault::BadAlloc : AllocationFault::SomethingElse);
+    return 0;
+  });
+  EXPECT_TRUE(library.SetRepositoryPath(path));
+  EXPECT_GT(others, 0);
+  StringList keys;
+  EXPECT_TRUE(library.ListAllIPKeys(keys) && keys.size() == 62);
+  EXPECT_THAT(recorder.Take(), IsEmpty());
 }
 
 // What a file becomes, and how.
