@@ -11,6 +11,7 @@ slows down slows down both. A ratio is the median of the ratios of the rounds.
 import json
 import os
 import re
+import shlex
 import statistics
 import subprocess
 import sys
@@ -39,6 +40,16 @@ class Measured:
         return result["real_time"] * {"ns": 1e-6, "us": 1e-3, "ms": 1}[result["time_unit"]] / self.per
 
 
+def in_directory(text):
+    """A word or path with the directory of the repositories for DIR."""
+    return text.replace("DIR", os.environ["KEL_BENCH_DIRECTORY"])
+
+
+def call_of(tool, programs):
+    """The words that call a tool: kel is the one that was built, and KEL_BENCH_TOOL may tell those of another."""
+    return [programs / "kel"] if tool == "kel" else shlex.split(os.environ.get(f"KEL_BENCH_{tool.upper()}", tool))
+
+
 class Command:
     """A whole command, start included; DIR stands for the directory of the repositories."""
 
@@ -48,12 +59,13 @@ class Command:
     def __str__(self):
         return " ".join(self.words)
 
+    def run(self, programs, **where):
+        words = call_of(self.words[0], programs) + [in_directory(word) for word in self.words[1:]]
+        return subprocess.run(words, text=True, **where)
+
     def milliseconds(self, programs):
-        words = [word.replace("DIR", os.environ["KEL_BENCH_DIRECTORY"]) for word in self.words]
-        if words[0] == "kel":
-            words[0] = programs / "kel"
         begin = time.perf_counter()
-        subprocess.run(words, check=True, stdout=subprocess.DEVNULL)
+        self.run(programs, check=True, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL)
         return (time.perf_counter() - begin) * 1000
 
 
@@ -127,16 +139,22 @@ def measure_memory(programs):
     return {key: result[key] for key in ("KiB/version", "MiB above the end")}
 
 
-def main():
-    programs, target = Path(sys.argv[1]).resolve(), Path(sys.argv[2])
-    runs = int(sys.argv[3]) if len(sys.argv) > 3 else 9
+def compare_all(comparisons, programs, runs):
+    """Prints the table, each row as soon as it is measured, and gives the rows with their samples."""
     print(f"Medians of {runs} rounds, in milliseconds.\n")
     print("| what | beside | median | median | ratio | rounds | at most |")
     print("|---|---|---:|---:|---:|---|---:|")
     rows = []
-    for row in COMPARISONS:
+    for row in comparisons:
         rows.append(compare(row, programs, runs))
         report(rows[-1])
+    return rows
+
+
+def main():
+    programs, target = Path(sys.argv[1]).resolve(), Path(sys.argv[2])
+    runs = int(sys.argv[3]) if len(sys.argv) > 3 else 9
+    rows = compare_all(COMPARISONS, programs, runs)
     memory = measure_memory(programs)
     print(f"\nMemory of an index of 50,000 versions: {memory['KiB/version']:.2f} KiB a version; the most "
           f"during the walk was {memory['MiB above the end']:.1f} MiB above that at its end.")
