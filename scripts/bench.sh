@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Builds, measures what docs/performance.md states, prints medians and ratios as a table and leaves
 # all samples in build/gcc-release/bench.json. Takes some minutes and a gigabyte of temporary space. A
-# second table is for the other tools that are there: some more minutes, and nothing where there is none.
+# second table is for other tools: as much again where they are there, and nothing where not.
 # Usage: bench.sh [ROUNDS]   by default 9
 set -euo pipefail
 cd "$(dirname "$0")/.."
