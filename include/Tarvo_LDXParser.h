@@ -48,8 +48,9 @@ class Kel_Index;
 // text of their name below the language's directory. Synthesis and simulation are independent of
 // each other. No file is asked whether it exists.
 //
-// Everything is read by the constructor, the files of included cores too; a core that is reached
-// twice is read twice. The queries look at no file.
+// Everything is read by the constructor, the files of included cores too. A core that several ways
+// lead to is read once, unless somebody could tell: while the logger is on, and where reading it
+// issued a message, it is read for each way. The queries look at no file.
 //
 // Failures: reading and asking may throw std::bad_alloc; so that it can be read, a line must be
 // shorter than 4 GiB. A path throws std::filesystem::filesystem_error if the repository was given
