@@ -132,7 +132,7 @@ class AnalyseOrder {
 
   // What stood in the lists already; null where the source is new or was not to be added.
   struct Earlier {
-    explicit operator bool() const { return synthesis || simulation; }
+    explicit operator bool() const { return synthesis != nullptr || simulation != nullptr; }
 
     const Source* synthesis = nullptr;
     const Source* simulation = nullptr;

@@ -10,7 +10,7 @@
 namespace Tarvo {
 
 bool OrderAnalysis::MayReuse(const Reading& reading) const {
-  return reading.part && reading.isSilent && !Report::IsTracing() &&
+  return reading.part != nullptr && reading.isSilent && !Report::IsTracing() &&
          open.size() + reading.part->GetLevels() <= kDeepestLevel;
 }
 
@@ -70,8 +70,8 @@ AnalyseOrder::Earlier CoreOrder::Add(AnalyseOrder::Source& source, bool forSynth
   if (source.odd) analysis.StopSharing();
   const auto earlier =
       AddOwn([&](AnalyseOrder& order) { return order.Add(source, forSynthesis, forSimulation); });
-  source.forSynthesis = forSynthesis && !earlier.synthesis;
-  source.forSimulation = forSimulation && !earlier.simulation;
+  source.forSynthesis = forSynthesis && earlier.synthesis == nullptr;
+  source.forSimulation = forSimulation && earlier.simulation == nullptr;
   if (source.forSynthesis || source.forSimulation) part.Add(source);
   return earlier;
 }

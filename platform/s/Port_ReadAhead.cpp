@@ -4,11 +4,11 @@
 #include "Port_ReadAhead.h"
 
 #include <pthread.h>
-#include <signal.h>
 #include <unistd.h>
 
 #include <chrono>
 #include <condition_variable>
+#include <csignal>
 #include <deque>
 #include <mutex>
 #include <thread>
