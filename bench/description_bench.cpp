@@ -1,7 +1,7 @@
-// What a large core description costs: opening it, and asking for every property of every record,
-// beside cutting the same lines once with the same tokenizer. Times differ from machine to machine;
-// compare the rows of one run. The argument is the number of ports; there are two parameters for
-// every five of them.
+// What a large core description costs: opening it, and asking for every property of every record or
+// for the members of every interface, beside cutting the same lines once with the same tokenizer.
+// Times differ from machine to machine; compare the rows of one run. The argument is the number of
+// ports; there are two parameters for every five of them.
 
 #include <benchmark/benchmark.h>
 
@@ -38,6 +38,25 @@ Port::FileName Description(std::int64_t ports) {
                << ", DIR = I, VEC = [31:0], BUS = REGS, DESC = \"Data of a lane\"\n";
         }
       }).c_str());
+}
+
+// A description with that many bus interfaces, each of which has a port and a parameter of its own,
+// shares one with its neighbour, and has the clock as all others have it.
+Port::FileName InterfaceDescription(std::int64_t interfaces) {
+  const std::string name = "interfaces-" + std::to_string(interfaces) + ".qvr";
+  return Port::FileName(Scratch::Prepare(name, [&](const std::filesystem::path& unfinished) {
+                          std::ofstream file(unfinished);
+                          std::string all;
+                          for (std::int64_t i = 0; i < interfaces; ++i) {
+                            file << "BUS_INTERFACE BUS = REGS_" << i << ", BUS_TYPE = SLAVE\n"
+                                 << "PARAMETER WIDTH_" << i << " = 8, BUS = REGS_" << i << ":REGS_"
+                                 << i + 1 << "\n"
+                                 << "PORT data_" << i << " = DATA, DIR = I, BUS = REGS_" << i
+                                 << "\n";
+                            all += ":REGS_" + std::to_string(i);
+                          }
+                          file << "PORT clk = CLK, DIR = I, BUS = " << all << "\n";
+                        }).c_str());
 }
 
 // With 7142 ports, a description has 10,000 statements.
@@ -84,6 +103,23 @@ void AskEverything(benchmark::State& state) {
   }
 }
 BENCHMARK(AskEverything)->Arg(100)->Arg(1000)->Arg(5000)->Unit(benchmark::kMillisecond);
+
+void OpenInterfaces(benchmark::State& state) {
+  const Port::FileName description = InterfaceDescription(state.range(0));
+  for ([[maybe_unused]] const auto _ : state) benchmark::DoNotOptimize(QVRParser(description));
+}
+BENCHMARK(OpenInterfaces)->Arg(2000)->Unit(benchmark::kMillisecond);
+
+void AskMembers(benchmark::State& state) {
+  const QVRParser parser(InterfaceDescription(state.range(0)));
+  for ([[maybe_unused]] const auto _ : state) {
+    for (const StringBase& interface : parser.ListBusInterfaces()) {
+      benchmark::DoNotOptimize(parser.ListBusInterfaceParameters(interface));
+      benchmark::DoNotOptimize(parser.ListBusInterfacePorts(interface));
+    }
+  }
+}
+BENCHMARK(AskMembers)->Arg(2000)->Unit(benchmark::kMillisecond);
 
 }  // namespace
 

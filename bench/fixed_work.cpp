@@ -1,11 +1,13 @@
 // Work of a fixed size, whose instructions scripts/check-instructions.py counts: a walk, a request
-// for everything of one core, and an analyse order. Nothing here may depend on time or place.
+// for the ports of one core, every question to another one but those for its sources, and an
+// analyse order. Nothing here may depend on time or place.
 
 #include <cstddef>
 #include <cstdlib>
 #include <filesystem>
 #include <memory>
 #include <string>
+#include <utility>
 
 #include "Scratch.h"
 #include "Tarvo_KelIP.h"
@@ -20,6 +22,8 @@ using Tarvo::StringList;
 
 constexpr int kCores = 100;
 constexpr int kPorts = 200;
+constexpr int kInterfaces = 40;
+constexpr int kNetlists = 40;
 
 std::string CoreName(int number) { return "core_" + std::to_string(number); }
 
@@ -45,6 +49,55 @@ std::string Order(int number) {
   }
   return text;
 }
+
+// With namesakes, records of several interfaces, and one with many properties.
+std::string AskedDescription() {
+  std::string text = "OPTION STYLE = BLACKBOX\nOPTION DESC = Generated core\n";
+  for (int i = 0; i < kInterfaces; ++i) {
+    const std::string number = std::to_string(i), next = std::to_string(i + 1);
+    text.append("BUS_INTERFACE BUS = REGS_").append(number).append(", BUS_TYPE = SLAVE\n");
+    text.append("IO_INTERFACE IO_IF = LEDS_").append(number).append(", IO_TYPE = GPIO\n");
+    text.append("PARAMETER WIDTH_").append(number).append(" = 8, BUS = REGS_").append(number);
+    text.append(":REGS_").append(next).append("\nPARAMETER HINT = 1, TYPE = NON_HDL\n");
+    text.append("PORT data_").append(number).append(" = DATA, VEC = [31:0], BUS = REGS_");
+    text.append(number).append(", IO_IF = LEDS_").append(number).append("\n");
+  }
+  text += "PORT clk = CLK";
+  for (int i = 0; i < kInterfaces; ++i) text.append(", KEY_").append(std::to_string(i)) += " = 1";
+  return text + "\n";
+}
+
+std::string AskedTable() {
+  std::string text = "WIDTH_0 WIDTH_1 FILES\n";
+  for (int i = 0; i < kNetlists; ++i) {
+    text.append(i % 2 == 0 ? "8 8 part_" : "8 16 part_").append(std::to_string(i)) += ".edn\n";
+  }
+  return text;
+}
+
+using List = bool (KelIP::*)(StringList&) const;
+using ListOf = bool (KelIP::*)(const StringBase&, StringList&) const;
+using Get = bool (KelIP::*)(const StringBase&, const StringBase&, StringBase&) const;
+
+struct Kind {
+  List list;
+  ListOf properties;
+  Get get;
+};
+const Kind kKinds[] = {
+    {&KelIP::ListParameters, &KelIP::ListParameterProperties, &KelIP::GetParameterProperty},
+    {&KelIP::ListGenerics, &KelIP::ListGenericProperties, &KelIP::GetGenericProperty},
+    {&KelIP::ListPorts, &KelIP::ListPortProperties, &KelIP::GetPortProperty},
+    {&KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceProperties,
+     &KelIP::GetBusInterfaceProperty},
+    {&KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceProperties, &KelIP::GetIOInterfaceProperty},
+    {&KelIP::ListNetlists, &KelIP::ListNetlistProperties, &KelIP::GetNetlistProperty}};
+
+const std::pair<List, ListOf> kMembers[] = {
+    {&KelIP::ListBusInterfaces, &KelIP::ListBusInterfaceParameters},
+    {&KelIP::ListBusInterfaces, &KelIP::ListBusInterfacePorts},
+    {&KelIP::ListIOInterfaces, &KelIP::ListIOInterfaceParameters},
+    {&KelIP::ListIOInterfaces, &KelIP::ListIOInterfacePorts}};
 
 void Require(bool holds) {
   if (!holds) std::abort();
@@ -74,6 +127,24 @@ void Require(bool holds) {
   return core;
 }
 
+[[gnu::noinline]] void FixedQuestions(const KelIP& core) {
+  StringList names, answers;
+  StringBase value;
+  for (const Kind& kind : kKinds) {
+    Require((core.*kind.list)(names) && names.size() >= kNetlists / 2);
+    for (const StringBase& name : names) {
+      Require((core.*kind.properties)(name, answers));
+      for (const StringBase& property : answers) Require((core.*kind.get)(name, property, value));
+    }
+  }
+  for (const auto& [interfaces, members] : kMembers) {
+    Require((core.*interfaces)(names));
+    for (const StringBase& name : names) Require((core.*members)(name, answers));
+  }
+  Require(core.ListIPProperties(names));
+  for (const StringBase& name : names) Require(core.GetIPProperty(name, value));
+}
+
 [[gnu::noinline]] void FixedOrder(const KelIP& core) {
   StringList sources;
   Require(core.ListSynthesisSources(sources) && sources.size() == std::size_t{kCores} * 10);
@@ -87,7 +158,14 @@ int main() {
       Scratch::WriteDataFile(directory, CoreName(i), "ldx", Order(i));
     }
   });
+  const auto asked = Scratch::Prepare("asked", [](const std::filesystem::path& directory) {
+    Scratch::WriteDataFile(directory, "core", "qvr", AskedDescription());
+    Scratch::WriteDataFile(directory, "core", "tew", AskedTable());
+  });
   KelLibrary library;
   FixedWalk(library, repository.c_str());
   FixedOrder(*FixedRequest(library));
+  Require(library.SetRepositoryPath(asked.c_str()));
+  const std::unique_ptr<KelIP> core(library.CreateIP("core"));
+  FixedQuestions(*core);
 }
