@@ -2,28 +2,23 @@
 
 #include <algorithm>
 #include <boost/filesystem.hpp>
-#include <boost/tokenizer.hpp>
 #include <numeric>
-#include <string>
+#include <string_view>
 #include <utility>
 
 #include "Tarvo_Report.h"
+#include "Tarvo_Word.h"
 
 namespace Tarvo {
 
 namespace {
 
-const char* const kPathDelimiter = ";";
-const char* const kInterfaceDelimiter = ":";
+constexpr char kPathDelimiter = ';';
 
-// Empty pieces are dropped.
-StringList Split(const StringBase& list, const char* delimiter) {
-  const std::string text(list.View());
-  const boost::tokenizer<boost::char_separator<char>> pieces(
-      text, boost::char_separator<char>(delimiter));
-  StringList result;
-  for (const std::string& piece : pieces) result.emplace_back(std::string_view(piece));
-  return result;
+StringList Split(const StringBase& list, char delimiter) {
+  StringList pieces;
+  ForEachPiece(list.View(), delimiter, [&](std::string_view piece) { pieces.emplace_back(piece); });
+  return pieces;
 }
 
 // A path with a NUL byte in it would be tested, and used, without what stands behind.

@@ -1,6 +1,7 @@
 #ifndef TARVO_WORD_H
 #define TARVO_WORD_H
 
+#include <algorithm>
 #include <string_view>
 
 #include "Tarvo_Export.h"
@@ -17,6 +18,19 @@ inline bool EqualsIgnoringCase(const StringBase& text, const StringBase& word) n
 // The same for a part of a line, of which no text is made unless it is as long as the word.
 inline bool EqualsIgnoringCase(std::string_view text, std::string_view word) {
   return text.size() == word.size() && EqualsIgnoringCase(StringBase(text), StringBase(word));
+}
+
+// Stands between the interfaces that a record names.
+inline constexpr char kInterfaceDelimiter = ':';
+
+// Gives `take` each piece of a list in a text, in their order. Empty pieces are left out.
+template <class Take>
+void ForEachPiece(std::string_view list, char delimiter, const Take& take) {
+  while (!list.empty()) {
+    const std::string_view piece = list.substr(0, list.find(delimiter));
+    if (!piece.empty()) take(piece);
+    list.remove_prefix(std::min(piece.size() + 1, list.size()));
+  }
 }
 
 }  // namespace Tarvo
