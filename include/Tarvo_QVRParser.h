@@ -16,11 +16,18 @@ namespace QVRStatement {
 struct List;
 }
 
+// Entries in their order, and numbers that lead from a name to the first entry that has it.
+template <class Entry>
+struct QVRList {
+  std::vector<Entry> entries;
+  std::vector<unsigned> table;
+};
+
 // One statement of a core description: its name, and its properties in the order of the line, with
 // the fixed ones that its kind adds, and its line.
 struct QVRRecord {
   StringBase name;
-  PropertyList properties;
+  QVRList<Property> properties;
   unsigned line = 0;
 };
 
@@ -63,8 +70,11 @@ struct QVRRecord {
 //                          USAGE_LEVEL = ADVANCED_USER
 //
 // Failures: a name that is not there throws AppException with level NotFound. Every operation but
-// the destructor may throw std::bad_alloc. Lookups walk the records from the front, so that their
-// cost is in proportion to the description.
+// the destructor may throw std::bad_alloc.
+//
+// Costs: a question for a record costs in proportion to its answer, however large the description
+// is: tables that are made when it is read lead from names to records and properties. A question
+// for members looks at all parameters or ports.
 //
 // Threads: like an int; several may ask one parser, who sets a property must be alone.
 class TARVO_EXPORT QVRParser {
@@ -161,7 +171,10 @@ class TARVO_EXPORT QVRParser {
                           const StringBase& value);
 
  private:
-  using Records = std::vector<QVRRecord>;
+  using Records = QVRList<QVRRecord>;
+  // The numbers of the members of each interface, in their order, by the number of its first
+  // record.
+  using Members = std::vector<std::vector<unsigned>>;
 
   TARVO_LOCAL bool ReadStatement(std::string_view line, unsigned number, LineFault& fault);
   TARVO_LOCAL bool ReadOption(std::string_view line, unsigned number, LineFault& fault);
@@ -169,9 +182,10 @@ class TARVO_EXPORT QVRParser {
   TARVO_LOCAL static bool AddInterface(const QVRStatement::List& list, unsigned number,
                                        const StringBase& key, Records& interfaces,
                                        LineFault& fault);
+  TARVO_LOCAL void MakeTables();
 
   StringBase fileName;
-  PropertyList options;
+  QVRList<Property> options;
   std::vector<unsigned> optionLines;
   Records generics;
   Records parameters;

@@ -15,6 +15,7 @@
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
 #include "Tarvo_KnownProperties.h"
+#include "Tarvo_NameTable.h"
 #include "Tarvo_PropertyList.h"
 #include "Tarvo_QVRStatement.h"
 #include "Tarvo_Report.h"
@@ -64,7 +65,7 @@ const StringBase QVRParser::QVR_PORT_VEC = "VEC";
 namespace {
 
 using Q = QVRParser;
-using Records = std::vector<QVRRecord>;
+using Records = QVRList<QVRRecord>;
 
 constexpr Report::Module kModule{"s/Tarvo_QVRParser", "1.0"};
 
@@ -87,60 +88,63 @@ QVRRecord MakeNamedByFirst(const QVRStatement::List& list,
                            std::initializer_list<const StringBase*> valueKeys) {
   const QVRStatement::Pair& first = list.pairs.front();
   QVRRecord record{StringBase(first.key), {}, 0};
-  record.properties.reserve(valueKeys.size() + list.pairs.size());
-  record.properties.emplace_back(Q::QVR_PROPERTY_NAME, record.name);
-  for (const StringBase* const key : valueKeys) record.properties.emplace_back(*key, first.value);
+  PropertyList& properties = record.properties.entries;
+  properties.reserve(valueKeys.size() + list.pairs.size());
+  properties.emplace_back(Q::QVR_PROPERTY_NAME, record.name);
+  for (const StringBase* const key : valueKeys) properties.emplace_back(*key, first.value);
   for (std::size_t i = 1; i < list.pairs.size(); ++i) {
-    record.properties.emplace_back(list.pairs[i].key, list.pairs[i].value);
+    properties.emplace_back(list.pairs[i].key, list.pairs[i].value);
   }
+  NameTable::Make(record.properties);
   return record;
 }
 
 // A record that the pair with that key names; the name stands in front of the pair.
 QVRRecord MakeNamedByKey(const QVRStatement::List& list, const StringBase& key) {
   QVRRecord record;
-  record.properties.reserve(list.pairs.size() + 1);
+  PropertyList& properties = record.properties.entries;
+  properties.reserve(list.pairs.size() + 1);
   for (const QVRStatement::Pair& pair : list.pairs) {
     Property property{StringBase(pair.key), StringBase(pair.value)};
     if (EqualsIgnoringCase(property.first, key)) {
       record.name = property.second;
-      record.properties.emplace_back(Q::QVR_PROPERTY_NAME, property.second);
+      properties.emplace_back(Q::QVR_PROPERTY_NAME, property.second);
     }
-    record.properties.push_back(std::move(property));
+    properties.push_back(std::move(property));
   }
+  NameTable::Make(record.properties);
   return record;
 }
 
 // Each TYPE counts, not the first alone: NON_HDL anywhere keeps a parameter from the generics.
 bool IsGeneric(const QVRRecord& parameter) {
-  return std::none_of(parameter.properties.begin(), parameter.properties.end(),
-                      [](const Property& property) {
-                        return EqualsIgnoringCase(property.first, Q::QVR_PARAMETER_TYPE) &&
-                               EqualsIgnoringCase(property.second, Q::QVR_PARAMETER_TYPE_NON_HDL);
-                      });
+  const PropertyList& properties = parameter.properties.entries;
+  return std::none_of(properties.begin(), properties.end(), [](const Property& property) {
+    return EqualsIgnoringCase(property.first, Q::QVR_PARAMETER_TYPE) &&
+           EqualsIgnoringCase(property.second, Q::QVR_PARAMETER_TYPE_NON_HDL);
+  });
 }
 
 StringList RecordNames(const Records& records) {
   StringList names;
-  names.reserve(records.size());
-  for (const QVRRecord& record : records) names.push_back(record.name);
+  names.reserve(records.entries.size());
+  for (const QVRRecord& record : records.entries) names.push_back(record.name);
   return names;
 }
 
-// The first record of that name, const or not as the records are.
-template <class AnyRecords>
-auto& Find(AnyRecords& records, const Kind& kind, const StringBase& name) {
-  const auto found = std::find_if(records.begin(), records.end(),
-                                  [&](const QVRRecord& record) { return record.name == name; });
-  if (found != records.end()) return *found;
+// The number of the first record of that name.
+std::size_t Find(const Records& records, const Kind& kind, const StringBase& name) {
+  const std::size_t number = NameTable::Find(records, name.View());
+  if (number < records.entries.size()) return number;
   throw Report::Exception(AppException::NotFound, "Cannot find %s %s\n", kind.noun, name);
 }
 
 // What the Get of a property and the List of them share, for options too: the same rows.
-const StringBase* FindStatedOrDefault(const PropertyList& properties, KnownPropertyRows known,
+const StringBase* FindStatedOrDefault(const QVRList<Property>& properties, KnownPropertyRows known,
                                       const StringBase& name) {
-  const StringBase* const stated = FindValue(properties, name);
-  return stated ? stated : FindDefault(properties, known, name);
+  const std::size_t stated = NameTable::Find(properties, name.View());
+  return stated < properties.entries.size() ? &properties.entries[stated].second
+                                            : FindDefault(properties.entries, known, name);
 }
 
 StringList ListStatedAndDefault(const PropertyList& properties, KnownPropertyRows known) {
@@ -153,7 +157,7 @@ StringList ListStatedAndDefault(const PropertyList& properties, KnownPropertyRow
 
 StringBase GetProperty(const Records& records, const Kind& kind, const StringBase& name,
                        const StringBase& property) {
-  const QVRRecord& record = Find(records, kind, name);
+  const QVRRecord& record = records.entries[Find(records, kind, name)];
   const StringBase* const value = FindStatedOrDefault(record.properties, kind.known(), property);
   if (value) return *value;
   throw Report::Exception(AppException::NotFound, "Cannot find %s %s Property %s\n", kind.noun,
@@ -161,21 +165,19 @@ StringBase GetProperty(const Records& records, const Kind& kind, const StringBas
 }
 
 StringList ListProperties(const Records& records, const Kind& kind, const StringBase& name) {
-  return ListStatedAndDefault(Find(records, kind, name).properties, kind.known());
+  const QVRRecord& record = records.entries[Find(records, kind, name)];
+  return ListStatedAndDefault(record.properties.entries, kind.known());
 }
 
-void SetProperty(Records& records, const Kind& kind, const StringBase& name,
-                 const StringBase& property, const StringBase& value) {
+void SetProperty(QVRRecord& record, const StringBase& property, const StringBase& value) {
   // Of several entries of one name the first is the one that counts, so that is the one to change.
   // A new one goes behind all others.
-  PropertyList& properties = Find(records, kind, name).properties;
-  const auto stated =
-      std::find_if(properties.begin(), properties.end(),
-                   [&](const Property& candidate) { return candidate.first == property; });
-  if (stated == properties.end()) {
-    properties.emplace_back(property, value);
+  PropertyList& properties = record.properties.entries;
+  const std::size_t stated = NameTable::Find(record.properties, property.View());
+  if (stated < properties.size()) {
+    properties[stated].second = value;
   } else {
-    stated->second = value;
+    NameTable::Append(record.properties, Property(property, value));
   }
 }
 
@@ -193,11 +195,11 @@ StringList ListMembers(const Records& interfaces, const Kind& kind, const String
   // Who asks for the members of an interface that is not declared should hear of it.
   Find(interfaces, kind, interface);
   StringList names;
-  for (const QVRRecord& record : records) {
+  for (const QVRRecord& record : records.entries) {
     const auto ties = [&](const Property& property) {
       return Ties(property, *kind.key, interface);
     };
-    const PropertyList& properties = record.properties;
+    const PropertyList& properties = record.properties.entries;
     if (std::any_of(properties.begin(), properties.end(), ties)) names.push_back(record.name);
   }
   return names;
@@ -224,6 +226,7 @@ QVRParser::QVRParser(const Port::FileName& file) : fileName(file.GetName()) {
     // A description that was read in part would give wrong answers.
     throw Report::Told(Report::Exception(AppException::Failure, "Invalid QVR %s\n", fileName));
   }
+  MakeTables();
   TARVO_TRACE("  Parse successful\n");
 }
 
@@ -242,8 +245,8 @@ bool QVRParser::ReadStatement(std::string_view line, unsigned number, LineFault&
     case QVRStatement::IoInterface:
       return AddInterface(list, number, QVR_IO_IF_NAME, ioInterfaces, fault);
     case QVRStatement::Port:
-      ports.push_back(MakeNamedByFirst(list, {&QVR_BUS_IF_ROLE_NAME}));
-      ports.back().line = number;
+      ports.entries.push_back(MakeNamedByFirst(list, {&QVR_BUS_IF_ROLE_NAME}));
+      ports.entries.back().line = number;
       return true;
     default:
       AddParameter(list, number);
@@ -256,7 +259,7 @@ bool QVRParser::ReadOption(std::string_view line, unsigned number, LineFault& fa
   const auto result =
       QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option, fault);
   if (result != QVRStatement::Read) return false;
-  options.push_back(QVRStatement::MakeOption(option));
+  options.entries.push_back(QVRStatement::MakeOption(option));
   // Beside the options, which callers get as plain pairs.
   optionLines.push_back(number);
   return true;
@@ -266,21 +269,28 @@ void QVRParser::AddParameter(const QVRStatement::List& list, unsigned number) {
   QVRRecord record = MakeNamedByFirst(list, {&QVR_PROPERTY_VALUE, &QVR_PROPERTY_DEFAULT});
   record.line = number;
   // A copy: setting a generic leaves the parameter as it is, and the other way round.
-  if (IsGeneric(record)) generics.push_back(record);
-  parameters.push_back(std::move(record));
+  if (IsGeneric(record)) generics.entries.push_back(record);
+  parameters.entries.push_back(std::move(record));
 }
 
 bool QVRParser::AddInterface(const QVRStatement::List& list, unsigned number, const StringBase& key,
                              Records& interfaces, LineFault& fault) {
   std::size_t position = 0;
   if (!QVRStatement::FindName(list, key, position, fault)) return false;
-  interfaces.push_back(MakeNamedByKey(list, key));
-  interfaces.back().line = number;
+  interfaces.entries.push_back(MakeNamedByKey(list, key));
+  interfaces.entries.back().line = number;
   return true;
 }
 
+void QVRParser::MakeTables() {
+  NameTable::Make(options);
+  for (Records* const records : {&generics, &parameters, &ports, &busInterfaces, &ioInterfaces}) {
+    NameTable::Make(*records);
+  }
+}
+
 StringList QVRParser::ListOptions() const {
-  return ListStatedAndDefault(options, KnownProperties::OfCores());
+  return ListStatedAndDefault(options.entries, KnownProperties::OfCores());
 }
 
 StringList QVRParser::ListParameters() const { return RecordNames(parameters); }
@@ -365,8 +375,8 @@ std::vector<KelStatement> QVRParser::GetStatements() const {
   const auto add = [&](KelStatement::Kind kind, const StringBase& name, unsigned line) {
     statements.push_back({kind, name, {fileName, line, 0, 0}});
   };
-  for (std::size_t i = 0; i < options.size(); ++i) {
-    add(KelStatement::Option, options[i].first, optionLines[i]);
+  for (std::size_t i = 0; i < options.entries.size(); ++i) {
+    add(KelStatement::Option, options.entries[i].first, optionLines[i]);
   }
   const std::pair<KelStatement::Kind, const Records*> kinds[] = {
       {KelStatement::Parameter, &parameters},
@@ -374,7 +384,7 @@ std::vector<KelStatement> QVRParser::GetStatements() const {
       {KelStatement::BusInterface, &busInterfaces},
       {KelStatement::IoInterface, &ioInterfaces}};
   for (const auto& [kind, records] : kinds) {
-    for (const QVRRecord& record : *records) add(kind, record.name, record.line);
+    for (const QVRRecord& record : records->entries) add(kind, record.name, record.line);
   }
   std::sort(statements.begin(), statements.end(),
             [](const KelStatement& left, const KelStatement& right) {
@@ -385,12 +395,12 @@ std::vector<KelStatement> QVRParser::GetStatements() const {
 
 void QVRParser::SetParameterProperty(const StringBase& parameter, const StringBase& property,
                                      const StringBase& value) {
-  SetProperty(parameters, kParameter, parameter, property, value);
+  SetProperty(parameters.entries[Find(parameters, kParameter, parameter)], property, value);
 }
 
 void QVRParser::SetGenericProperty(const StringBase& generic, const StringBase& property,
                                    const StringBase& value) {
-  SetProperty(generics, kGeneric, generic, property, value);
+  SetProperty(generics.entries[Find(generics, kGeneric, generic)], property, value);
 }
 
 }  // namespace Tarvo

@@ -31,7 +31,7 @@ RANKS = [
     (2, r"s/Tarvo_(Word|Existence|LineFault|RangeText)\..*"),
     (3, r"s/Tarvo_DiagnosticCodes\.h"),
     (4, r"s/Tarvo_Diagnosis\..*"),
-    (5, r"s/Tarvo_(Report|PropertyList|TokenReader)\..*"),
+    (5, r"s/Tarvo_(Report|PropertyList|NameTable|TokenReader)\..*"),
     (6, r"(include|s)/Tarvo_(Kel_Key|KelLibrary_Utils|FileScanner)\..*"),
     (7, r"(include|s)/Tarvo_(KelRecords|TellFault)\..*"),
     (13, r"s/Tarvo_KnownProperties\.cpp"),  # its rows point at constants of the readers
