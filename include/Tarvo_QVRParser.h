@@ -72,9 +72,10 @@ struct QVRRecord {
 // Failures: a name that is not there throws AppException with level NotFound. Every operation but
 // the destructor may throw std::bad_alloc.
 //
-// Costs: a question for a record costs in proportion to its answer, however large the description
-// is: tables that are made when it is read lead from names to records and properties. A question
-// for members looks at all parameters or ports.
+// Costs: a question costs in proportion to its answer, however large the description is. Tables
+// that are made when it is read lead from names to records and properties, and from interfaces to
+// members. Setting BUS or IO_IF of a parameter costs in proportion to its properties and to the
+// members of the interfaces that they name.
 //
 // Threads: like an int; several may ask one parser, who sets a property must be alone.
 class TARVO_EXPORT QVRParser {
@@ -192,6 +193,10 @@ class TARVO_EXPORT QVRParser {
   Records ports;
   Records busInterfaces;
   Records ioInterfaces;
+  Members busParameters;
+  Members busPorts;
+  Members ioParameters;
+  Members ioPorts;
 };
 
 }  // namespace Tarvo

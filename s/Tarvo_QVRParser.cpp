@@ -11,7 +11,6 @@
 
 #include "Port_Input.h"
 #include "Tarvo_FileScanner.h"
-#include "Tarvo_KelLibrary_Utils.h"
 #include "Tarvo_Kel_Index.h"
 #include "Tarvo_Kel_Key.h"
 #include "Tarvo_KnownProperties.h"
@@ -66,6 +65,7 @@ namespace {
 
 using Q = QVRParser;
 using Records = QVRList<QVRRecord>;
+using Members = std::vector<std::vector<unsigned>>;
 
 constexpr Report::Module kModule{"s/Tarvo_QVRParser", "1.0"};
 
@@ -181,27 +181,64 @@ void SetProperty(QVRRecord& record, const StringBase& property, const StringBase
   }
 }
 
-// Whether the property ties its record to that interface.
-bool Ties(const Property& property, const StringBase& key, const StringBase& interface) {
-  if (property.first != key) return false;
-  // A record may belong to several interfaces, with colons between their names.
-  const StringList names = KelLibrary_Utils::GetInterfaceVector(property.second);
-  return std::find(names.begin(), names.end(), interface) != names.end();
+// Gives `tie` the number of each interface that a record belongs to, more than once for one that it
+// names several times. Needs no memory.
+template <class Tie>
+void ForEachTie(const QVRRecord& record, const Records& interfaces, const Kind& kind,
+                const Tie& tie) {
+  for (const Property& property : record.properties.entries) {
+    if (property.first != *kind.key) continue;
+    ForEachPiece(property.second.View(), kInterfaceDelimiter, [&](std::string_view name) {
+      const std::size_t number = NameTable::Find(interfaces, name);
+      if (number < interfaces.entries.size()) tie(number);
+    });
+  }
+}
+
+// Who of the records belongs to each of the interfaces.
+Members FindMembers(const Records& interfaces, const Kind& kind, const Records& records) {
+  Members members(interfaces.entries.size());
+  if (members.empty()) return members;
+  for (unsigned number = 0; number < records.entries.size(); ++number) {
+    ForEachTie(records.entries[number], interfaces, kind, [&](std::size_t interface) {
+      std::vector<unsigned>& of = members[interface];
+      if (of.empty() || of.back() != number) of.push_back(number);
+    });
+  }
+  return members;
+}
+
+// Sets a property that ties a record to interfaces. All that needs memory comes first, so that
+// nothing has changed if it runs out.
+void SetTies(Records& records, unsigned number, const StringBase& value, const Records& interfaces,
+             const Kind& kind, Members& members) {
+  QVRRecord& record = records.entries[number];
+  QVRRecord changed = record;
+  SetProperty(changed, *kind.key, value);
+  const auto forEach = [&](const QVRRecord& tied, const auto& work) {
+    ForEachTie(tied, interfaces, kind, [&](std::size_t interface) {
+      std::vector<unsigned>& of = members[interface];
+      work(of, std::lower_bound(of.begin(), of.end(), number));
+    });
+  };
+  // Room for the new ties; then the old ones go, and the new ones come.
+  forEach(changed, [](auto& of, auto) { of.reserve(of.size() + 1); });
+  forEach(record, [&](auto& of, auto at) {
+    if (at != of.end() && *at == number) of.erase(at);
+  });
+  std::swap(record, changed);
+  forEach(record, [&](auto& of, auto at) {
+    if (at == of.end() || *at != number) of.insert(at, number);
+  });
 }
 
 // The names of the records that belong to a declared interface.
 StringList ListMembers(const Records& interfaces, const Kind& kind, const StringBase& interface,
-                       const Records& records) {
+                       const Records& records, const Members& members) {
   // Who asks for the members of an interface that is not declared should hear of it.
-  Find(interfaces, kind, interface);
+  const std::size_t number = Find(interfaces, kind, interface);
   StringList names;
-  for (const QVRRecord& record : records.entries) {
-    const auto ties = [&](const Property& property) {
-      return Ties(property, *kind.key, interface);
-    };
-    const PropertyList& properties = record.properties.entries;
-    if (std::any_of(properties.begin(), properties.end(), ties)) names.push_back(record.name);
-  }
+  for (const unsigned member : members[number]) names.push_back(records.entries[member].name);
   return names;
 }
 
@@ -282,11 +319,16 @@ bool QVRParser::AddInterface(const QVRStatement::List& list, unsigned number, co
   return true;
 }
 
+// Behind the last line, since an interface may be declared behind its members.
 void QVRParser::MakeTables() {
   NameTable::Make(options);
   for (Records* const records : {&generics, &parameters, &ports, &busInterfaces, &ioInterfaces}) {
     NameTable::Make(*records);
   }
+  busParameters = FindMembers(busInterfaces, kBusInterface, parameters);
+  busPorts = FindMembers(busInterfaces, kBusInterface, ports);
+  ioParameters = FindMembers(ioInterfaces, kIoInterface, parameters);
+  ioPorts = FindMembers(ioInterfaces, kIoInterface, ports);
 }
 
 StringList QVRParser::ListOptions() const {
@@ -354,19 +396,19 @@ StringList QVRParser::ListPortProperties(const StringBase& port) const {
 }
 
 StringList QVRParser::ListBusInterfaceParameters(const StringBase& interface) const {
-  return ListMembers(busInterfaces, kBusInterface, interface, parameters);
+  return ListMembers(busInterfaces, kBusInterface, interface, parameters, busParameters);
 }
 
 StringList QVRParser::ListBusInterfacePorts(const StringBase& interface) const {
-  return ListMembers(busInterfaces, kBusInterface, interface, ports);
+  return ListMembers(busInterfaces, kBusInterface, interface, ports, busPorts);
 }
 
 StringList QVRParser::ListIoInterfaceParameters(const StringBase& interface) const {
-  return ListMembers(ioInterfaces, kIoInterface, interface, parameters);
+  return ListMembers(ioInterfaces, kIoInterface, interface, parameters, ioParameters);
 }
 
 StringList QVRParser::ListIoInterfacePorts(const StringBase& interface) const {
-  return ListMembers(ioInterfaces, kIoInterface, interface, ports);
+  return ListMembers(ioInterfaces, kIoInterface, interface, ports, ioPorts);
 }
 
 // Kept by kind; here they are sorted back into the order of the file.
@@ -395,7 +437,14 @@ std::vector<KelStatement> QVRParser::GetStatements() const {
 
 void QVRParser::SetParameterProperty(const StringBase& parameter, const StringBase& property,
                                      const StringBase& value) {
-  SetProperty(parameters.entries[Find(parameters, kParameter, parameter)], property, value);
+  const auto number = static_cast<unsigned>(Find(parameters, kParameter, parameter));
+  if (property == QVR_BUS_IF_NAME) {
+    SetTies(parameters, number, value, busInterfaces, kBusInterface, busParameters);
+  } else if (property == QVR_IO_IF_NAME) {
+    SetTies(parameters, number, value, ioInterfaces, kIoInterface, ioParameters);
+  } else {
+    SetProperty(parameters.entries[number], property, value);
+  }
 }
 
 void QVRParser::SetGenericProperty(const StringBase& generic, const StringBase& property,
