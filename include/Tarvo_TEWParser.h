@@ -1,6 +1,7 @@
 #ifndef TARVO_TEWPARSER_H
 #define TARVO_TEWPARSER_H
 
+#include <cstddef>
 #include <string_view>
 #include <unordered_set>
 #include <vector>
@@ -43,9 +44,11 @@ class QVRParser;
 // std::filesystem::filesystem_error if the repository was given relative to a current directory
 // that is gone.
 //
+// Costs: each query asks for the parameter of each column. GetFileLibrary then looks at the
+// netlists that are called like the file, and the other queries at all rows.
+//
 // Lifetime: the index and the description must outlive the parser. Threads: like an int, together
-// with these two; nobody may set a parameter while the parser is asked. Each query walks all rows,
-// and the description's parameters once for each column.
+// with these two; nobody may set a parameter while the parser is asked.
 class TARVO_EXPORT TEWParser {
  public:
   // Reads the table of a version. The description may be null; then only a table without parameters
@@ -88,6 +91,12 @@ class TARVO_EXPORT TEWParser {
     StringBase ignored;
     unsigned line;
   };
+  // Where a netlist stands, by the hash of the last component of its path.
+  struct Place {
+    std::size_t tail;
+    unsigned row;
+    unsigned netlist;
+  };
 
   using NameSet = std::unordered_set<StringBase>;
 
@@ -98,9 +107,12 @@ class TARVO_EXPORT TEWParser {
   TARVO_LOCAL bool ParseRow(const FileScanner& lines, std::string_view line, const Kel_Key& key);
   TARVO_LOCAL Netlist MakeNetlist(const FileScanner& lines, std::string_view text,
                                   const Kel_Key& key) const;
+  TARVO_LOCAL void MakePlaces();
   TARVO_LOCAL StringList ListParameters() const;
   TARVO_LOCAL StringList GetParameterValues() const;
   TARVO_LOCAL std::vector<const Netlist*> Select() const;
+  TARVO_LOCAL std::vector<const Netlist*> SelectCalledLike(const StringBase& path) const;
+  TARVO_LOCAL bool HavePaths() const;
 
   const Kel_Index& index;
   const QVRParser* qvrParser;
@@ -108,6 +120,8 @@ class TARVO_EXPORT TEWParser {
   bool isHeaderTold = false;  // while reading: whether a diagnostic says what is wrong with it
   StringList headerNames;
   std::vector<Row> rows;
+  std::vector<Place> places;  // sorted
+  bool hasRelative = false;   // whether a location needs the current directory
 };
 
 }  // namespace Tarvo

@@ -1,10 +1,14 @@
 // The table is read once and never changes. Which rows apply is found out anew for each question,
-// from the parameters as they are then.
+// from the parameters as they are then, and so is the absolute path of a netlist, from the current
+// directory.
 
 #include "Tarvo_TEWParser.h"
 
 #include <algorithm>
+#include <filesystem>
+#include <functional>
 #include <string_view>
+#include <tuple>
 #include <utility>
 
 #include "Port_Input.h"
@@ -31,6 +35,11 @@ const std::string_view* FindUnknown(const TEWLine::Header& header,
     if (parameters.find(StringBase(name)) == parameters.end()) return &name;
   }
   return nullptr;
+}
+
+// Of what stands behind the last separator, which the current directory in front does not change.
+std::size_t HashOfTail(std::string_view path) {
+  return std::hash<std::string_view>()(path.substr(path.find_last_of('/') + 1));
 }
 
 }  // namespace
@@ -72,7 +81,22 @@ void TEWParser::Parse(const FileName& file, const Kel_Key& key) {
     if (!hasHeader && !isHeaderTold) TellMissingHeader();
     throw Report::Told(Report::Exception(AppException::Failure, "Invalid TEW %s\n", tewFile));
   }
+  MakePlaces();
   TARVO_TRACE("  Parse successful\n");
+}
+
+void TEWParser::MakePlaces() {
+  for (unsigned row = 0; row < rows.size(); ++row) {
+    for (unsigned netlist = 0; netlist < rows[row].netlists.size(); ++netlist) {
+      const StringBase name = rows[row].netlists[netlist].location.GetName();
+      places.push_back({HashOfTail(name.View()), row, netlist});
+      hasRelative = hasRelative || !name.View().starts_with('/');
+    }
+  }
+  std::sort(places.begin(), places.end(), [](const Place& left, const Place& right) {
+    return std::tie(left.tail, left.row, left.netlist) <
+           std::tie(right.tail, right.row, right.netlist);
+  });
 }
 
 void TEWParser::TellMissingHeader() const {
@@ -152,6 +176,7 @@ StringList TEWParser::ListParameters() const {
 StringList TEWParser::GetParameterValues() const {
   StringList values;
   if (!qvrParser) return values;
+  values.reserve(headerNames.size());
   for (const StringBase& name : headerNames) {
     values.push_back(qvrParser->GetParameterProperty(name, QVRParser::QVR_PROPERTY_VALUE));
   }
@@ -165,6 +190,33 @@ std::vector<const TEWParser::Netlist*> TEWParser::Select() const {
     // Texts are compared, byte by byte: 016 is not 16.
     if (row.values != values) continue;
     for (const Netlist& netlist : row.netlists) selected.push_back(&netlist);
+  }
+  return selected;
+}
+
+// Whether each netlist has an absolute path now.
+bool TEWParser::HavePaths() const {
+  try {
+    if (hasRelative) FileName(".").GetAbsolutePath();
+    return true;
+  } catch (const std::filesystem::filesystem_error&) {
+    return false;
+  }
+}
+
+// The selected netlists among which one of that path must be, in the order of the table.
+std::vector<const TEWParser::Netlist*> TEWParser::SelectCalledLike(const StringBase& path) const {
+  // Without the current directory, the first netlist that needs it is a failure, however it is
+  // called.
+  if (!HavePaths()) return Select();
+  const StringList values = GetParameterValues();
+  const std::size_t tail = HashOfTail(path.View());
+  auto place = std::lower_bound(places.begin(), places.end(), tail,
+                                [](const Place& one, std::size_t hash) { return one.tail < hash; });
+  std::vector<const Netlist*> selected;
+  for (; place != places.end() && place->tail == tail; ++place) {
+    const Row& row = rows[place->row];
+    if (row.values == values) selected.push_back(&row.netlists[place->netlist]);
   }
   return selected;
 }
@@ -204,7 +256,7 @@ StringList TEWParser::ListLibraries() const {
 
 Kel_Key TEWParser::GetFileLibrary(const FileName& file) const {
   const StringBase path = file.GetAbsolutePath();
-  for (const Netlist* const netlist : Select()) {
+  for (const Netlist* const netlist : SelectCalledLike(path)) {
     if (netlist->location.GetAbsolutePath() == path) return index.GetIPKey(netlist->library);
   }
   throw Report::Exception(AppException::Failure,
