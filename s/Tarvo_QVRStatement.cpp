@@ -18,6 +18,9 @@ const char* const kScannerDelimiters = " =:()[]\"'";
 
 namespace {
 
+// Room for the pairs of most statements, so that the list seldom grows.
+constexpr std::size_t kUsualPairs = 8;
+
 constexpr std::string_view kKeywords[] = {"OPTION", "PARAMETER", "BUS_INTERFACE", "IO_INTERFACE",
                                           "PORT"};
 
@@ -99,6 +102,7 @@ bool ReadList(std::string_view line, List& list, LineFault& fault) {
   TokenReader tokens(line, kListDelimiters, TokenReader::WithGroups);
   PassKeyword(tokens);
   list = List();
+  list.pairs.reserve(kUsualPairs);
   while (true) {
     Pair pair;
     if (!ReadPair(tokens, pair, fault)) return false;
