@@ -81,6 +81,10 @@ def description(name, ports):
     return Measured("description", f"{name}/{ports}")
 
 
+def netlists(name, size):
+    return Measured("netlist", f"{name}/{size}")
+
+
 def order(name, cores):
     return Measured("order", f"{name}/{cores}")
 
@@ -94,7 +98,10 @@ COMPARISONS = [
     (description("Open", 7142), description("CutLines", 7142), 3),
     (description("AskEverything", 100), description("Open", 100), None),
     (description("AskEverything", 1000), description("Open", 1000), None),
-    (description("AskEverything", 5000), description("Open", 5000), None),
+    (description("AskEverything", 5000), description("Open", 5000), 4),
+    (description("AskMembers", 2000), description("OpenInterfaces", 2000), 1),
+    (netlists("AskColumns", 10000), netlists("OpenColumns", 10000), 1),
+    (netlists("AskNetlists", 5000), netlists("OpenNetlists", 5000), 1),
     (order("AnalyseTree", 2000), order("ScanTree", 2000), 4),
     (order("AnalyseLadder", 11), order("AnalyseLadder", 10), None),
     (order("AnalyseLadder", 12), order("AnalyseLadder", 11), None),
