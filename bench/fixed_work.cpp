@@ -1,6 +1,7 @@
 // Work of a fixed size, whose instructions scripts/check-instructions.py counts: a walk, a request
-// for the ports of one core, every question to another one but those for its sources, and an
-// analyse order. Nothing here may depend on time or place.
+// for the ports of one core, every question to another one but those for its sources, an
+// analyse order, and one that very many ways lead through. Nothing here may depend on time or
+// place.
 
 #include <cstddef>
 #include <cstdlib>
@@ -22,6 +23,7 @@ using Tarvo::StringList;
 
 constexpr int kCores = 100;
 constexpr int kPorts = 200;
+constexpr int kLadder = 60;  // cores in it
 constexpr int kInterfaces = 40;
 constexpr int kNetlists = 40;
 
@@ -71,6 +73,16 @@ std::string AskedTable() {
   std::string text = "WIDTH_0 WIDTH_1 FILES\n";
   for (int i = 0; i < kNetlists; ++i) {
     text.append(i % 2 == 0 ? "8 8 part_" : "8 16 part_").append(std::to_string(i)) += ".edn\n";
+  }
+  return text;
+}
+
+// Two cores a layer, each of which includes both of the next one.
+std::string LadderOrder(int number) {
+  std::string text = "lib " + CoreName(number) + "_v1_00_a source\n";
+  const int next = number - number % 2 + 2;
+  for (int other = next; next < kLadder && other < next + 2; ++other) {
+    text += "lib " + CoreName(other) + "_v1_00_a all\n";
   }
   return text;
 }
@@ -150,6 +162,12 @@ void Require(bool holds) {
   Require(core.ListSynthesisSources(sources) && sources.size() == std::size_t{kCores} * 10);
 }
 
+[[gnu::noinline]] void FixedLadder(const KelIP& core) {
+  StringList sources;
+  // All but the one beside the first core.
+  Require(core.ListSynthesisSources(sources) && sources.size() == std::size_t{kLadder} - 1);
+}
+
 int main() {
   const auto repository = Scratch::Prepare("fixed", [](const std::filesystem::path& directory) {
     const std::string description = Description();
@@ -168,4 +186,13 @@ int main() {
   Require(library.SetRepositoryPath(asked.c_str()));
   const std::unique_ptr<KelIP> core(library.CreateIP("core"));
   FixedQuestions(*core);
+  const auto ladder = Scratch::Prepare("ladder", [](const std::filesystem::path& directory) {
+    for (int i = 0; i < kLadder; ++i) {
+      Scratch::WriteDataFile(directory, CoreName(i), "qvr", "OPTION HDL = VHDL\n");
+      Scratch::WriteDataFile(directory, CoreName(i), "ldx", LadderOrder(i));
+    }
+  });
+  KelLibrary ladderLibrary;
+  Require(ladderLibrary.SetRepositoryPath(ladder.c_str()));
+  FixedLadder(*std::unique_ptr<KelIP>(ladderLibrary.CreateIP("core_0")));
 }

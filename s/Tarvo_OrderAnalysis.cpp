@@ -67,7 +67,7 @@ auto CoreOrder::AddOwn(const AddTo& add) {
 
 AnalyseOrder::Earlier CoreOrder::Add(AnalyseOrder::Source& source, bool forSynthesis,
                                      bool forSimulation) {
-  if (source.odd) analysis.StopSharing();
+  if (source.odd != nullptr) analysis.StopSharing();
   const auto earlier =
       AddOwn([&](AnalyseOrder& order) { return order.Add(source, forSynthesis, forSimulation); });
   source.forSynthesis = forSynthesis && earlier.synthesis == nullptr;

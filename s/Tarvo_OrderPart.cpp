@@ -77,7 +77,7 @@ const IncludeDirectory& OrderPart::Keep(IncludeDirectory directory) {
 
 void OrderPart::Add(const Source& source) {
   Append(&source);
-  hasOdd = hasOdd || source.odd;
+  hasOdd = hasOdd || source.odd != nullptr;
 }
 
 void OrderPart::Add(const OrderPart& core) {

@@ -18,7 +18,7 @@ from pathlib import Path
 HOME = Path(__file__).resolve().parent.parent
 FIGURES = HOME / "bench" / "instructions.json"
 ROOM = 1.10
-WORK = ["FixedWalk", "FixedRequest", "FixedQuestions", "FixedOrder"]
+WORK = ["FixedWalk", "FixedRequest", "FixedQuestions", "FixedOrder", "FixedLadder"]
 # The C library chooses its routines by the processor; without these, it takes the same ones everywhere.
 SAME_ROUTINES = "glibc.cpu.hwcaps=-AVX2,-AVX,-AVX2_Usable,-AVX_Usable,-ERMS,-SSSE3,-SSE4_1,-SSE4_2"
 
