@@ -116,26 +116,35 @@ class OrderReader {
 
  private:
   void Close();
-  void CheckNesting() const;
+  // What stands on the stack while an included core is read is kept small, so some are not inlined.
+  [[gnu::noinline]] void CheckNesting() const;
   void TellCircle(OpenOrders::const_iterator first) const;
+  [[gnu::noinline]] void Scan();
   void Parse();
   void ReadLine(std::string_view line);
+  [[gnu::noinline]] void RefuseLine(std::string_view line, const LDXEntry& entry) const;
   bool AddEntry(const LDXEntry& entry);
   [[gnu::noinline]] bool AddFile(const LDXEntry& entry);
   [[gnu::noinline]] bool AddDirectory(const LDXEntry& entry);
   bool AddLibrary(const LDXEntry& entry);
   void AddSource(const LDXEntry& entry, Source& source);
 
-  StringBase LanguageOf(const Kel_Key& library) const;
+  [[gnu::noinline]] StringBase LanguageOf(const Kel_Key& library) const;
 
   void TakeIn(std::string_view text, const Kel_Key& library, const StringBase& language);
+  [[gnu::noinline]] std::unique_ptr<OrderReader> MakeReader(std::string_view text,
+                                                            const Kel_Key& library,
+                                                            const Kel_Key& included,
+                                                            const StringBase& language);
+  [[gnu::noinline]] void TakeOver(OrderReader& nested, const OrderPart& part,
+                                  const Kel_Key& library);
   void AddInclude(std::string_view text, const Kel_Key& included);
   void KeepIncludes(const OrderReader& nested);
   OrderFile FindOrder(const Kel_Key& library, std::string_view text) const;
   bool ReportUnsettled(const LDXEntry& entry, const SourceLanguage& settled) const;
   void WarnOfSecond(const Source& source, const char* purpose) const;
   void TellSecond(const LDXEntry& entry, const AnalyseOrder::Earlier& earlier) const;
-  KelDiagnostic TellBadEntry(const LineFault& fault) const;
+  [[gnu::noinline]] KelDiagnostic TellBadEntry(const LineFault& fault) const;
   void TellUnknown(std::string_view library) const;
   void TellIgnored(const LDXEntry& entry) const;
   void TraceKnown(const AnalyseOrder::SourcePointers& sources, const char* purpose,
@@ -249,13 +258,17 @@ void OrderReader::TellCircle(OpenOrders::const_iterator first) const {
   });
 }
 
+void OrderReader::Scan() {
+  // NOLINTNEXTLINE(modernize-make-unique): made in place, since it can't be moved
+  lines.reset(
+      new FileScanner(ScanFile(ldxFile.name, std::move(ldxFile.found), Codes::kMissingOrder)));
+}
+
 // The first bad line ends all reading, unless a checker reads.
 void OrderReader::Parse() {
   TARVO_TRACE("  Parsing LDX File %s\n", *fileName);
   Port_Input input(*fileName);
-  // NOLINTNEXTLINE(modernize-make-unique): made in place, since it can't be moved
-  lines.reset(
-      new FileScanner(ScanFile(ldxFile.name, std::move(ldxFile.found), Codes::kMissingOrder)));
+  Scan();
   std::string_view line;
   for (unsigned lineNumber = 0; lines->GetNextLine(line, lineNumber);) {
     if (line.empty()) continue;
@@ -271,7 +284,10 @@ void OrderReader::ReadLine(std::string_view line) {
   LineFault fault;
   const bool isRead = ReadLDXEntry(line, entry, fault);
   if (!isRead) Diagnosis::Add([&] { return TellBadEntry(fault); });
-  if (isRead && AddEntry(entry)) return;
+  if (!isRead || !AddEntry(entry)) RefuseLine(line, entry);
+}
+
+void OrderReader::RefuseLine(std::string_view line, const LDXEntry& entry) const {
   const char* const kind = entry.kind == LDXEntry::IncludeDirectory ? "path" : "library";
   kModule.Error("LDX unparsable %s entry: %s line %d, %s\n", kind, *fileName,
                 open.back().entry.line, StringBase(line));
@@ -457,17 +473,25 @@ void OrderReader::TakeIn(std::string_view text, const Kel_Key& library,
     order.Add(*reading.part, std::nullopt);
     return;
   }
-  OrderFile file = FindOrder(library, text);
-  AddInclude(text, included);
-  // Not on the stack, of which each level of a deep chain needs some.
-  const auto nested =
-      std::make_unique<OrderReader>(index, analysis, library, root, language, std::move(file));
+  const auto nested = MakeReader(text, library, included, language);
   const OrderPart& part =
       analysis.Read(reading, [&]() -> const OrderPart& { return nested->Read(); });
-  if (Diagnosis::GoesOn()) KeepIncludes(*nested);
-  const bool isFirst = &part == &nested->order.GetPart();
+  TakeOver(*nested, part, library);
+}
+
+std::unique_ptr<OrderReader> OrderReader::MakeReader(std::string_view text, const Kel_Key& library,
+                                                     const Kel_Key& included,
+                                                     const StringBase& language) {
+  OrderFile file = FindOrder(library, text);
+  AddInclude(text, included);
+  return std::make_unique<OrderReader>(index, analysis, library, root, language, std::move(file));
+}
+
+void OrderReader::TakeOver(OrderReader& nested, const OrderPart& part, const Kel_Key& library) {
+  if (Diagnosis::GoesOn()) KeepIncludes(nested);
+  const bool isFirst = &part == &nested.order.GetPart();
   const AnalyseOrder::Known known =
-      order.Add(part, isFirst ? nested->order.TakeSum() : std::nullopt);
+      order.Add(part, isFirst ? nested.order.TakeSum() : std::nullopt);
   TraceKnown(known.synthesis, kSynthesis, library);
   TraceKnown(known.ForSimulation(), kSimulation, library);
 }
