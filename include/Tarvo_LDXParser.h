@@ -58,7 +58,7 @@ class Kel_Index;
 //
 // Lifetime: the index must outlive the parser. It must not change while the parser is made; later
 // only the lists of libraries and GetVerilogIncludeLocation ask it. Threads: for one at a time,
-// together with the index. Stack: an included core takes about 2 KiB while it is read.
+// together with the index. Stack: an included core takes about 1.5 KiB while it is read.
 class TARVO_EXPORT LDXParser {
  public:
   static const StringBase LDX_HDL_VERILOG;
