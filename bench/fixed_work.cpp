@@ -56,7 +56,8 @@ std::string Order(int number) {
 std::string AskedDescription() {
   std::string text = "OPTION STYLE = BLACKBOX\nOPTION DESC = Generated core\n";
   for (int i = 0; i < kInterfaces; ++i) {
-    const std::string number = std::to_string(i), next = std::to_string(i + 1);
+    const std::string number = std::to_string(i);
+    const std::string next = std::to_string(i + 1);
     text.append("BUS_INTERFACE BUS = REGS_").append(number).append(", BUS_TYPE = SLAVE\n");
     text.append("IO_INTERFACE IO_IF = LEDS_").append(number).append(", IO_TYPE = GPIO\n");
     text.append("PARAMETER WIDTH_").append(number).append(" = 8, BUS = REGS_").append(number);
@@ -140,7 +141,8 @@ void Require(bool holds) {
 }
 
 [[gnu::noinline]] void FixedQuestions(const KelIP& core) {
-  StringList names, answers;
+  StringList names;
+  StringList answers;
   StringBase value;
   for (const Kind& kind : kKinds) {
     Require((core.*kind.list)(names) && names.size() >= kNetlists / 2);

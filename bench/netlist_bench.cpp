@@ -25,7 +25,9 @@ using Tarvo::TEWParser;
 // A core with that many parameters, all of which are columns of its table of one row.
 fs::path WideTable(std::int64_t columns) {
   return Scratch::Prepare("wide-" + std::to_string(columns), [&](const fs::path& repository) {
-    std::string description, header, row;
+    std::string description;
+    std::string header;
+    std::string row;
     for (std::int64_t i = 0; i < columns; ++i) {
       const std::string name = "WIDTH_" + std::to_string(i) + " ";
       description += "PARAMETER " + name + "= 8, DT = integer, RANGE = (2:32)\n";
