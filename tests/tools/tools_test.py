@@ -33,7 +33,6 @@ SOURCE_NAMES = ["a b.vhd", "it's one.vhd", 'a "word".vhd', "$HOME$(x)`y`.vhd", "
 # A schema of SARIF 2.1.0 and a program that reads it.
 SARIF_PACKAGES = ["@microsoft/jest-sarif@1.0.0-beta.0", "sarif-junit@1.1.4"]
 SARIF_SCHEMA = "@microsoft/jest-sarif/lib/schemas/sarif-2.1.0-rtm.5.json"
-GHDL = {"GHDL_FLAGS": "--std=08"}
 
 failed = []
 
@@ -67,7 +66,7 @@ def sources(repository, key, purpose, form, *words):
 
 
 def records(document):
-    return [(source["library"], source["language"], source["path"]) for source in json.loads(document)["sources"]]
+    return [(source["logical_name"], source["language"], source["path"]) for source in json.loads(document)["sources"]]
 
 
 def unit_of(core):
@@ -75,40 +74,39 @@ def unit_of(core):
 
 
 def ghdl(core, purpose, scratch):
-    """Analyses as the script says, then elaborates the core and runs its test bench, if it has one."""
-    words = ["--relative-to", scratch] if purpose == "synthesis" else []
-    (scratch / "analyse.sh").write_text(sources(SAMPLES, core, purpose, "ghdl", *words))
-    run("sh", "analyse.sh", cwd=scratch, **GHDL)
-    flags = [GHDL["GHDL_FLAGS"], f"--work={core}"]
-    listing = sources(SAMPLES, core, purpose, "list")
-    if unit_of(core) != "math_pack":  # a package alone
-        run("ghdl", "-e", *flags, unit_of(core), cwd=scratch)
-    if f"/{core}/hdl/vhdl/{unit_of(core)}_tb.vhd\n" not in listing:
-        return False
-    printed = run("ghdl", "--elab-run", *flags, f"{unit_of(core)}_tb", "--assert-level=error",
-                  cwd=scratch)
-    if "PASS" not in printed:
-        raise Fault(f"the test bench prints {printed!r}")
-    return True
-
-
-def verilog(core, purpose, scratch):
-    """Compiles; a test bench is run, and what is for synthesis is linted."""
-    (scratch / "core.f").write_text(sources(SAMPLES, core, purpose, "f"))
+    """Analyses as the script says, then elaborates the core or runs its test bench, if it has one."""
     bench = f"{unit_of(core)}_tb"
-    has_bench = f"/{core}/hdl/verilog/{bench}.v\n" in (scratch / "core.f").read_text()
-    run("iverilog", "-g2005", "-o", "core.vvp", *(["-s", bench] if has_bench else []),
-        "-c", "core.f", cwd=scratch)
-    if purpose == "synthesis":
-        # the boxes are empty, and the Verilog parts of a mixed core have no top of their own
-        run("verilator", "--lint-only", "-Wall", "-Wno-style", "-Wno-MULTITOP", "-f", "core.f",
-            cwd=scratch)
-    if has_bench and "PASS" not in (printed := run("vvp", "-n", "core.vvp", cwd=scratch)):
+    has_bench = f"/{core}/hdl/vhdl/{bench}.vhd\n" in sources(SAMPLES, core, purpose, "list")
+    top = ["--top", bench] if has_bench else []
+    words = ["--relative-to", scratch] if purpose == "synthesis" else []
+    is_package = unit_of(core) == "math_pack" and not has_bench
+    (scratch / "analyse.sh").write_text(sources(SAMPLES, core, purpose, "ghdl", *words, *top,
+                                                *([] if is_package else ["--run"])))
+    printed = run("sh", "analyse.sh", cwd=scratch, GHDL_FLAGS="--std=08")
+    if has_bench and ("PASS" not in printed or "(assertion error)" in printed):
         raise Fault(f"the test bench prints {printed!r}")
     return has_bench
 
 
-COMPILE = {"VHDL": ghdl, "Verilog": verilog}
+def verilog(core, purpose, scratch):
+    """Compiles; a test bench is run, and what is for synthesis is linted."""
+    bench = f"{unit_of(core)}_tb"
+    has_bench = re.search(rf"/{core}/hdl/verilog/{bench}.s?v\n", sources(SAMPLES, core, purpose, "list"))
+    (scratch / "core.f").write_text(sources(SAMPLES, core, purpose, "f"))
+    run("iverilog", "-g2012", "-o", "core.vvp", *(["-s", bench] if has_bench else []),
+        "-c", "core.f", cwd=scratch)
+    if purpose == "synthesis":
+        # the boxes are empty, and the Verilog parts of a mixed core have no top of their own
+        form = "f" if unit_of(core) in ["tone_gen", "event_station"] else "verilator"
+        (scratch / "core.vc").write_text(sources(SAMPLES, core, purpose, form))
+        run("verilator", "--lint-only", "-Wall", "-Wno-style", "-Wno-MULTITOP", "-f", "core.vc",
+            cwd=scratch)
+    if has_bench and "PASS" not in (printed := run("vvp", "-n", "core.vvp", cwd=scratch)):
+        raise Fault(f"the test bench prints {printed!r}")
+    return bool(has_bench)
+
+
+COMPILE = {"VHDL": ghdl, "Verilog": verilog, "SystemVerilog": verilog}
 
 
 def netlists(scratch):
@@ -145,48 +143,84 @@ def tcl_lists(document, scratch):
 
 
 def ghdl_calls(document, scratch):
-    """What the script calls, told by a `ghdl` that only writes its words down."""
+    """The library and path of each source that the script analyses, told by a `ghdl` that only writes its words
+    down."""
     (scratch / "bin").mkdir(exist_ok=True)
-    (scratch / "bin/ghdl").write_text('#!/bin/sh\nprintf "%s\\0" "$@"\n')
+    (scratch / "bin/ghdl").write_text('#!/bin/sh\nprintf "%s\\0" "$@" ""\n')
     (scratch / "bin/ghdl").chmod(0o755)
     (scratch / "calls.sh").write_text(document)
     path = f"{scratch}/bin:{os.environ['PATH']}"
-    words = run("sh", "calls.sh", cwd=scratch, PATH=path, GHDL_FLAGS="-x -y").split("\0")[:-1]
-    return list(zip(*[iter(words)] * 5))
+    calls = run("sh", "calls.sh", cwd=scratch, PATH=path, GHDL_FLAGS="-x -y").split("\0\0")[:-1]
+    for call in calls:
+        words = [word for word in call.split("\0") if not word.startswith("--std=")]
+        expect(words[:3], ["-a", "-x", "-y"], "the words of a call")
+        yield from ((words[3].removeprefix("--work="), "VHDL", path) for path in words[4:])
+
+
+def make_lists(document, scratch):
+    (scratch / "core.mk").write_text(document)
+    (scratch / "show.mk").write_text("include core.mk\nshow:\n"
+                                     "\t@$(foreach s,$(KEL_SOURCES),printf '%s\\n' '$(subst ','\\'',$s)';)\n")
+    return run("make", "-f", "show.mk", cwd=scratch).splitlines()
+
+
+def cmake_lists(document, scratch):
+    (scratch / "core.cmake").write_text(document)
+    (scratch / "show.cmake").write_text('include(core.cmake)\nforeach(s IN LISTS KEL_SOURCES)\n'
+                                        'file(APPEND shown "${s}//")\nendforeach()\n')
+    (scratch / "shown").write_text("")
+    run("cmake", "-P", "show.cmake", cwd=scratch)
+    return (scratch / "shown").read_text().split("//")[:-1]
+
+
+EDAM_LANGUAGES = {"vhdlSource": "VHDL", "verilogSource": "Verilog", "systemVerilogSource": "SystemVerilog"}
 
 
 def forms(repository, core, purpose, scratch, expected=None):
-    """All forms name the same sources, in the same order, with the same libraries."""
-    text = {form: sources(repository, core, purpose, form) for form in FORMATS}
-    data = {form: json.loads(text[form]) for form in ["json", "edam"]}
-    wanted = expected or records(text["json"])
+    """All forms name the same sources, in the same order, with the same libraries. Those for one language end with 1
+    where there is none of it, and so does one that can't hold a path."""
+    data = {form: json.loads(sources(repository, core, purpose, form)) for form in ["json", "edam"]}
+    wanted = expected or records(sources(repository, core, purpose, "json"))
     directories = data["json"]["include_directories"]
     vhdl = [record for record in wanted if record[1] == "VHDL"]
-    expect(text["list"].splitlines(),
-           [re.sub(r"[\x00-\x1f\x7f]", lambda c: f"\\x{ord(c[0]):02x}", path)
-            for _, _, path in wanted], "list")
-    expect(records(text["json"]), wanted, "json")
-    expect(data["json"]["libraries"], list(dict.fromkeys(r[0] for r in wanted)), "its libraries")
-    expect(tcl_lists(text["tcl"], scratch), (wanted, directories), "tcl")
-    expect(ghdl_calls(text["ghdl"], scratch),
-           [("-a", "-x", "-y", f"--work={library}", path) for library, _, path in vhdl], "ghdl")
-    expect(list(vhdl_ls_records(text["vhdl_ls"])), vhdl, "vhdl_ls")
+    verilog_files = [record[2] for record in wanted if record[1].endswith("Verilog")]
+    paths = [path for _, _, path in wanted]
+    files = lambda text: [re.sub(r"\\(.)", r"\1", line) for line in text.splitlines()
+                          if not line.startswith(("// ", "--top-module"))]
+    shown = {
+        "list": (str.splitlines, [re.sub(r"[\x00-\x1f\x7f]", lambda c: f"\\x{ord(c[0]):02x}", path) for path in paths]),
+        "tcl": (lambda text: tcl_lists(text, scratch), (wanted, directories)),
+        "ghdl": (lambda text: list(ghdl_calls(text, scratch)), vhdl),
+        "vhdl_ls": (lambda text: list(vhdl_ls_records(text)), vhdl),
+        "cmake": (lambda text: cmake_lists(text, scratch), paths),
+        "make": (lambda text: make_lists(text, scratch), [] if " " in "".join(paths) else paths),
+        "f": (files, verilog_files and [f"+incdir+{path}" for path in directories] + verilog_files)}
+    shown["verilator"] = shown["f"]
+    expect(sorted([*shown, "json", "edam"]), sorted(FORMATS), "the formats")
+    for form, (read, there) in shown.items() if wanted else []:
+        if "\n" in str(repository) and form in ["f", "verilator"]:
+            there = []
+        if there:
+            expect(read(sources(repository, core, purpose, form)), there, form)
+        else:
+            expect(refusal(repository, core, purpose, form), (1, b""), form)
+    expect(records(json.dumps(data["json"])), wanted, "json")
     files = data["edam"]["files"]
-    language = {"vhdlSource": "VHDL", "verilogSource": "Verilog"}
-    expect([(file["logical_name"], language[file["file_type"]], file["name"])
-            for file in files if "include_path" not in file], wanted, "edam")
+    expect([(file["logical_name"], EDAM_LANGUAGES[file["file_type"].split("-")[0]], file["name"])
+            for file in files if "logical_name" in file], wanted, "edam")
     headers = [file for file in files if "include_path" in file]
     expect(list(dict.fromkeys(file["include_path"] for file in headers)), directories,
            "the include directories of edam")
     if missing := [file["name"] for file in headers if not pathlib.Path(file["name"]).is_file()]:
         raise Fault(f"edam names files that are not there: {missing}")
-    if "\n" not in str(repository):  # a file list can't say it
-        lines = [line for line in text["f"].splitlines() if not line.startswith("// ")]
-        expect([re.sub(r"\\(.)", r"\1", line) for line in lines],
-               [f"+incdir+{path}" for path in directories]
-               + [path for _, language, path in wanted if language == "Verilog"], "f")
     for form, name in [("json", "sources"), ("edam", "edam")]:
         strictly_valid(data[form], name)
+
+
+def refusal(repository, core, purpose, form):
+    done = subprocess.run([KEL, "-L", repository, "sources", core, "--for", purpose, "--format", form],
+                          capture_output=True, timeout=60)
+    return done.returncode, done.stdout
 
 
 def valid(document, schema):
@@ -205,8 +239,6 @@ def strictly_valid(document, name):
     for at in [None, *range(len(document[records_at]))]:
         whole = document if at is None else document[records_at][at]
         for name in [*whole, None]:
-            if name == "file_type" and "include_path" not in whole:
-                continue  # left out for a language that is not known
             changed = copy.deepcopy(document)
             part = changed if at is None else changed[records_at][at]
             part.pop(name) if name else part.update(unknown="x")
@@ -316,7 +348,7 @@ def check(name, function, *words):
 
 def main():
     keys = [line.split("\t")[0] for line in run(KEL, "-L", SAMPLES, "list", "--all").splitlines()]
-    ran = {"VHDL": [], "Verilog": []}
+    ran = {"VHDL": [], "Verilog": [], "SystemVerilog": []}
     for key in keys:
         for purpose in PURPOSES:
             check(f"forms, {key}, {purpose}", forms, SAMPLES, key, purpose)
@@ -330,7 +362,7 @@ def main():
     check("terminal", terminal)
     benches = [sum(results) for results in ran.values()]
     print(f"{len(keys)} samples, {benches} test benches ran")
-    sys.exit(1 if failed or len(keys) < 11 or benches[0] < 7 or benches[1] < 3 else 0)
+    sys.exit(1 if failed or len(keys) < 13 or benches[0] < 8 or benches[1] < 3 else 0)
 
 
 if __name__ == "__main__":

@@ -91,9 +91,17 @@ Table TableOf(const Json& records, const std::vector<std::string>& columns) {
   return table;
 }
 
+void WritePaths(const Json& records) {
+  for (const Json& record : records) {
+    std::cout << record[record.contains("path") ? "path" : "location"].get<std::string>() << '\0';
+  }
+}
+
 void WriteAnswer(const Request& request, const Json& members, const Table& table) {
   if (request.Has("--json")) {
     WriteJson(members);
+  } else if (request.Has("--null")) {
+    WritePaths(members.back());
   } else {
     table.Write();
   }

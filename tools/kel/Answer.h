@@ -42,7 +42,11 @@ void WriteJson(const Json& members, std::ostream& output = std::cout);
 // A description stands among a record's properties, a list has commas, and true is its name.
 Table TableOf(const Json& records, const std::vector<std::string>& columns);
 
-// Writes the members as a document if the request is for one, or else the table.
+// Writes the path or location of each record, as it is, with a NUL behind it.
+void WritePaths(const Json& records);
+
+// Writes the members as a document if the request is for one, the paths of the last member's
+// records if it is for these alone, or else the table.
 void WriteAnswer(const Request& request, const Json& members, const Table& table);
 
 #endif

@@ -65,7 +65,7 @@ void AddWord(CLI::App& app, const Word& word) {
   } else if (word.name == "--version") {
     app.set_version_flag(word.name, std::string("kel ") + Tarvo::GetLibraryVersion(), word.help);
   } else if (word.IsFlag()) {
-    app.add_flag(word.name, word.help);
+    app.add_flag(NamesFor(word), word.help);
   } else {
     AddValued(app, word);
   }
@@ -100,6 +100,21 @@ std::string NoVerb(const std::string& word) {
          (question.empty() ? "; the verbs are " + Join(names) : question);
 }
 
+// Words that ask for different answers, or an empty text.
+std::string Contradiction(const Request& request) {
+  std::vector<std::string> forms;
+  for (const char* const form : {"--json", "--null", "--table"}) {
+    if (request.Has(form)) forms.push_back(form);
+  }
+  const std::string format = request.Value("--format");
+  const std::string own = request.Has("--json") ? "json" : "list";
+  const bool hasFormat = !forms.empty() && !format.empty() && format != own;
+  if (hasFormat) forms.push_back("--format " + format);
+  // A table may be a document.
+  const bool isOne = forms.size() < 2 || (!request.Has("--null") && request.Has("--table"));
+  return isOne ? "" : forms[0] + " and " + forms[1] + " can't be used together";
+}
+
 // What is wrong with a command line that parsed, or an empty text.
 std::string Fault(const CLI::App& app, const Request& request) {
   const std::vector<std::string> extras = app.remaining(true);
@@ -110,10 +125,8 @@ std::string Fault(const CLI::App& app, const Request& request) {
   // Behind a verb, or an option that nobody knows.
   if (!extras.empty()) return "unexpected argument '" + extras.front() + "'";
   if (verb == nullptr) return "a verb is required: " + Join(NamesOf(ChoicesOf(Verbs())));
-  const std::string format = request.Value("--format");
-  if (request.Has("--json") && !format.empty() && format != "json") {
-    return "--json and --format " + format + " can't be used together";
-  }
+  const std::string contradiction = Contradiction(request);
+  if (!contradiction.empty()) return contradiction;
   if (verb->reads == Verb::Nothing) return "";
   if (!request.Has("--library")) return "-L DIR is required; it names a repository";
   const auto& paths = request.Values("--library");

@@ -51,7 +51,7 @@ Verb DescribeList() {
           .help =
               "Lists the newest version of each core: key, style, language, location, "
               "description",
-          .words = {GlobWord(), {.name = "--all", .help = "List every version"}},
+          .words = {GlobWord(), {.name = "--all", .help = "List every version"}, NullWord()},
           .example = "list 'pulse*' --all",
           .reads = Verb::All,
           .answer = List};

@@ -83,6 +83,8 @@ void Show(const KelDiagnostic& diagnostic) {
 
 void Note(const std::string& text) { Say(KelDiagnostic::Note, text); }
 
+void Warn(const std::string& text) { Say(KelDiagnostic::Warning, text); }
+
 void Error(const std::string& text) {
   ++errorCount;
   Say(KelDiagnostic::Error, text);

@@ -28,6 +28,7 @@ void Show(const Tarvo::KelDiagnostic& diagnostic);
 
 // The command's own words. An error counts as one of the library does.
 void Note(const std::string& text);
+void Warn(const std::string& text);
 void Error(const std::string& text);
 
 // The number of errors so far, fatal ones included.

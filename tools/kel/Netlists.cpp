@@ -1,6 +1,8 @@
 // The verb `netlists`: parameters are set in the opened core alone, and then the library is asked
 // what applies.
 
+#include <algorithm>
+
 #include "Text.h"
 #include "Verb.h"
 
@@ -10,14 +12,10 @@ using Tarvo::KelIP;
 using Tarvo::KelNetlistTable;
 
 // False, with a warning, for a parameter that the core does not have.
-bool SetParameters(KelIP& ip, const std::vector<std::string>& settings) {
-  for (const std::string& setting : settings) {
-    const std::size_t equals = setting.find('=');
-    const std::string name = setting.substr(0, equals);
-    const std::string value = setting.substr(equals + 1);
-    if (!ip.SetParameterProperty(name.c_str(), "VALUE", value.c_str())) return false;
-  }
-  return true;
+bool SetParameters(KelIP& ip, const std::vector<Setting>& settings) {
+  return std::all_of(settings.begin(), settings.end(), [&](const Setting& setting) {
+    return ip.SetParameterProperty(setting.name.c_str(), "VALUE", setting.value.c_str());
+  });
 }
 
 // A line of the table: a mark, a field for each of the texts, and a last one.
@@ -72,15 +70,9 @@ Status AnswerList(const KelIP& ip, const Request& request) {
 // Netlists for other values than those that were asked for would be a wrong answer, so there are
 // none if a parameter is unknown.
 Status Netlists(const Tarvo::KelLibrary& library, const Request& request) {
-  const std::unique_ptr<KelIP> ip = OpenCore(library, request);
-  if (!ip || !SetParameters(*ip, request.Values("--set"))) return StatusFindings;
+  const std::unique_ptr<KelIP> ip = OpenCore(library, request.Value("KEY"));
+  if (!ip || !SetParameters(*ip, SettingsOf(request))) return StatusFindings;
   return request.Has("--table") ? AnswerTable(*ip, request) : AnswerList(*ip, request);
-}
-
-std::string SettingFault(const std::string& setting) {
-  const std::size_t equals = setting.find('=');
-  const bool isGood = equals != std::string::npos && equals > 0;
-  return isGood ? "" : "'" + setting + "' is not NAME=VALUE";
 }
 
 }  // namespace
@@ -89,13 +81,10 @@ Verb DescribeNetlists() {
   return {.name = "netlists",
           .help = "Lists the netlists of a core that apply",
           .words = {KeyWord(),
-                    {.name = "--set",
-                     .value = "NAME=VALUE",
-                     .help = "Sets a parameter first; may be repeated",
-                     .isRepeated = true,
-                     .fault = SettingFault},
+                    SetWord("Sets a parameter first; may be repeated"),
                     {.name = "--table",
-                     .help = "List all of them with their values; * marks those that apply"}},
+                     .help = "List all of them with their values; * marks those that apply"},
+                    NullWord()},
           .example = "netlists crc_unit --set WIDTH=16 --set MODE=FAST",
           .answer = Netlists};
 }

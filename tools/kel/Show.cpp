@@ -221,7 +221,7 @@ void WriteTables(const Json& core, bool withHeadings) {
 }
 
 Status Show(const KelLibrary& library, const Request& request) {
-  const std::unique_ptr<KelIP> ip = OpenCore(library, request);
+  const std::unique_ptr<KelIP> ip = OpenCore(library, request.Value("KEY"));
   if (!ip) return StatusFindings;
   const Json core = Describe(library, request, *ip);
   if (request.Has("--json")) {

@@ -1,68 +1,117 @@
 // The verb `sources`: the library's order, handed to one of the formats.
 
+#include <filesystem>
+
+#include "Arguments.h"
 #include "Formats.h"
-#include "Tarvo_LDXParser.h"
+#include "SourceList.h"
 #include "Text.h"
 
 namespace {
 
-using Tarvo::KelIncludeDirectory;
-using Tarvo::KelIP;
-using Tarvo::KelSource;
-using Tarvo::LDXParser;
-using Tarvo::StringBase;
+constexpr std::size_t kMostNamed = 10;
 
-// The language as the formats write it, in whatever letter case a core does.
-std::string Language(const StringBase& language) {
-  for (const StringBase* const known : {&LDXParser::LDX_HDL_VHDL, &LDXParser::LDX_HDL_VERILOG}) {
-    if (language.Compare(*known, StringBase::CompareIgnoreCase) == 0) return Text(*known);
-  }
-  return "";
+// Names sources and data files that are not there. False for one of these.
+bool AreThere(const SourceList& list, bool isError) {
+  std::vector<std::string> missing;
+  const auto look = [&](const std::string& path, const std::string& location) {
+    std::error_code error;
+    if (!std::filesystem::exists(location, error)) missing.push_back(path);
+  };
+  for (const Source& source : list.sources) look(source.path, source.location);
+  for (const Place& file : list.dataFiles) look(file.path, file.location);
+  if (missing.empty()) return true;
+  std::string text = std::to_string(missing.size()) + " listed files do not exist:";
+  if (missing.size() == 1) text = "a listed file does not exist:";
+  for (std::size_t i = 0; i < missing.size() && i < kMostNamed; ++i) text += "\n" + missing[i];
+  if (missing.size() > kMostNamed) text += "\nand others";
+  isError ? Messages::Error(text) : Messages::Warn(text);
+  return false;
+}
+
+void WriteRawPaths(const SourceList& list) {
+  Json records = Json::array();
+  for (const Source& source : list.sources) records.push_back({{"path", source.path}});
+  WritePaths(records);
 }
 
 Status Sources(const Tarvo::KelLibrary& library, const Request& request) {
-  const std::unique_ptr<KelIP> ip = OpenCore(library, request);
-  if (!ip) return StatusFindings;
-  const std::string purpose = request.Value("--for");
-  const std::string base = request.Value("--relative-to");
-  const auto question =
-      purpose == "simulation" ? &KelIP::GetSimulationSources : &KelIP::GetSynthesisSources;
-  std::vector<KelSource> sources;
-  if (!Ask(*ip, question, "sources", sources)) return StatusFindings;
-  std::vector<KelIncludeDirectory> directories;
-  // Without a source there is nothing to include into.
-  if (!sources.empty()) ip->GetVerilogIncludeDirectories(directories);
-  SourceList list = {Text(ip->GetKey()), purpose, {}, {}};
-  for (const KelSource& source : sources) {
-    list.sources.push_back(
-        {RelativeTo(base, source.path), Text(source.library.GetKey()), Language(source.language)});
+  const std::string format = request.Value("--format");
+  if (request.Has("--run") && format != "ghdl") {
+    return Refuse("--run is for --format ghdl", request.verb);
   }
-  for (const KelIncludeDirectory& directory : directories) {
-    list.includeDirectories.push_back({RelativeTo(base, directory.path), Text(directory.path)});
+  if (request.Has("--tool") && format != "edam") {
+    return Refuse("--tool is for --format edam", request.verb);
   }
-  WriteSources(list, request.Value("--format"));
-  return StatusClean;
+  const std::optional<SourceList> list = MakeSourceList(library, request);
+  if (!list) return StatusFindings;
+  const bool mustBeThere = request.Has("--check-files");
+  const bool areThere = AreThere(*list, mustBeThere);
+  if (request.Has("--null")) {
+    WriteRawPaths(*list);
+  } else if (const Status status = WriteSources(*list, format, request.Has("--language"))) {
+    return status;
+  }
+  return areThere || !mustBeThere ? StatusClean : StatusFindings;
 }
 
 Choices Purposes() { return {{"synthesis"}, {"simulation"}}; }
+
+std::vector<Word> Words() {
+  return {Repeated(KeyWord()),
+          {.name = "--for",
+           .value = "PURPOSE",
+           .help = "What the sources are for",
+           .isRequired = true,
+           .choices = Purposes},
+          {.name = "--format",
+           .value = "FORMAT",
+           .help = "How the sources are written",
+           .byDefault = "list",
+           .choices = SourceFormats},
+          {.name = "--top",
+           .value = "NAME",
+           .help = "The top unit; else the option TOP of the core, or its bare name"},
+          SetWord("Sets a parameter or generic of the top; may be repeated"),
+          {.name = "--run", .help = "Have the script of --format ghdl run the top"},
+          {.name = "--tool",
+           .value = "TOOL",
+           .help = "The simulator that --format edam is for, with the options that it needs",
+           .choices = FlowTools},
+          {.name = "--library-names",
+           .value = "WHICH",
+           .help = "What the library of a core's sources is called",
+           .byDefault = "option",
+           .choices = LibraryNamings},
+          {.name = "--hdl-library",
+           .value = "CORE=LIB",
+           .help = "Calls the library of this core so; CORE is a key or bare name; may be repeated",
+           .isRepeated = true,
+           .fault = PairFault},
+          {.name = "--vhdl-standard",
+           .value = "YEAR",
+           .help = "The standard of VHDL; else the option VHDL_STANDARD of each core",
+           .choices = VhdlStandards},
+          {.name = "--language",
+           .value = "LANGUAGE",
+           .help = "Of cores that have each file in both languages, take this one",
+           .choices = Languages},
+          {.name = "--benches",
+           .value = "WHOSE",
+           .help = "For simulation, leave out what other cores list for simulation alone (own)",
+           .byDefault = "all",
+           .choices = Benches},
+          {.name = "--check-files", .help = "A listed file that does not exist is an error"},
+          NullWord(),
+          RelativeToWord()};
+}
 
 }  // namespace
 
 Verb DescribeSources() {
   return {.name = "sources",
-          .help = "Lists the HDL sources of a core in analyse order",
-          .words = {KeyWord(),
-                    {.name = "--for",
-                     .value = "PURPOSE",
-                     .help = "What the sources are for",
-                     .isRequired = true,
-                     .choices = Purposes},
-                    {.name = "--format",
-                     .value = "FORMAT",
-                     .help = "How the sources are written",
-                     .byDefault = "list",
-                     .choices = SourceFormats},
-                    RelativeToWord()},
+          .help = "Lists the HDL sources of cores in analyse order",
+          .words = Words(),
           .example = "sources event_station --for simulation --format ghdl",
           .answer = Sources};
 }

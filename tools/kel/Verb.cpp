@@ -27,6 +27,12 @@ bool ComesBefore(const KelLibrary& library, const Kel_Key& left, const Kel_Key& 
 
 }  // namespace
 
+std::string PairFault(const std::string& pair) {
+  const std::size_t equals = pair.find('=');
+  const bool isGood = equals != std::string::npos && equals > 0;
+  return isGood ? "" : "'" + pair + "' is not NAME=VALUE";
+}
+
 std::vector<std::string> NamesOf(const Choices& choices) {
   std::vector<std::string> names;
   for (const Choice& choice : choices) names.push_back(choice.name);
@@ -46,6 +52,15 @@ Word GlobWord() {
 Word RelativeToWord() {
   return {
       .name = "--relative-to", .value = "DIR", .help = "Write paths relative to this directory"};
+}
+
+Word SetWord(const char* help) {
+  return {
+      .name = "--set", .value = "NAME=VALUE", .help = help, .isRepeated = true, .fault = PairFault};
+}
+
+Word NullWord() {
+  return {.letter = "-0", .name = "--null", .help = "Write only paths, each with a NUL behind it"};
 }
 
 Word Repeated(Word word) {
@@ -72,8 +87,16 @@ std::vector<Kel_Key> SortedKeys(const KelLibrary& library) {
   return keys;
 }
 
-std::unique_ptr<KelIP> OpenCore(const KelLibrary& library, const Request& request) {
-  const std::string key = request.Value("KEY");
+std::vector<Setting> SettingsOf(const Request& request) {
+  std::vector<Setting> settings;
+  for (const std::string& text : request.Values("--set")) {
+    const std::size_t equals = text.find('=');
+    settings.push_back({text.substr(0, equals), text.substr(equals + 1)});
+  }
+  return settings;
+}
+
+std::unique_ptr<KelIP> OpenCore(const KelLibrary& library, const std::string& key) {
   std::unique_ptr<KelIP> ip(library.CreateIP(key.c_str()));
   if (!ip) SuggestKeys(library, key);
   return ip;

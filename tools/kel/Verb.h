@@ -61,7 +61,11 @@ struct Word {
 Word KeyWord();
 Word GlobWord();
 Word RelativeToWord();
+Word SetWord(const char* help);
+Word NullWord();
 Word Repeated(Word word);
+// What is wrong with a value that is to be NAME=VALUE, or an empty text.
+std::string PairFault(const std::string& pair);
 
 // A row of the table of verbs.
 struct Verb {
@@ -95,8 +99,15 @@ bool MatchesAny(const Tarvo::Kel_Key& key, const std::vector<std::string>& globs
 // The versions whose options can be read: by name, and of each core the newest first.
 std::vector<Tarvo::Kel_Key> SortedKeys(const Tarvo::KelLibrary& library);
 
-// Opens the core of a request, or suggests other keys.
-std::unique_ptr<Tarvo::KelIP> OpenCore(const Tarvo::KelLibrary& library, const Request& request);
+// What was given for --set.
+struct Setting {
+  std::string name;
+  std::string value;
+};
+std::vector<Setting> SettingsOf(const Request& request);
+
+// Opens a core, or suggests other keys.
+std::unique_ptr<Tarvo::KelIP> OpenCore(const Tarvo::KelLibrary& library, const std::string& key);
 
 // Asks for a core's sources or netlists. A core whose style has none gives an empty answer and a
 // note that says so. False for a failure.

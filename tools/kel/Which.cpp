@@ -40,7 +40,7 @@ Status Which(const Tarvo::KelLibrary& library, const Request& request) {
 Verb DescribeWhich() {
   return {.name = "which",
           .help = "Tells key, name, version and location of each core",
-          .words = {Repeated(KeyWord())},
+          .words = {Repeated(KeyWord()), NullWord()},
           .example = "which word_fifo pulse_counter_v1_00_a",
           .answer = Which};
 }

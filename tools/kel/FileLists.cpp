@@ -1,0 +1,81 @@
+// Formats that are lists of files: for people, for Verilog tools and for an editor.
+
+#include <algorithm>
+#include <map>
+
+#include "FormatWriters.h"
+#include "Quoting.h"
+
+namespace {
+
+using Quoting::FileListWord;
+using Quoting::TomlString;
+
+// Comments name the libraries, which a file list can't say.
+void WriteVerilogFiles(std::ostream& output, const SourceList& list) {
+  for (const Place& directory : list.includeDirectories) {
+    output << "+incdir+" << FileListWord(directory.path) << '\n';
+  }
+  std::string library;
+  for (const Source& source : list.sources) {
+    if (!IsVerilog(source)) continue;
+    if (source.library != library) output << "// library " << source.library << '\n';
+    library = source.library;
+    output << FileListWord(source.path) << '\n';
+  }
+}
+
+// A number as it is, and any other text as a string.
+std::string VerilogValue(const std::string& value) {
+  const bool isNumber =
+      !value.empty() &&
+      value.find_first_not_of("0123456789abcdefABCDEFxXzZ_'.+-hHoOsS?") == std::string::npos &&
+      value.find_first_of("0123456789'") != std::string::npos;
+  return isNumber ? value : "\"" + Quoting::Backslashed(value, "\\\"") + "\"";
+}
+
+const std::map<std::string, const char*> kYears = {
+    {"93", "1993"}, {"02", "2008"}, {"08", "2008"}, {"19", "2019"}};
+
+}  // namespace
+
+// Through a table, so that a terminal is shown each name on one line.
+void WriteList(std::ostream& output, const SourceList& list) {
+  Table table;
+  for (const Source& source : list.sources) table.Add({source.path});
+  table.Write(output);
+}
+
+// The tools that read this have no common word for a top, so it is a comment for people.
+void WriteFileList(std::ostream& output, const SourceList& list) {
+  if (list.isTopGiven) output << "// top " << list.top << '\n';
+  WriteVerilogFiles(output, list);
+}
+
+void WriteVerilator(std::ostream& output, const SourceList& list) {
+  output << "--top-module " << list.top << '\n';
+  for (const Setting& parameter : list.parameters) {
+    output << FileListWord("-G" + parameter.name + "=" + VerilogValue(parameter.value)) << '\n';
+  }
+  WriteVerilogFiles(output, list);
+}
+
+// It knows no VHDL of 2002, but all of that is in the next one.
+void WriteVhdlLs(std::ostream& output, const SourceList& list) {
+  const std::string standard = OneStandard(list, "the VHDL language server");
+  if (!standard.empty()) output << "standard = \"" << kYears.at(standard) << "\"\n";
+  output << "[libraries]\n";
+  for (const std::string& library : LibrariesOf(list, &Source::library)) {
+    const auto isHere = [&](const Source& source) {
+      return IsVhdl(source) && source.library == library;
+    };
+    if (std::none_of(list.sources.begin(), list.sources.end(), isHere)) continue;
+    output << TomlString(library) << ".files = [\n";
+    for (const Source& source : list.sources) {
+      if (isHere(source)) {
+        output << "  " << TomlString(Quoting::GlobLiteral(source.path)) << ",\n";
+      }
+    }
+    output << "]\n";
+  }
+}

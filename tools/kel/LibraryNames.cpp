@@ -1,0 +1,95 @@
+// What the library of a core's sources is called where tools compile them. VHDL takes only
+// identifiers; a key is nearly always one.
+
+#include "LibraryNames.h"
+
+#include <algorithm>
+#include <map>
+#include <set>
+
+#include "Suggestions.h"
+#include "Text.h"
+
+namespace {
+
+using Tarvo::Kel_Key;
+
+// Of each core that has a source in a list, by its key.
+using Names = std::map<std::string, std::string>;
+
+std::string BaseName(const std::string& key) { return Text(Kel_Key(key.c_str()).GetName()); }
+
+std::string OwnName(const CoreOptions& options, const std::string& key, const std::string& naming) {
+  if (naming == "name") return BaseName(key);
+  const std::string stated = naming == "option" ? options.Value(key, "HDL_LIBRARY") : "";
+  return stated.empty() ? key : stated;
+}
+
+// A bare name stands for all versions that are here.
+bool SetName(const std::string& setting, Names& names) {
+  const std::size_t equals = setting.find('=');
+  const std::string core = setting.substr(0, equals);
+  std::set<std::string> known;
+  bool isSet = false;
+  for (auto& [key, name] : names) {
+    known.insert({key, BaseName(key)});
+    if (core != key && core != BaseName(key)) continue;
+    name = setting.substr(equals + 1);
+    isSet = true;
+  }
+  if (isSet) return true;
+  Messages::Error("--hdl-library names '" + core + "', which has no sources here" +
+                  DidYouMean({known.begin(), known.end()}, core));
+  return false;
+}
+
+bool VersionsDiffer(const Names& names) {
+  std::map<std::pair<std::string, std::string>, std::string> versions;
+  for (const auto& [key, name] : names) {
+    const auto [other, isFirst] = versions.try_emplace({BaseName(key), name}, key);
+    if (isFirst) continue;
+    Messages::Error(other->second + " and " + key + " would both be the library '" + name +
+                    "'. Give one of them another name with --hdl-library KEY=NAME, or call "
+                    "libraries by their keys with --library-names key");
+    return false;
+  }
+  return true;
+}
+
+bool IsIdentifier(const std::string& name) {
+  const auto isLetterOrDigit = [](char c) { return IsPlain(c, ""); };
+  if (name.empty() || !isLetterOrDigit(name.front()) || name.back() == '_') return false;
+  if (name.front() >= '0' && name.front() <= '9') return false;
+  return std::all_of(name.begin(), name.end(), [](char c) { return IsPlain(c, "_"); }) &&
+         name.find("__") == std::string::npos;
+}
+
+void TellOddNames(const SourceList& list) {
+  std::set<std::string> told;
+  for (const Source& source : list.sources) {
+    if (!IsVhdl(source) || IsIdentifier(source.library)) continue;
+    if (!told.insert(source.library).second) continue;
+    Messages::Warn("'" + source.library + "' is no name for a library in VHDL, but " + source.key +
+                   " would have it. Give it another name with --hdl-library KEY=NAME");
+  }
+}
+
+}  // namespace
+
+bool NameLibraries(const CoreOptions& options, const Request& request, SourceList& list) {
+  const std::string naming = request.Value("--library-names");
+  Names names;
+  for (const std::string& key : list.keys) names[key] = OwnName(options, key, naming);
+  for (const Source& source : list.sources) {
+    const auto [name, isNew] = names.try_emplace(source.key);
+    if (isNew) name->second = OwnName(options, source.key, naming);
+  }
+  for (const std::string& setting : request.Values("--hdl-library")) {
+    if (!SetName(setting, names)) return false;
+  }
+  if (!VersionsDiffer(names)) return false;
+  for (Source& source : list.sources) source.library = names[source.key];
+  list.topLibrary = names[list.keys.front()];
+  TellOddNames(list);
+  return true;
+}
