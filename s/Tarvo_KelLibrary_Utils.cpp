@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <boost/filesystem.hpp>
 #include <numeric>
+#include <string>
 #include <string_view>
 #include <utility>
 
@@ -66,7 +67,32 @@ StringBase Lower(StringBase text) {
   return text;
 }
 
+// The reserved words of VHDL-2019 and of all editions before it, and the libraries that are there
+// already; a blank before and behind each.
+constexpr std::string_view kTakenNames =
+    " abs access after alias all and architecture array assert assume assume_guarantee attribute "
+    "begin block body buffer bus case component configuration constant context cover default "
+    "disconnect downto else elsif end entity exit fairness file for force function generate "
+    "generic group guarded if impure in inertial inout is label library linkage literal loop "
+    "map mod nand new next nor not null of on open or others out package parameter port "
+    "postponed private procedure process property protected pure range record register reject "
+    "release rem report restrict restrict_guarantee return rol ror select sequence severity "
+    "shared signal sla sll sra srl strong subtype then to transport type unaffected units until "
+    "use variable view vmode vpkg vprop vunit wait when while with xnor xor ieee std work ";
+
+bool IsBasicIdentifier(std::string_view text) {
+  const auto isLetter = [](char c) { return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z'); };
+  const auto isPart = [&](char c) { return isLetter(c) || (c >= '0' && c <= '9') || c == '_'; };
+  return !text.empty() && isLetter(text.front()) && text.back() != '_' &&
+         text.find("__") == std::string_view::npos && std::all_of(text.begin(), text.end(), isPart);
+}
+
 }  // namespace
+
+bool KelLibrary_Utils::IsHdlLibrary(const StringBase& text) {
+  const std::string word = " " + std::string(Lower(text).View()) + " ";
+  return IsBasicIdentifier(text.View()) && kTakenNames.find(word) == std::string_view::npos;
+}
 
 StringList KelLibrary_Utils::ListNear(const StringBase& text, const StringList& words) {
   const StringBase wanted = Lower(text);

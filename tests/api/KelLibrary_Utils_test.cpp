@@ -41,4 +41,14 @@ TEST(KelLibrary_Utils, SplitsAndTestsPaths) {
   }
 }
 
+TEST(KelLibrary_Utils, KnowsNamesOfVhdlLibraries) {
+  for (const char* good : {"a", "Uart_Lib2", "v1_00_a", "bus0", "vie", "ss"}) {
+    EXPECT_TRUE(KelLibrary_Utils::IsHdlLibrary(good)) << good;
+  }
+  for (const char* bad : {"", "_a", "a_", "a__b", "2a", "a b", "a-b", "\xE4", "abs", "XNOR", "view",
+                          "WORK", "std", "ieee"}) {
+    EXPECT_FALSE(KelLibrary_Utils::IsHdlLibrary(bad)) << bad;
+  }
+}
+
 }  // namespace
