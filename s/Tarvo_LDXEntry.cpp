@@ -25,12 +25,11 @@ bool ReadEnd(TokenReader& tokens, const char* text, LineFault& fault) {
 }
 
 bool ReadLibraryEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
-  std::string_view keyword;
-  if (!ReadNeeded(tokens, keyword, "missing keyword", fault)) return false;
-  entry.forSynthesis = keyword == kBoth || keyword == kSynthesisOnly;
-  entry.forSimulation = keyword == kBoth || keyword == kSimulationOnly;
+  if (!ReadNeeded(tokens, entry.keyword, "missing keyword", fault)) return false;
+  entry.forSynthesis = entry.keyword == kBoth || entry.keyword == kSynthesisOnly;
+  entry.forSimulation = entry.keyword == kBoth || entry.keyword == kSimulationOnly;
   if (!entry.forSynthesis && !entry.forSimulation) {
-    fault = {keyword, "unknown keyword", false, true};
+    fault = {entry.keyword, "unknown keyword", false, true};
     return false;
   }
   if (!ReadNeeded(tokens, entry.library, "missing library", fault)) return false;
@@ -47,12 +46,11 @@ bool ReadLibraryEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
 
 // A keyword in other letter case, and a line that goes on behind the directory, are ignored.
 bool ReadPathEntry(TokenReader& tokens, LDXEntry& entry, LineFault& fault) {
-  std::string_view keyword;
   entry.kind = LDXEntry::IncludeDirectory;
-  if (!ReadNeeded(tokens, keyword, "missing keyword", fault)) return false;
-  if (keyword != kIncludeDirectory) {
+  if (!ReadNeeded(tokens, entry.keyword, "missing keyword", fault)) return false;
+  if (entry.keyword != kIncludeDirectory) {
     entry.kind = LDXEntry::Ignored;
-    entry.rest = keyword;
+    entry.rest = entry.keyword;
     return true;
   }
   if (!ReadNeeded(tokens, entry.library, "missing library", fault)) return false;

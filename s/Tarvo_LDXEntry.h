@@ -20,6 +20,7 @@ struct LDXEntry {
   enum Kind { File, WholeLibrary, IncludeDirectory, Ignored };
 
   Kind kind = File;
+  std::string_view keyword;
   bool forSynthesis = false;
   bool forSimulation = false;
   std::string_view library;
