@@ -10,6 +10,7 @@ it are what it must print, standard error last; a line of three dots stands for 
 in a backslash goes on in the next. In tests/transcripts an exit status other than 0 stands below, as [1]. In a manual page the blocks are those between .EX and .EE. Each `cpp` block is
 compiled and run as README.md says, and prints what the `text` block behind it shows. Data files, whose
 first line is a comment with their path, make a repository, in which the document's lines are then run.
+The table of literals in docs/formats.md has what to write, and what is handed on then.
 docs/diagnostics.md has a section for each code of `kel help diagnostics`: its data files, in a repository
 of their own behind its `sh` blocks, are checked, and the lines with the code are those of its `text` block.
 The manual page has what `kel help` says, and a schema what the command may write.
@@ -140,6 +141,26 @@ def code_faults(environment):
             yield f"{name}: the example of {code} gives\n{printed}"
 
 
+def literal_faults(environment):
+    """Each row of the table of literals, written as a parameter, hands on what it says."""
+    name = "docs/formats.md"
+    rows = re.findall(r"^\| [^|]+ \| `(.+)` \|(?: `(.+)`)? \|$", (ROOT / name).read_text(), re.MULTILINE)
+    with tempfile.TemporaryDirectory() as scratch:
+        data = pathlib.Path(scratch, "ipmods/a_v1_00_a/data")
+        data.mkdir(parents=True)
+        # The property behind each shows that it is not cut.
+        lines = [f"PARAMETER P{number} = {row[0]}, DESC = end\n" for number, row in enumerate(rows)]
+        (data / "a_v2_1_0.qvr").write_text("".join(lines))
+        printed = run("kel -L . show a --json", environment, scratch)
+    found = [one["properties"] for one in json.loads(printed)["parameters"]]
+    shown = [(one["VALUE"], one.get("DESC")) for one in found]
+    for (written, expected), read in zip(rows, shown, strict=True):
+        if read != (expected, "end"):
+            yield f"{name}: {written} hands on {read}"
+    if len(rows) < 10:
+        yield f"{name}: its table of literals is not found"
+
+
 def roff(text):
     return text.replace("\\", "\\e").replace("-", "\\-").replace("'", "\\(aq")
 
@@ -243,7 +264,7 @@ def main():
         page.write_text(with_help(page.read_text(), environment))
         return 0
     faults = [fault for name in DOCUMENTS + TRANSCRIPTS for fault in document_faults(name, environment)]
-    faults += [*code_faults(environment), *help_faults(environment)]
+    faults += [*code_faults(environment), *literal_faults(environment), *help_faults(environment)]
     if "--calls" not in sys.argv:
         faults += program_and_page_faults(build, environment)
     print("\n".join(faults) or "The documents' examples print what they show")
