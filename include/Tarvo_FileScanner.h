@@ -40,8 +40,10 @@ class TARVO_EXPORT FileScanner {
   // counted from 1, in bytes, tabs as one. An empty part may stand right behind the line.
   unsigned int GetColumn(std::string_view part) const noexcept;
 
-  // Whether a comment was taken off the last line that was handed out.
-  bool HasComment() const noexcept;
+  // The comment that was taken off the last line that was handed out, from its "#" on and without
+  // blanks at its end; empty if there was none. GetColumn tells where it stands. The view is good
+  // while the scanner lives and is not moved.
+  std::string_view GetComment() const noexcept;
 
   // Makes the first line the next one, without touching the file.
   void GoToStart();

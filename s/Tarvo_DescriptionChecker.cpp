@@ -44,10 +44,36 @@ struct Choice {
 const Choice kChoices[] = {
     {QVRStatement::Option, false, "STYLE", {"HDL", "BLACKBOX", "MIX"}},
     {QVRStatement::Option, false, kLanguageOption, {"VHDL", "Verilog", "MIXED", "BOTH"}},
+    {QVRStatement::Option, false, "VHDL_STANDARD", {"93", "02", "08", "19"}},
     {QVRStatement::Parameter, false, "TYPE", {"HDL", "NON_HDL"}},
     {QVRStatement::Port, false, "DIR", {"I", "O", "IO"}},
     {QVRStatement::Port, false, "ENDIAN", {"BIG", "LITTLE"}},
     {QVRStatement::Port, true, "SIGIS", {"CLK", "RST", "INTERRUPT"}}};
+
+// An option that takes any name of a kind.
+struct Named {
+  const char* key;
+  bool (*fits)(std::string_view value);
+  const char* hint;
+};
+const Named kNamed[] = {
+    {"HDL_LIBRARY",
+     [](std::string_view value) { return KelLibrary_Utils::IsHdlLibrary(StringBase(value)); },
+     "write a VHDL name: letters, digits and single '_', no reserved word, not work, std or ieee"},
+    {"TOP",
+     [](std::string_view value) {
+       return !value.empty() && value.find(' ') == std::string_view::npos;
+     },
+     "write one name, without blanks"}};
+
+// The options of cores that mean something to the library, or to the command alone.
+StringList NamesOfOptions() {
+  StringList names = NamesOf(KnownProperties::OfCores());
+  for (const char* const name : {"DATA_FILES", "HDL_LIBRARY", "TOP", "VHDL_STANDARD"}) {
+    names.emplace_back(name);
+  }
+  return names;
+}
 
 // The keys of a kind of statement: those that the readers put in front of the stated ones, which
 // they hide, and all that mean something.
@@ -59,7 +85,7 @@ struct Keys {
 const Keys& KeysOf(QVRStatement::Keyword keyword) {
   // Made at the first call: exported constants are there by then.
   static const Keys none;
-  static const Keys options{{"NAME", "VERSION"}, NamesOf(KnownProperties::OfCores())};
+  static const Keys options{{"NAME", "VERSION"}, NamesOfOptions()};
   static const Keys parameters{{"NAME", "VALUE", "DEFAULT_VALUE"},
                                NamesOf(KnownProperties::OfParameters())};
   static const Keys ports{{"NAME", "DEFAULT"}, NamesOf(KnownProperties::OfPorts())};
@@ -79,6 +105,28 @@ constexpr std::string_view kRestIgnored = "; the rest of the line is ignored";
 
 std::string_view FirstOf(std::string_view text, const char* ends) {
   return text.substr(0, std::max<std::size_t>(1, std::min(text.find_first_of(ends), text.size())));
+}
+
+// Whether the rest of a line follows the last value without a blank, so that both were meant for
+// one value. Behind a quoted value stands its quote.
+bool IsGoneOn(const QVRStatement::List& list) {
+  const std::string_view value = list.pairs.back().value;
+  const auto between = list.rest.data() - (value.data() + value.size());
+  const bool isQuote = between == 1 && *(list.rest.data() - 1) != ' ';
+  return (between == 0 || isQuote) && list.rest.find_first_of(",;)]") != 0;
+}
+
+// How far such a rest goes on: up to a blank or a comma outside of quotes and brackets. An
+// apostrophe is a letter, as in 8'hFF.
+std::string_view GoneOn(std::string_view rest) {
+  TokenReader tokens(rest, " ,=()[]\"", TokenReader::WithGroups);
+  std::string_view left = rest;
+  while (!left.empty() && left.find_first_of(" ,") != 0) {
+    if (!tokens.ReadValue().whole) return rest.substr(0, rest.find_first_of(" ,"));
+    tokens.Step();
+    left = tokens.GetRest();
+  }
+  return rest.substr(0, rest.size() - left.size());
 }
 
 StringBase Joined(const std::vector<const char*>& words) {
@@ -115,6 +163,7 @@ class DescriptionChecker {
   void CheckOption(Text line);
   void CheckList(QVRStatement::Keyword keyword, Text line);
   void CheckEnd(const QVRStatement::List& list);
+  void TellGoneOn(const QVRStatement::List& list);
   void CheckPairs(QVRStatement::Keyword keyword, const QVRStatement::List& list, std::size_t first);
   void CheckKey(QVRStatement::Keyword keyword, const std::vector<Pair>& pairs, std::size_t at,
                 std::size_t first);
@@ -201,6 +250,7 @@ void DescriptionChecker::CheckOption(Text line) {
   const auto result =
       QVRStatement::ReadOption(line, QVRStatement::kOptionDelimiters, option, fault);
   if (result != QVRStatement::Read) return TellBad(fault);
+  TellCut(lines, line);
   if (!Declare(QVRStatement::Option, option.pair.key)) return;
   CheckKey(QVRStatement::Option, {option.pair}, 0, 1);
   const Property stated = QVRStatement::MakeOption(option);
@@ -232,6 +282,7 @@ void DescriptionChecker::CheckList(QVRStatement::Keyword keyword, Text line) {
     bad.insert(keyword);
     return TellBad(fault);
   }
+  TellCut(lines, line);
   // An interface is named by the value of its key, all else by the key of the first pair.
   Declare(keyword, isInterface ? list.pairs[position].value : list.pairs.front().key);
   CheckPairs(keyword, list, isInterface ? 0 : 1);
@@ -263,10 +314,26 @@ void DescriptionChecker::CheckEnd(const QVRStatement::List& list) {
   QVRStatement::List read;
   LineFault fault;
   const bool isMended = QVRStatement::ReadList(line.View(), read, fault) && read.rest.empty();
+  if (!isMended && IsGoneOn(list)) return TellGoneOn(list);
   Tell(Codes::kListEnds, word,
        Say({"missing ',' ", isMended ? "" : "or quotes ", "before ", isMended ? "" : "'", word,
             isMended ? "" : "'", kRestIgnored}),
        isMended ? Say({"write ", mended.View()}) : StringBase());
+}
+
+// What to write for the whole value depends on the quotes that are in it.
+void DescriptionChecker::TellGoneOn(const QVRStatement::List& list) {
+  const Pair& last = list.pairs.back();
+  const Text more = GoneOn(list.rest);
+  const Text whole(last.value.data(), last.value.size() + more.size());
+  const bool isVector = last.key == QVRParser::QVR_PORT_VEC.View();
+  const bool isQuoted = last.value.data() + last.value.size() != list.rest.data();
+  const Text quote = whole.find('"') == Text::npos ? "\"" : "'";
+  const bool mayQuote = !isQuoted && whole.find(quote) == Text::npos;
+  Tell(Codes::kListEnds, more, Say({"the value ends at '", last.value, "'", kRestIgnored}),
+       isVector   ? StringBase("a VEC is one range, [LEFT:RIGHT]")
+       : mayQuote ? Say({"write ", quote, whole, quote})
+                  : StringBase("put the whole value in one pair of quotes"));
 }
 
 void DescriptionChecker::CheckPairs(QVRStatement::Keyword keyword, const QVRStatement::List& list,
@@ -328,6 +395,11 @@ void DescriptionChecker::CheckValue(QVRStatement::Keyword keyword, const Pair& p
     Tell(Codes::kBadValue, pair.value, Say({pair.key, " can't be '", pair.value, "'"}),
          meant.GetLength() > 0 ? Say({"did you mean ", meant.View(), "?"})
                                : Say({"write ", Joined(choice.values).View()}));
+  }
+  if (keyword != QVRStatement::Option) return;
+  for (const Named& named : kNamed) {
+    if (pair.key != named.key || named.fits(pair.value)) continue;
+    Tell(Codes::kBadValue, pair.value, Say({pair.key, " can't be '", pair.value, "'"}), named.hint);
   }
 }
 

@@ -34,9 +34,14 @@ inline constexpr Code kBadStatement{
     "of several words stands in quotes or brackets. An interface is named by its BUS or IO_IF."};
 inline constexpr Code kBadValue{
     "bad-value", kWarning, "value that an option or a property does not take",
-    "The option STYLE is HDL, BLACKBOX or MIX, and HDL is VHDL, Verilog, MIXED or BOTH. DIR is I, "
-    "O "
-    "or IO, ENDIAN is BIG or LITTLE, and TYPE of a parameter is HDL or NON_HDL."};
+    "The option STYLE is HDL, BLACKBOX or MIX, and HDL is VHDL, Verilog, MIXED or BOTH. "
+    "VHDL_STANDARD is 93, 02, 08 or 19, TOP is one name, and HDL_LIBRARY a name of a VHDL library. "
+    "DIR is I, O or IO, ENDIAN is BIG or LITTLE, and TYPE of a parameter is HDL or NON_HDL."};
+inline constexpr Code kCommentInValue{
+    "comment-in-value", kWarning, "comment that is probably part of a value",
+    "A '#' begins a comment wherever it stands, in quotes and brackets too, so no value can have "
+    "one. "
+    "Write a number in decimal, and put a blank in front of a comment."};
 inline constexpr Code kDuplicateIncludeDirectory{
     "duplicate-include-directory", kError, "second include directory of one library",
     "A library has one Verilog include directory in an analyse order."};
@@ -57,6 +62,10 @@ inline constexpr Code kFailed{"failed", kError, "request failed",
 inline constexpr Code kIgnoredEntry{
     "ignored-entry", kWarning, "entry that is ignored as a whole",
     "Write vlgincdir in small letters, and nothing after the directory."};
+inline constexpr Code kIgnoredPurpose{
+    "ignored-purpose", kWarning, "purpose that a whole library does not heed",
+    "With 'all', synlib and simlib do what lib does: the library is taken for synthesis and for "
+    "simulation. Write 'lib LIBRARY all', or list the sources for one purpose one by one."};
 inline constexpr Code kIncludeCircle{
     "include-circle", kError, "cores that include each other in a circle",
     "A core can't be analysed before itself. Take one of the includes out."};
@@ -144,6 +153,7 @@ inline constexpr const Code* kAll[] = {&kBadEntry,
                                        &kBadRow,
                                        &kBadStatement,
                                        &kBadValue,
+                                       &kCommentInValue,
                                        &kDuplicateIncludeDirectory,
                                        &kDuplicateName,
                                        &kDuplicateRow,
@@ -151,6 +161,7 @@ inline constexpr const Code* kAll[] = {&kBadEntry,
                                        &kEmptyOrder,
                                        &kFailed,
                                        &kIgnoredEntry,
+                                       &kIgnoredPurpose,
                                        &kIncludeCircle,
                                        &kIncludeTooDeep,
                                        &kLanguageMismatch,

@@ -3,6 +3,7 @@
 
 #include "Tarvo_FileScanner.h"
 
+#include <algorithm>
 #include <memory>
 #include <string_view>
 #include <utility>
@@ -121,9 +122,11 @@ unsigned int FileScanner::GetColumn(std::string_view part) const noexcept {
 }
 
 // Cleaning leaves the comment in the text.
-bool FileScanner::HasComment() const noexcept {
-  const std::string_view line = std::string_view(text).substr(lastPosition);
-  return line.substr(0, line.find('\n')).find(kComment) != std::string_view::npos;
+std::string_view FileScanner::GetComment() const noexcept {
+  std::string_view line = std::string_view(text).substr(lastPosition);
+  line = line.substr(0, line.find('\n'));
+  const std::string_view comment = line.substr(std::min(line.find(kComment), line.size()));
+  return comment.substr(0, comment.find_last_not_of(" \t\r") + 1);
 }
 
 void FileScanner::GoToStart() {

@@ -147,6 +147,7 @@ class OrderReader {
   [[gnu::noinline]] KelDiagnostic TellBadEntry(const LineFault& fault) const;
   void TellUnknown(std::string_view library) const;
   void TellIgnored(const LDXEntry& entry) const;
+  void TellDoubtful(std::string_view line, const LDXEntry& entry) const;
   void TraceKnown(const AnalyseOrder::SourcePointers& sources, const char* purpose,
                   const Kel_Key& from) const;
 
@@ -284,6 +285,7 @@ void OrderReader::ReadLine(std::string_view line) {
   LineFault fault;
   const bool isRead = ReadLDXEntry(line, entry, fault);
   if (!isRead) Diagnosis::Add([&] { return TellBadEntry(fault); });
+  if (isRead && Diagnosis::GoesOn()) TellDoubtful(line, entry);
   if (!isRead || !AddEntry(entry)) RefuseLine(line, entry);
 }
 
@@ -415,6 +417,19 @@ void OrderReader::TellIgnored(const LDXEntry& entry) const {
     const bool isPath = entry.kind == LDXEntry::IncludeDirectory;
     return Say({isPath ? "the entry is ignored, because something follows the directory"
                        : "the entry is ignored; write vlgincdir in small letters"});
+  });
+}
+
+// What a good entry does other than it looks. For a checker alone.
+void OrderReader::TellDoubtful(std::string_view line, const LDXEntry& entry) const {
+  TellCut(*lines, line);
+  const bool isForBoth = entry.forSynthesis && entry.forSimulation;
+  if (entry.kind != LDXEntry::WholeLibrary || isForBoth) return;
+  Diagnosis::Add([&] {
+    return Diagnosis::At(
+        Codes::kIgnoredPurpose, SpanOf(entry.keyword),
+        Say({entry.keyword, " with 'all' takes all of '", entry.library, "' for both purposes"}),
+        Say({"write lib ", entry.library, " all"}));
   });
 }
 

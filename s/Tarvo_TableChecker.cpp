@@ -76,6 +76,10 @@ class TableChecker {
     Diagnosis::Add([&] { return At(code, SpanOf(lines, part), text, hint); });
   }
 
+  void TellBad(const KelDiagnosticCode& code, const LineFault& fault) const {
+    Diagnosis::Add([&] { return TellFault(code, lines, fault); });
+  }
+
   StringBase name;
   Port_Input input;
   FileScanner lines;
@@ -127,6 +131,7 @@ unsigned TableChecker::FindHeader() {
 
 void TableChecker::TellNoHeader(Text line) const {
   const char* const text = "missing header: names of parameters, then FILES";
+  TellCut(lines, line);
   TEWLine::Header header;
   LineFault fault;
   const bool hasNames = TEWLine::ReadHeader(line, header, fault) && !header.names.empty();
@@ -145,9 +150,10 @@ void TableChecker::CheckHeader(Text line, bool isChosen) {
   TEWLine::Header header;
   LineFault fault;
   if (!TEWLine::ReadHeader(line, header, fault)) {
-    return Tell(Codes::kBadHeader, fault.where, fault.text);
+    return TellBad(Codes::kBadHeader, fault);
   }
   TellHeader(header, fault);
+  if (isChosen) TellCut(lines, line);
   for (const Text column : header.names) {
     if (!isChosen && FindParameter(StringBase(column)) == nullptr) return;
     if (column != ",") columns.emplace_back(column);
@@ -162,7 +168,7 @@ void TableChecker::TellHeader(const TEWLine::Header& header, const LineFault& fa
       Diagnosis::Add([&] { return TellUnknownParameter(lines, column, parameters); });
     }
   }
-  if (!header.isEnded) Tell(Codes::kBadHeader, fault.where, fault.text);
+  if (!header.isEnded) TellBad(Codes::kBadHeader, fault);
 }
 
 const DescribedParameter* TableChecker::FindParameter(const StringBase& parameter) const {
@@ -176,7 +182,9 @@ void TableChecker::CheckRow(Text line) {
   TEWLine::Row row;
   LineFault fault;
   if (TEWLine::ReadRow(line, columns.size(), row, fault) != TEWLine::Read) {
-    Diagnosis::Add([&] { return TellFault(Codes::kBadRow, lines, fault); });
+    TellBad(Codes::kBadRow, fault);
+  } else {
+    TellCut(lines, line);
   }
   // What stands in front of a fault is looked at all the same.
   if (CheckCommas(row)) return;

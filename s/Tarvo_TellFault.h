@@ -17,13 +17,13 @@ inline Diagnosis::Span SpanOf(const FileScanner& lines, std::string_view part) {
   return {lines.GetColumn(part), static_cast<unsigned>(part.size())};
 }
 
-// What is wrong with the present line, as a diagnostic.
-inline KelDiagnostic TellFault(const KelDiagnosticCode& code, const FileScanner& lines,
-                               const LineFault& fault) {
-  const bool isCut = fault.isOpen && lines.HasComment();
-  return Diagnosis::At(code, SpanOf(lines, fault.where), fault.text,
-                       isCut ? "'#' begins a comment, in quotes too" : "");
-}
+// What is wrong with the present line, as a diagnostic. The hint tells of a "#" that has cut it.
+KelDiagnostic TellFault(const KelDiagnosticCode& code, const FileScanner& lines,
+                        const LineFault& fault);
+
+// Warns if the comment of the present line, which is good without it, is probably the rest of a
+// value.
+void TellCut(const FileScanner& lines, std::string_view line);
 
 // Reads a data file of a core that was looked for. One that can't be read is told, with the code
 // for a missing one where that is what is wrong; the exception passes.

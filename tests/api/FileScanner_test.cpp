@@ -20,6 +20,7 @@ std::string Dump(FileScanner& scanner) {
   unsigned number = 0;
   while (scanner.GetNextLine(line, number)) {
     text += std::to_string(number) + "<" + std::string(line.View()) + ">";
+    text += scanner.GetComment();
   }
   EXPECT_EQ(line, "");
   return text + std::to_string(number);
@@ -27,10 +28,10 @@ std::string Dump(FileScanner& scanner) {
 
 TEST(FileScanner, CleansLinesAndKeepsTheirNumbers) {
   const std::string rows[][2] = {{"", "1"},
-                                 {"PORT a = 1 # note", "1<PORT a = 1>2"},
+                                 {"PORT a = 1 # note", "1<PORT a = 1># note2"},
                                  {"   PARAMETER x = 1\t\n", "1<PARAMETER x = 1>2"},
-                                 {"#\n \t \nx\n\n", "1<>2<>3<x>4<>5"},
-                                 {"a\t b\r\n\"x # y\"", "1<a  b>2<\"x>3"},
+                                 {"#\n \t \nx#\t\r\n\n", "1<>#2<>3<x>#4<>5"},
+                                 {"a\t b\r\n\"x # y\"", "1<a  b>2<\"x># y\"3"},
                                  {"a\0b\xFF\xC3\n"s, "1<a\0b\xFF\xC3>2"s}};
   RepositoryBuilder directory;
   for (const auto& [content, lines] : rows) {
