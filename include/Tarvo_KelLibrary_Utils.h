@@ -27,8 +27,7 @@ class TARVO_EXPORT KelLibrary_Utils {
 
   // Whether a text may be the logical name of a VHDL library that sources are analysed into:
   // letters of ASCII, digits and single "_", a letter first and no "_" last; no reserved word up to
-  // VHDL-2019; and none of the names that have a meaning already: work, std and ieee. In either
-  // letter case.
+  // VHDL-2019; and neither std nor ieee, which are there already. In either letter case.
   static bool IsHdlLibrary(const StringBase& text);
 
   KelLibrary_Utils() = delete;

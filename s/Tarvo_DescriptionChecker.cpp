@@ -59,7 +59,7 @@ struct Named {
 const Named kNamed[] = {
     {"HDL_LIBRARY",
      [](std::string_view value) { return KelLibrary_Utils::IsHdlLibrary(StringBase(value)); },
-     "write a VHDL name: letters, digits and single '_', no reserved word, not work, std or ieee"},
+     "write a VHDL name: letters, digits and single '_', no reserved word, not std or ieee"},
     {"TOP",
      [](std::string_view value) {
        return !value.empty() && value.find(' ') == std::string_view::npos;

@@ -210,7 +210,7 @@ void CheckRun::FindUnlisted(const StringList& keys) {
     const fs::path hdl = location / Kel_Index::KEL_HDL_SUBDIRECTORY.GetText();
     Collect([&] {
       FindUnlistedIn(hdl / Kel_Index::KEL_VHDL_SUBDIRECTORY.GetText(), {".vhd", ".vhdl"});
-      FindUnlistedIn(hdl / Kel_Index::KEL_VERILOG_SUBDIRECTORY.GetText(), {".v"});
+      FindUnlistedIn(hdl / Kel_Index::KEL_VERILOG_SUBDIRECTORY.GetText(), {".v", ".sv"});
       // Netlists have many extensions, so any file counts there.
       FindUnlistedIn(location / Kel_Index::KEL_NETLIST_SUBDIRECTORY.GetText(), {});
     });

@@ -78,7 +78,7 @@ constexpr std::string_view kTakenNames =
     "postponed private procedure process property protected pure range record register reject "
     "release rem report restrict restrict_guarantee return rol ror select sequence severity "
     "shared signal sla sll sra srl strong subtype then to transport type unaffected units until "
-    "use variable view vmode vpkg vprop vunit wait when while with xnor xor ieee std work ";
+    "use variable view vmode vpkg vprop vunit wait when while with xnor xor ieee std ";
 
 bool IsBasicIdentifier(std::string_view text) {
   const auto isLetter = [](char c) { return (c >= 'a' && c <= 'z') || (c >= 'A' && c <= 'Z'); };

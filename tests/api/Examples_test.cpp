@@ -124,7 +124,10 @@ void Examples::DescribeSources() {
   for (const StringBase& source : sources) {
     StringList values;
     for (const StringBase& property : List(&KelIP::ListSourceProperties, source)) {
-      values.push_back(Ask<StringBase>(&KelIP::GetSourceProperty, source, property));
+      // the extension .sv tells no language
+      StringBase value;
+      ip->GetSourceProperty(source, property, value);
+      values.push_back(value);
     }
     Write("source", values);
   }
