@@ -7,7 +7,6 @@ Needs what scripts/install-dependencies.sh installs for the group `tools`. Print
 or what is wrong, and exits with 1 if any failed. Writes nothing outside a temporary directory.
 """
 
-import copy
 import json
 import os
 import pathlib
@@ -33,6 +32,8 @@ SOURCE_NAMES = ["a b.vhd", "it's one.vhd", 'a "word".vhd', "$HOME$(x)`y`.vhd", "
 # A schema of SARIF 2.1.0 and a program that reads it.
 SARIF_PACKAGES = ["@microsoft/jest-sarif@1.0.0-beta.0", "sarif-junit@1.1.4"]
 SARIF_SCHEMA = "@microsoft/jest-sarif/lib/schemas/sarif-2.1.0-rtm.5.json"
+# What EDAM may leave out.
+OPTIONAL = ["version", "toplevel", "parameters", "flow_options", "logical_name", "include_path"]
 
 failed = []
 
@@ -233,17 +234,17 @@ def valid(document, schema):
 
 
 def strictly_valid(document, name):
-    """Valid, and no longer so without a member or with one more."""
+    """Valid, and no longer so without a member, with one more or with another type of file."""
     validator = valid(document, json.loads((ROOT / f"docs/{name}.schema.json").read_text()))
-    records_at = next(name for name in ["files", "sources", "findings"] if name in document)
-    for at in [None, *range(len(document[records_at]))]:
-        whole = document if at is None else document[records_at][at]
-        for name in [*whole, None]:
-            changed = copy.deepcopy(document)
-            part = changed if at is None else changed[records_at][at]
-            part.pop(name) if name else part.update(unknown="x")
-            if validator.is_valid(changed):
-                raise Fault(f"the schema allows {part}")
+    part_at = next(name for name in ["files", "sources", "findings"] if name in document)
+    parts = document[part_at]
+    for at in [None, *range(len(parts))]:
+        whole = document if at is None else parts[at]
+        changes = [{key: whole[key] for key in whole if key != name} for name in whole if name not in OPTIONAL]
+        changes += [{**whole, "unknown": "x"}, {**whole, "file_type": "VHDL"}]
+        for changed in changes:
+            if validator.is_valid(changed if at is None else {**document, part_at: [*parts[:at], changed, *parts[at + 1:]]}):
+                raise Fault(f"the schema allows {changed}")
 
 
 def odd_paths(folder, scratch):
