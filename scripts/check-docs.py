@@ -3,7 +3,8 @@
 
 Usage: check-docs.py [--calls | --update] [BUILD_DIRECTORY]
   --calls   runs calls of the command alone, which is quick
-  --update  writes into the manual page what the command's help says, and runs nothing
+  --update  writes into the manual page what the command's help says, and into tests/transcripts what is
+            printed, for you to read the difference
 
 In a `console` block a line behind "$ " is run with the built `kel` on the path, and the lines below
 it are what it must print, standard error last; a line of three dots stands for any lines. A line that ends
@@ -29,6 +30,8 @@ ROOT = pathlib.Path(__file__).resolve().parent.parent
 DOCUMENTS = ["README.md", "docs/guide.md", "docs/formats.md", "docs/kel.1"]
 TRANSCRIPTS = sorted(str(path.relative_to(ROOT)) for path in ROOT.glob("tests/transcripts/*.md"))
 SHOWN_ROOT = "/home/me/kel"
+# A command and what it prints, in a `console` block.
+CALL = r"^\$ ((?:.*\\\n)*.*)\n((?:(?!\$ ).*\n)*)"
 
 
 def blocks(text, language):
@@ -62,8 +65,7 @@ def matches(expected, printed):
 def console_faults(name, text, environment, directory):
     found = list(blocks(text, "console") if name.endswith(".md") else manual_blocks(text))
     for block in found:
-        for command, expected in re.findall(r"^\$ ((?:.*\\\n)*.*)\n((?:(?!\$ ).*\n)*)", block,
-                                            re.MULTILINE):
+        for command, expected in re.findall(CALL, block, re.MULTILINE):
             printed = run(command, environment, directory, name in TRANSCRIPTS)
             if not matches(expected, printed):
                 yield f"{name}: $ {command}\nprints\n{printed}"
@@ -105,6 +107,19 @@ def write_files(text, directory):
             path = directory / block.split("\n")[0].removeprefix("# ")
             path.parent.mkdir(parents=True, exist_ok=True)
             path.write_text(block)
+
+
+def with_calls(text, environment):
+    """A transcript with what its calls print now."""
+    def played(call):
+        printed = run(call[1], environment, directory, True)
+        return f"$ {call[1]}\n{call[2] if matches(call[2], printed) else printed}"
+    with tempfile.TemporaryDirectory() as scratch:
+        write_files(text, pathlib.Path(scratch))
+        directory = scratch if any(pathlib.Path(scratch).iterdir()) else ROOT
+        for block in blocks(text, "console"):
+            text = text.replace(block, re.sub(CALL, played, block, flags=re.MULTILINE))
+    return text
 
 
 def document_faults(name, environment):
@@ -262,6 +277,8 @@ def main():
     if "--update" in sys.argv:
         page = ROOT / "docs/kel.1"
         page.write_text(with_help(page.read_text(), environment))
+        for name in TRANSCRIPTS:
+            (ROOT / name).write_text(with_calls((ROOT / name).read_text(), environment))
         return 0
     faults = [fault for name in DOCUMENTS + TRANSCRIPTS for fault in document_faults(name, environment)]
     faults += [*code_faults(environment), *literal_faults(environment), *help_faults(environment)]
