@@ -70,6 +70,12 @@ bool IsTopVhdl(const SourceList& list) {
   return last != list.sources.rend() && IsVhdl(*last);
 }
 
+// A VHDL unit is found by its library's name, which a user may have given already.
+std::string EdamTop(const SourceList& list, bool isVhdl) {
+  const bool needsLibrary = isVhdl && list.top.find('.') == std::string::npos;
+  return needsLibrary ? list.topLibrary + "." + list.top : list.top;
+}
+
 Json EdamParameter(const std::string& value, bool isVhdl) {
   const char* const type = isVhdl ? "generic" : "vlogparam";
   const std::size_t digits = value.starts_with('-') ? 1 : 0;
@@ -125,7 +131,7 @@ void WriteJsonList(std::ostream& output, const SourceList& list) {
              {"top", list.top},
              {"top_library", list.topLibrary},
              {"parameters", parameters},
-             {"libraries", LibrariesOf(list, &Source::key)},
+             {"libraries", CoresOf(list)},
              {"sources", sources},
              {"include_directories", PathsOf(list.includeDirectories)},
              {"data_files", PathsOf(list.dataFiles)}},
@@ -140,7 +146,7 @@ void WriteEdam(std::ostream& output, const SourceList& list) {
   }
   Json document = {{"version", "0.2.1"},
                    {"name", list.keys.front()},
-                   {"toplevel", isVhdl ? list.topLibrary + "." + list.top : list.top},
+                   {"toplevel", EdamTop(list, isVhdl)},
                    {"parameters", parameters},
                    {"files", EdamFiles(list)}};
   if (!list.tool.empty()) document["flow_options"] = EdamFlowOptions(list);

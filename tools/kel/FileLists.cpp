@@ -1,6 +1,5 @@
 // Formats that are lists of files: for people, for Verilog tools and for an editor.
 
-#include <algorithm>
 #include <map>
 
 #include "FormatWriters.h"
@@ -65,16 +64,12 @@ void WriteVhdlLs(std::ostream& output, const SourceList& list) {
   const std::string standard = OneStandard(list, "the VHDL language server");
   if (!standard.empty()) output << "standard = \"" << kYears.at(standard) << "\"\n";
   output << "[libraries]\n";
-  for (const std::string& library : LibrariesOf(list, &Source::library)) {
-    const auto isHere = [&](const Source& source) {
-      return IsVhdl(source) && source.library == library;
-    };
-    if (std::none_of(list.sources.begin(), list.sources.end(), isHere)) continue;
-    output << TomlString(library) << ".files = [\n";
-    for (const Source& source : list.sources) {
-      if (isHere(source)) {
-        output << "  " << TomlString(Quoting::GlobLiteral(source.path)) << ",\n";
-      }
+  for (Library& library : LibrariesOf(list)) {
+    std::erase_if(library.sources, [](const Source* source) { return !IsVhdl(*source); });
+    if (library.sources.empty()) continue;
+    output << TomlString(library.name) << ".files = [\n";
+    for (const Source* const source : library.sources) {
+      output << "  " << TomlString(Quoting::GlobLiteral(source->path)) << ",\n";
     }
     output << "]\n";
   }

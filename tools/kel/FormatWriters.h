@@ -24,7 +24,4 @@ void WriteCMake(std::ostream& output, const SourceList& list);
 // warning if another asks for an older one; empty if none asks.
 std::string OneStandard(const SourceList& list, const char* tool);
 
-// The libraries of the sources, each once, in the order in which each has its first source.
-std::vector<std::string> LibrariesOf(const SourceList& list, std::string Source::*name);
-
 #endif

@@ -8,7 +8,6 @@
 #include <iostream>
 #include <iterator>
 #include <map>
-#include <set>
 #include <sstream>
 
 #include "FormatWriters.h"
@@ -26,6 +25,17 @@ std::string OneLine(const std::string& path) {
 
 std::string OneWord(const std::string& path) {
   return path.find_first_of(" \t") == std::string::npos ? OneLine(path) : "a blank";
+}
+
+std::string MakeItem(const std::string& path) {
+  return path.ends_with('\\') ? "a backslash at its end" : OneWord(path);
+}
+
+// A list is split at semicolons, but not while a bracket is open.
+std::string CMakeItem(const std::string& path) {
+  const auto count = [&](char c) { return std::count(path.begin(), path.end(), c); };
+  if (count('[') != count(']')) return "a bracket without its partner";
+  return path.ends_with('\\') ? "a backslash at its end" : "";
 }
 
 std::string Utf8(const std::string& path) {
@@ -53,8 +63,8 @@ const Format kFormats[] = {
     {"edam", WriteEdam, TakesAll, "", Utf8, "A document for flow generators"},
     {"vhdl_ls", WriteVhdlLs, IsVhdl, "VHDL", Utf8, "The configuration of the VHDL language server"},
     {"tcl", WriteTcl, TakesAll, "", AnyPath, "A script that sets lists of sources and directories"},
-    {"make", WriteMake, TakesAll, "", OneWord, "Variables for a makefile to include"},
-    {"cmake", WriteCMake, TakesAll, "", AnyPath, "Variables for CMake to include"}};
+    {"make", WriteMake, TakesAll, "", MakeItem, "Variables for a makefile to include"},
+    {"cmake", WriteCMake, TakesAll, "", CMakeItem, "Variables for CMake to include"}};
 
 const Format& FormatOf(const std::string& name) {
   return *std::find_if(std::begin(kFormats), std::end(kFormats),
@@ -67,13 +77,13 @@ bool HasRoom(const Format& format, const SourceList& list, bool isMeant) {
   const auto taken = static_cast<std::size_t>(
       std::count_if(list.sources.begin(), list.sources.end(), format.takes));
   if (taken == all) return true;
-  const std::string text =
-      std::string("the format ") + format.name + " is for " + format.language + " only and ";
+  const std::string text = std::string("the format ") + format.name + " is for " + format.language +
+                           " only and leaves out ";
+  const std::string count = std::to_string(all);
   if (taken == 0) {
-    Messages::Error(text + "has no room for any of the " + std::to_string(all) + " sources");
+    Messages::Error(text + (all == 1 ? "the only source" : "all " + count + " sources"));
   } else if (!isMeant) {
-    Messages::Warn(text + "leaves out " + std::to_string(all - taken) + " of " +
-                   std::to_string(all) + " sources");
+    Messages::Warn(text + std::to_string(all - taken) + " of " + count + " sources");
   }
   return taken > 0;
 }
@@ -116,15 +126,6 @@ std::string OneStandard(const SourceList& list, const char* tool) {
                    " wants " + other.standard + ". Choose with --vhdl-standard");
   }
   return chosen.standard;
-}
-
-std::vector<std::string> LibrariesOf(const SourceList& list, std::string Source::*name) {
-  std::vector<std::string> libraries;
-  std::set<std::string> known;
-  for (const Source& source : list.sources) {
-    if (known.insert(source.*name).second) libraries.push_back(source.*name);
-  }
-  return libraries;
 }
 
 Status WriteSources(const SourceList& list, const std::string& format, bool isMeant) {

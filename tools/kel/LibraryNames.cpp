@@ -6,16 +6,19 @@
 #include <algorithm>
 #include <map>
 #include <set>
+#include <unordered_map>
 
 #include "Suggestions.h"
+#include "Tarvo_KelLibrary_Utils.h"
 #include "Text.h"
 
 namespace {
 
 using Tarvo::Kel_Key;
+using Tarvo::KelLibrary_Utils;
 
 // Of each core that has a source in a list, by its key.
-using Names = std::map<std::string, std::string>;
+using Names = std::unordered_map<std::string, std::string>;
 
 std::string BaseName(const std::string& key) { return Text(Kel_Key(key.c_str()).GetName()); }
 
@@ -45,7 +48,8 @@ bool SetName(const std::string& setting, Names& names) {
 
 bool VersionsDiffer(const Names& names) {
   std::map<std::pair<std::string, std::string>, std::string> versions;
-  for (const auto& [key, name] : names) {
+  const std::map<std::string, std::string> sorted(names.begin(), names.end());
+  for (const auto& [key, name] : sorted) {
     const auto [other, isFirst] = versions.try_emplace({BaseName(key), name}, key);
     if (isFirst) continue;
     Messages::Error(other->second + " and " + key + " would both be the library '" + name +
@@ -56,20 +60,13 @@ bool VersionsDiffer(const Names& names) {
   return true;
 }
 
-bool IsIdentifier(const std::string& name) {
-  const auto isLetterOrDigit = [](char c) { return IsPlain(c, ""); };
-  if (name.empty() || !isLetterOrDigit(name.front()) || name.back() == '_') return false;
-  if (name.front() >= '0' && name.front() <= '9') return false;
-  return std::all_of(name.begin(), name.end(), [](char c) { return IsPlain(c, "_"); }) &&
-         name.find("__") == std::string::npos;
-}
-
 void TellOddNames(const SourceList& list) {
-  std::set<std::string> told;
-  for (const Source& source : list.sources) {
-    if (!IsVhdl(source) || IsIdentifier(source.library)) continue;
-    if (!told.insert(source.library).second) continue;
-    Messages::Warn("'" + source.library + "' is no name for a library in VHDL, but " + source.key +
+  for (const Library& library : LibrariesOf(list)) {
+    const auto first = std::find_if(library.sources.begin(), library.sources.end(),
+                                    [](const Source* source) { return IsVhdl(*source); });
+    if (first == library.sources.end()) continue;
+    if (KelLibrary_Utils::IsHdlLibrary(library.name.c_str())) continue;
+    Messages::Warn("'" + library.name + "' is no name for a library in VHDL, but " + (*first)->key +
                    " would have it. Give it another name with --hdl-library KEY=NAME");
   }
 }

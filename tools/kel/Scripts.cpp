@@ -78,7 +78,9 @@ Words PathsOf(const std::vector<Place>& places) {
 
 // The variables of the formats that have nothing else.
 void WriteVariables(const SourceList& list, const WriteVariable& write) {
-  const Words libraries = LibrariesOf(list, &Source::library);
+  const std::vector<Library> libraries = LibrariesOf(list);
+  Words names;
+  for (const Library& library : libraries) names.push_back(library.name);
   Words parameters;
   for (const Setting& parameter : list.parameters) {
     parameters.push_back(parameter.name + "=" + parameter.value);
@@ -91,10 +93,11 @@ void WriteVariables(const SourceList& list, const WriteVariable& write) {
   write("KEL_VERILOG_SOURCES", PathsOf(list, IsVerilog));
   write("KEL_INCLUDE_DIRECTORIES", PathsOf(list.includeDirectories));
   write("KEL_DATA_FILES", PathsOf(list.dataFiles));
-  write("KEL_LIBRARIES", libraries);
-  for (const std::string& library : libraries) {
-    write("KEL_SOURCES_" + library,
-          PathsOf(list, [&](const Source& source) { return source.library == library; }));
+  write("KEL_LIBRARIES", names);
+  for (const Library& library : libraries) {
+    Words paths;
+    for (const Source* const source : library.sources) paths.push_back(source->path);
+    write("KEL_SOURCES_" + library.name, paths);
   }
 }
 

@@ -6,7 +6,8 @@
 #include <algorithm>
 #include <filesystem>
 #include <map>
-#include <set>
+#include <unordered_map>
+#include <unordered_set>
 
 #include "CoreOptions.h"
 #include "LibraryNames.h"
@@ -36,6 +37,11 @@ std::string LanguageOf(const KelSource& source) {
   return isSystem ? "SystemVerilog" : Text(LDXParser::LDX_HDL_VERILOG);
 }
 
+// Places of messages are written as the repository was named, and paths of cores are absolute.
+std::string Normal(const StringBase& path) {
+  return fs::absolute(Text(path)).lexically_normal().string();
+}
+
 // The sources of a core for the purpose of the request. Without the benches of others, what another
 // core lists for simulation alone is left out.
 bool AskForSources(const KelIP& ip, const Request& request, std::vector<KelSource>& sources) {
@@ -45,11 +51,11 @@ bool AskForSources(const KelIP& ip, const Request& request, std::vector<KelSourc
   if (isSynthesis || request.Value("--benches") == "all") return true;
   std::vector<KelSource> synthesised;
   if (!Ask(ip, &KelIP::GetSynthesisSources, "sources", synthesised)) return false;
-  std::set<std::string> kept;
+  std::unordered_set<std::string> kept;
   for (const KelSource& source : synthesised) kept.insert(Text(source.path));
-  const std::string own = Text(ip.GetLocation()) + "/";
+  const std::string own = Normal(ip.GetLocation()) + "/";
   std::erase_if(sources, [&](const KelSource& source) {
-    return kept.count(Text(source.path)) == 0 && !Text(source.place.file).starts_with(own);
+    return kept.count(Text(source.path)) == 0 && !Normal(source.place.file).starts_with(own);
   });
   return true;
 }
@@ -117,8 +123,8 @@ class Collection {
   const CoreOptions& options;
   const Request& request;
   SourceList& list;
-  std::set<std::string> known;
-  std::set<std::string> knownDirectories;
+  std::unordered_set<std::string> known;
+  std::unordered_set<std::string> knownDirectories;
   std::map<std::string, std::string> standards;  // what descriptions say, by key
 };
 
@@ -150,14 +156,13 @@ bool SetParameters(const KelIP& ip, const Request& request, SourceList& list) {
 // Files that are no sources, of each core that is here.
 void AddDataFiles(const CoreOptions& options, const Tarvo::KelLibrary& library,
                   const Request& request, SourceList& list) {
-  std::set<std::string> cores;
-  std::vector<std::string> keys;
-  for (const Source& source : list.sources) keys.push_back(source.key);
-  keys.insert(keys.end(), list.keys.begin(), list.keys.end());
-  for (const std::string& key : keys) {
-    if (!cores.insert(key).second) continue;
+  std::vector<std::string> cores = CoresOf(list);
+  for (const std::string& key : list.keys) {
+    if (std::find(cores.begin(), cores.end(), key) == cores.end()) cores.push_back(key);
+  }
+  for (const std::string& key : cores) {
     for (const std::string& name : options.Values(key, "DATA_FILES")) {
-      const std::string location = Text(library.GetLocation(key.c_str())) + "/" + name;
+      const std::string location = fs::path(Text(library.GetLocation(key.c_str()))) / name;
       list.dataFiles.push_back(
           {RelativeTo(request.Value("--relative-to"), location.c_str()), location});
     }
@@ -169,6 +174,26 @@ void AddDataFiles(const CoreOptions& options, const Tarvo::KelLibrary& library,
 bool IsVhdl(const Source& source) { return source.language == "VHDL"; }
 
 bool IsVerilog(const Source& source) { return source.language.ends_with("Verilog"); }
+
+std::vector<std::string> CoresOf(const SourceList& list) {
+  std::vector<std::string> cores;
+  std::unordered_set<std::string> known;
+  for (const Source& source : list.sources) {
+    if (known.insert(source.key).second) cores.push_back(source.key);
+  }
+  return cores;
+}
+
+std::vector<Library> LibrariesOf(const SourceList& list) {
+  std::vector<Library> libraries;
+  std::unordered_map<std::string, std::size_t> known;
+  for (const Source& source : list.sources) {
+    const auto [place, isNew] = known.try_emplace(source.library, libraries.size());
+    if (isNew) libraries.push_back({source.library, {}});
+    libraries[place->second].sources.push_back(&source);
+  }
+  return libraries;
+}
 
 Choices LibraryNamings() {
   return {{"option", "The option HDL_LIBRARY of its core, or else its key"},

@@ -41,6 +41,18 @@ struct SourceList {
 bool IsVhdl(const Source& source);
 bool IsVerilog(const Source& source);
 
+// The keys of the cores that have a source, in the order in which each has its first one.
+std::vector<std::string> CoresOf(const SourceList& list);
+
+// A library by its logical name, with its sources.
+struct Library {
+  std::string name;
+  std::vector<const Source*> sources;
+};
+
+// The libraries, in the order in which each has its first source. They are good while the list is.
+std::vector<Library> LibrariesOf(const SourceList& list);
+
 // The values of the words that say how the list is made.
 Choices LibraryNamings();
 Choices VhdlStandards();

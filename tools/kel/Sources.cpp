@@ -1,9 +1,10 @@
 // The verb `sources`: the library's order, handed to one of the formats.
 
-#include <filesystem>
+#include <utility>
 
 #include "Arguments.h"
 #include "Formats.h"
+#include "MissingFiles.h"
 #include "SourceList.h"
 #include "Text.h"
 
@@ -11,15 +12,13 @@ namespace {
 
 constexpr std::size_t kMostNamed = 10;
 
+// Words that mean something to one format.
+constexpr std::pair<const char*, const char*> kWordsOfFormats[] = {{"--run", "ghdl"},
+                                                                   {"--tool", "edam"}};
+
 // Names sources and data files that are not there. False for one of these.
 bool AreThere(const SourceList& list, bool isError) {
-  std::vector<std::string> missing;
-  const auto look = [&](const std::string& path, const std::string& location) {
-    std::error_code error;
-    if (!std::filesystem::exists(location, error)) missing.push_back(path);
-  };
-  for (const Source& source : list.sources) look(source.path, source.location);
-  for (const Place& file : list.dataFiles) look(file.path, file.location);
+  const std::vector<std::string> missing = MissingFiles(list);
   if (missing.empty()) return true;
   std::string text = std::to_string(missing.size()) + " listed files do not exist:";
   if (missing.size() == 1) text = "a listed file does not exist:";
@@ -37,11 +36,10 @@ void WriteRawPaths(const SourceList& list) {
 
 Status Sources(const Tarvo::KelLibrary& library, const Request& request) {
   const std::string format = request.Value("--format");
-  if (request.Has("--run") && format != "ghdl") {
-    return Refuse("--run is for --format ghdl", request.verb);
-  }
-  if (request.Has("--tool") && format != "edam") {
-    return Refuse("--tool is for --format edam", request.verb);
+  for (const auto& [word, itsFormat] : kWordsOfFormats) {
+    if (request.Has(word) && format != itsFormat) {
+      return Refuse(std::string(word) + " is for --format " + itsFormat, request.verb);
+    }
   }
   const std::optional<SourceList> list = MakeSourceList(library, request);
   if (!list) return StatusFindings;
