@@ -5,6 +5,7 @@
 #include "Tarvo_DescriptionChecker.h"
 
 #include <algorithm>
+#include <boost/filesystem.hpp>
 #include <map>
 #include <set>
 #include <string>
@@ -12,6 +13,7 @@
 #include <utility>
 
 #include "Port_Input.h"
+#include "Tarvo_Existence.h"
 #include "Tarvo_FileScanner.h"
 #include "Tarvo_KelIP.h"
 #include "Tarvo_KelLibrary_Utils.h"
@@ -50,6 +52,8 @@ const Choice kChoices[] = {
     {QVRStatement::Port, false, "ENDIAN", {"BIG", "LITTLE"}},
     {QVRStatement::Port, true, "SIGIS", {"CLK", "RST", "INTERRUPT"}}};
 
+const char* const kDataFiles = "DATA_FILES";
+
 // An option that takes any name of a kind.
 struct Named {
   const char* key;
@@ -69,7 +73,7 @@ const Named kNamed[] = {
 // The options of cores that mean something to the library, or to the command alone.
 StringList NamesOfOptions() {
   StringList names = NamesOf(KnownProperties::OfCores());
-  for (const char* const name : {"DATA_FILES", "HDL_LIBRARY", "TOP", "VHDL_STANDARD"}) {
+  for (const char* const name : {kDataFiles, "HDL_LIBRARY", "TOP", "VHDL_STANDARD"}) {
     names.emplace_back(name);
   }
   return names;
@@ -114,6 +118,11 @@ bool IsGoneOn(const QVRStatement::List& list) {
   const auto between = list.rest.data() - (value.data() + value.size());
   const bool isQuote = between == 1 && *(list.rest.data() - 1) != ' ';
   return (between == 0 || isQuote) && list.rest.find_first_of(",;)]") != 0;
+}
+
+std::string_view Trimmed(std::string_view text) {
+  text.remove_prefix(std::min(text.find_first_not_of(' '), text.size()));
+  return text.substr(0, text.find_last_not_of(' ') + 1);
 }
 
 // How far such a rest goes on: up to a blank or a comma outside of quotes and brackets. An
@@ -161,6 +170,7 @@ class DescriptionChecker {
   void CheckKeyword(Text line);
   bool CheckScanned(Text line);
   void CheckOption(Text line);
+  void CheckDataFiles(Text files) const;
   void CheckList(QVRStatement::Keyword keyword, Text line);
   void CheckEnd(const QVRStatement::List& list);
   void TellGoneOn(const QVRStatement::List& list);
@@ -261,6 +271,7 @@ void DescriptionChecker::CheckOption(Text line) {
         Text(whole.value.data(), static_cast<std::size_t>(line.end() - whole.value.begin()));
   }
   CheckValue(QVRStatement::Option, whole);
+  if (stated.first == kDataFiles) CheckDataFiles(whole.value);
   if (stated.first == KelIP::KEL_LANGUAGE_OPTION_NAME) core.language = stated.second;
   if (stated.first != KelIP::KEL_STYLE_OPTION_NAME) return;
   const bool isMix = EqualsIgnoringCase(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_MIX);
@@ -268,6 +279,19 @@ void DescriptionChecker::CheckOption(Text line) {
   core.hasNetlists =
       isMix || EqualsIgnoringCase(stated.second, KelIP::KEL_STYLE_OPTION_VALUE_BLACKBOX);
   core.isStyleKnown = core.hasSources || core.hasNetlists;
+}
+
+// They lie below the directory of the core, and the description in a directory there.
+void DescriptionChecker::CheckDataFiles(Text files) const {
+  const boost::filesystem::path location =
+      boost::filesystem::path(name.GetText()).parent_path().parent_path();
+  while (!files.empty()) {
+    const std::size_t end = std::min(files.find(','), files.size());
+    const Text file = Trimmed(files.substr(0, end));
+    files.remove_prefix(std::min(end + 1, files.size()));
+    if (file.empty() || MayExist(Port::FileName((location / std::string(file)).c_str()))) continue;
+    Tell(Codes::kMissingDataFile, file, Say({"data file does not exist: ", file}));
+  }
 }
 
 void DescriptionChecker::CheckList(QVRStatement::Keyword keyword, Text line) {

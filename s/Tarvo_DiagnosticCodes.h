@@ -83,6 +83,9 @@ inline constexpr Code kListEnds{
     "list-ends", kWarning, "list that ends before the line does",
     "A list ends at the first word without a comma before it, and the rest of the line is ignored. "
     "A value of several words needs quotes or brackets."};
+inline constexpr Code kMissingDataFile{
+    "missing-data-file", kError, "data file does not exist",
+    "The option DATA_FILES names files below the directory of the core, with commas between."};
 inline constexpr Code kMissingDescription{
     "missing-description", kError, "core without a description",
     "A version is listed only if data/NAME_v2_1_0.qvr is there; NAME is the core's base name."};
@@ -167,6 +170,7 @@ inline constexpr const Code* kAll[] = {&kBadEntry,
                                        &kLanguageMismatch,
                                        &kLanguageNotAllowed,
                                        &kListEnds,
+                                       &kMissingDataFile,
                                        &kMissingDescription,
                                        &kMissingIncludeDirectory,
                                        &kMissingNetlist,
