@@ -104,7 +104,7 @@ std::string NoVerb(const std::string& word) {
 std::string Contradiction(const Request& request) {
   std::vector<std::string> forms;
   for (const char* const form : {"--json", "--null", "--table"}) {
-    if (request.Has(form)) forms.push_back(form);
+    if (request.Has(form)) forms.emplace_back(form);
   }
   const std::string format = request.Value("--format");
   const std::string own = request.Has("--json") ? "json" : "list";
@@ -125,7 +125,7 @@ std::string Fault(const CLI::App& app, const Request& request) {
   // Behind a verb, or an option that nobody knows.
   if (!extras.empty()) return "unexpected argument '" + extras.front() + "'";
   if (verb == nullptr) return "a verb is required: " + Join(NamesOf(ChoicesOf(Verbs())));
-  const std::string contradiction = Contradiction(request);
+  std::string contradiction = Contradiction(request);
   if (!contradiction.empty()) return contradiction;
   if (verb->reads == Verb::Nothing) return "";
   if (!request.Has("--library")) return "-L DIR is required; it names a repository";

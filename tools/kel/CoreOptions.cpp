@@ -22,7 +22,7 @@ CoreOptions::CoreOptions(const Tarvo::KelLibrary& theLibrary) : library(theLibra
 
 std::string CoreOptions::Value(const std::string& key, const char* option) const {
   Tarvo::StringBase value;
-  if (keys.count(key) > 0) library.GetIPProperty(key.c_str(), option, value);
+  if (keys.contains(key)) library.GetIPProperty(key.c_str(), option, value);
   return Trimmed(Text(value));
 }
 

@@ -1,12 +1,12 @@
 // Formats that are JSON.
 
 #include <algorithm>
-#include <cctype>
 #include <filesystem>
 #include <map>
 
 #include "FormatWriters.h"
 #include "IncludeFiles.h"
+#include "Text.h"
 
 namespace {
 
@@ -81,9 +81,7 @@ Json EdamParameter(const std::string& value, bool isVhdl) {
   const std::size_t digits = value.starts_with('-') ? 1 : 0;
   const bool isNumber = value.size() > digits && value.size() < 19 &&
                         value.find_first_not_of("0123456789", digits) == std::string::npos;
-  std::string lower = value;
-  std::transform(lower.begin(), lower.end(), lower.begin(),
-                 [](unsigned char c) { return std::tolower(c); });
+  const std::string lower = Lower(value);
   if (isNumber) return {{"datatype", "int"}, {"default", std::stoll(value)}, {"paramtype", type}};
   if (lower == "true" || lower == "false") {
     return {{"datatype", "bool"}, {"default", lower == "true"}, {"paramtype", type}};

@@ -1,5 +1,6 @@
 // Formats that are lists of files: for people, for Verilog tools and for an editor.
 
+#include <algorithm>
 #include <map>
 
 #include "FormatWriters.h"
@@ -45,9 +46,13 @@ void WriteList(std::ostream& output, const SourceList& list) {
   table.Write(output);
 }
 
-// The tools that read this have no common word for a top, so it is a comment for people.
+// The tools that read this have no common words for all that, so it is in comments for people.
 void WriteFileList(std::ostream& output, const SourceList& list) {
   if (list.isTopGiven) output << "// top " << list.top << '\n';
+  const bool isSystem =
+      std::any_of(list.sources.begin(), list.sources.end(),
+                  [](const Source& source) { return source.language == "SystemVerilog"; });
+  if (isSystem) output << "// SystemVerilog, for which some tools want -g2012 or -sv\n";
   WriteVerilogFiles(output, list);
 }
 

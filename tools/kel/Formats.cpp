@@ -88,6 +88,14 @@ bool HasRoom(const Format& format, const SourceList& list, bool isMeant) {
   return taken > 0;
 }
 
+bool CanHold(const Format& format, const std::string& path) {
+  const std::string fault = format.fault(path);
+  if (fault.empty()) return true;
+  Messages::Error(std::string("the format ") + format.name + " can't hold " + fault +
+                  ", which this path has: " + path);
+  return false;
+}
+
 bool CanHoldPaths(const Format& format, const SourceList& list) {
   std::vector<std::string> paths;
   for (const Source& source : list.sources) {
@@ -97,11 +105,7 @@ bool CanHoldPaths(const Format& format, const SourceList& list) {
   for (const Place& file : list.dataFiles) paths.push_back(file.path);
   bool isGood = true;
   for (const std::string& path : paths) {
-    const std::string fault = format.fault(path);
-    if (fault.empty()) continue;
-    isGood = false;
-    Messages::Error(std::string("the format ") + format.name + " can't hold " + fault +
-                    ", which this path has: " + path);
+    if (!CanHold(format, path)) isGood = false;
   }
   return isGood;
 }

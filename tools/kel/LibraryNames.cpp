@@ -46,6 +46,15 @@ bool SetName(const std::string& setting, Names& names) {
   return false;
 }
 
+// VHDL knows no letter case, so the first spelling of a name is that of all.
+void SpellAlike(const SourceList& list, Names& names) {
+  std::unordered_map<std::string, std::string> spellings;
+  for (const std::string& key : CoresOf(list)) {
+    std::string& name = names[key];
+    name = spellings.try_emplace(Lower(name), name).first->second;
+  }
+}
+
 bool VersionsDiffer(const Names& names) {
   std::map<std::pair<std::string, std::string>, std::string> versions;
   const std::map<std::string, std::string> sorted(names.begin(), names.end());
@@ -84,6 +93,7 @@ bool NameLibraries(const CoreOptions& options, const Request& request, SourceLis
   for (const std::string& setting : request.Values("--hdl-library")) {
     if (!SetName(setting, names)) return false;
   }
+  SpellAlike(list, names);
   if (!VersionsDiffer(names)) return false;
   for (Source& source : list.sources) source.library = names[source.key];
   list.topLibrary = names[list.keys.front()];

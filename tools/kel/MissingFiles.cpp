@@ -35,7 +35,7 @@ class Presence {
     std::error_code error;
     fs::directory_iterator entry(path, error);
     while (!error && entry != fs::directory_iterator() && directory.names.size() < kMostNames) {
-      if (entry->is_regular_file(error) && !entry->is_symlink(error)) {
+      if (!entry->is_symlink(error) && entry->is_regular_file(error)) {
         directory.names.insert(entry->path().filename());
       }
       if (!error) entry.increment(error);

@@ -54,7 +54,7 @@ void WriteGhdlRun(std::ostream& output, const SourceList& list, const std::strin
   for (const Setting& parameter : list.parameters) {
     output << ' ' << ShellWord("-g" + parameter.name + "=" + parameter.value);
   }
-  output << '\n';
+  output << " \"$@\"\n";
 }
 
 using Words = std::vector<std::string>;
@@ -105,8 +105,9 @@ void WriteVariables(const SourceList& list, const WriteVariable& write) {
 
 // GHDL takes VHDL alone. What users state of their own counts more, since it stands behind.
 void WriteGhdl(std::ostream& output, const SourceList& list) {
-  output << "#!/bin/sh\n# Analyses into the current directory; GHDL_FLAGS go to every call.\n"
-            "set -e\n";
+  output << "#!/bin/sh\n# Analyses into the current directory; GHDL_FLAGS go to every call.\n";
+  if (list.hasRun) output << "# The words of this script go to the run, such as --stop-time=1us.\n";
+  output << "set -e\n";
   const std::string standard = OneStandard(list, "GHDL");
   const std::string flags = (standard.empty() ? "" : "--std=" + standard + " ") + "$GHDL_FLAGS ";
   GhdlCalls calls(output, flags);
@@ -127,6 +128,10 @@ void WriteTcl(std::ostream& output, const SourceList& list) {
   output << "set kel_include_directories {}\n";
   for (const Place& directory : list.includeDirectories) {
     output << "lappend kel_include_directories " << TclWord(directory.path) << '\n';
+  }
+  if (!list.dataFiles.empty()) output << "set kel_data_files {}\n";
+  for (const Place& file : list.dataFiles) {
+    output << "lappend kel_data_files " << TclWord(file.path) << '\n';
   }
 }
 

@@ -16,16 +16,15 @@ constexpr std::size_t kMostNamed = 10;
 constexpr std::pair<const char*, const char*> kWordsOfFormats[] = {{"--run", "ghdl"},
                                                                    {"--tool", "edam"}};
 
-// Names sources and data files that are not there. False for one of these.
-bool AreThere(const SourceList& list, bool isError) {
+// Names sources and data files that are not there.
+void TellMissing(const SourceList& list, bool isError) {
   const std::vector<std::string> missing = MissingFiles(list);
-  if (missing.empty()) return true;
+  if (missing.empty()) return;
   std::string text = std::to_string(missing.size()) + " listed files do not exist:";
   if (missing.size() == 1) text = "a listed file does not exist:";
   for (std::size_t i = 0; i < missing.size() && i < kMostNamed; ++i) text += "\n" + missing[i];
   if (missing.size() > kMostNamed) text += "\nand others";
   isError ? Messages::Error(text) : Messages::Warn(text);
-  return false;
 }
 
 void WriteRawPaths(const SourceList& list) {
@@ -43,14 +42,10 @@ Status Sources(const Tarvo::KelLibrary& library, const Request& request) {
   }
   const std::optional<SourceList> list = MakeSourceList(library, request);
   if (!list) return StatusFindings;
-  const bool mustBeThere = request.Has("--check-files");
-  const bool areThere = AreThere(*list, mustBeThere);
-  if (request.Has("--null")) {
-    WriteRawPaths(*list);
-  } else if (const Status status = WriteSources(*list, format, request.Has("--language"))) {
-    return status;
-  }
-  return areThere || !mustBeThere ? StatusClean : StatusFindings;
+  TellMissing(*list, request.Has("--check-files"));
+  if (!request.Has("--null")) return WriteSources(*list, format, request.Has("--language"));
+  WriteRawPaths(*list);
+  return StatusClean;
 }
 
 Choices Purposes() { return {{"synthesis"}, {"simulation"}}; }
@@ -69,7 +64,7 @@ std::vector<Word> Words() {
            .choices = SourceFormats},
           {.name = "--top",
            .value = "NAME",
-           .help = "The top unit; else the option TOP of the core, or its bare name"},
+           .help = "The top unit; else the option TOP of the first core, or its bare name"},
           SetWord("Sets a parameter or generic of the top; may be repeated"),
           {.name = "--run", .help = "Have the script of --format ghdl run the top"},
           {.name = "--tool",

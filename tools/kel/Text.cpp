@@ -85,6 +85,11 @@ bool IsPlain(char character, std::string_view others) {
          others.find(character) != std::string_view::npos;
 }
 
+std::string Lower(std::string text) {
+  for (char& c : text) c = c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+  return text;
+}
+
 std::string Hex(char byte) {
   constexpr std::string_view digits = "0123456789abcdef";
   const auto number = static_cast<unsigned char>(byte);

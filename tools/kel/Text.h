@@ -17,6 +17,9 @@ std::string Printable(std::string_view text, bool isControl = false);
 // Whether a character is a letter or digit of ASCII, or one of the others.
 bool IsPlain(char character, std::string_view others);
 
+// In small letters, as far as ASCII goes.
+std::string Lower(std::string text);
+
 // A byte as two hexadecimal digits.
 std::string Hex(char byte);
 
