@@ -155,6 +155,7 @@ def ghdl_calls(document, scratch):
     for call in calls:
         words = [word for word in call.split("\0") if not word.startswith("--std=")]
         expect(words[:3], ["-a", "-x", "-y"], "the words of a call")
+        expect(len(call.encode()) < 101_000, True, "a call that a system takes")
         yield from ((words[3].removeprefix("--work="), "VHDL", path) for path in words[4:])
 
 
@@ -262,6 +263,7 @@ def odd_paths(folder, scratch):
         wanted.append((core, language, str(path)))
     (home / "hdl/in c'lude").mkdir()
     (home / "hdl/in c'lude/odd.vh").write_text("// nothing\n")
+    (home / "hdl/in c'lude/again").symlink_to(".")
     (home / "data").mkdir()
     (home / "data/odd_v2_1_0.qvr").write_text("OPTION HDL = BOTH\nOPTION STYLE = HDL\n")
     (home / "data/odd_v2_1_0.ldx").write_text("".join(order))
@@ -270,6 +272,18 @@ def odd_paths(folder, scratch):
     if "\n" not in folder:
         (scratch / "odd.f").write_text(sources(repository, core, "synthesis", "f"))
         run("verilator", "--lint-only", "-f", "odd.f", cwd=scratch)
+
+
+def long_order(scratch):
+    """More sources than one call takes."""
+    data = scratch / "ipmods/long_v1_00_a/data"
+    data.mkdir(parents=True)
+    names = [f"{i:0100}.vhd" for i in range(1500)]
+    (data / "long_v2_1_0.qvr").write_text("OPTION HDL = VHDL\n")
+    (data / "long_v2_1_0.ldx").write_text("".join(f"lib long {name}\n" for name in names))
+    script = sources(scratch, "long_v1_00_a", "synthesis", "ghdl", "--relative-to", data.parent / "hdl/vhdl")
+    expect([path for _, _, path in ghdl_calls(script, scratch)], names, "the sources")
+    expect(script.count("ghdl -a"), 2, "the calls")
 
 
 def terminal(scratch):
@@ -359,6 +373,7 @@ def main():
     check("netlists", netlists)
     check("odd paths", odd_paths, "o'd \"d\" $x [y] {z} #\\t")
     check("odd paths with a line break", odd_paths, "new\nline")
+    check("a long order", long_order)
     check("findings", findings)
     check("terminal", terminal)
     benches = [sum(results) for results in ran.values()]
