@@ -27,7 +27,7 @@ import sys
 import tempfile
 
 ROOT = pathlib.Path(__file__).resolve().parent.parent
-DOCUMENTS = ["README.md", "docs/guide.md", "docs/formats.md", "docs/kel.1"]
+DOCUMENTS = ["README.md", "docs/guide.md", "docs/formats.md", "docs/adopting.md", "docs/kel.1"]
 TRANSCRIPTS = sorted(str(path.relative_to(ROOT)) for path in ROOT.glob("tests/transcripts/*.md"))
 SHOWN_ROOT = "/home/me/kel"
 # A command and what it prints, in a `console` block.
@@ -128,9 +128,9 @@ def document_faults(name, environment):
         write_files(text, pathlib.Path(scratch))
         shows_files = any(pathlib.Path(scratch).iterdir())
         if shows_files and name in DOCUMENTS:
-            # All is well but for the sources and netlists, which a document doesn't hold.
+            # All is well but for the files that a document doesn't hold.
             findings = run("kel -L . check", environment, scratch).splitlines()[:-1]
-            bad = [finding for finding in findings if not re.search(r"\[missing-(source|netlist)\]", finding)]
+            bad = [finding for finding in findings if not re.search(r"\[missing-(source|netlist|data-file|include-directory)\]", finding)]
             if bad or not findings:
                 yield f"{name}: its files are not good:\n{bad}"
         yield from console_faults(name, text, environment, scratch if shows_files else ROOT)
