@@ -57,7 +57,10 @@ void OrderChecker::Check(const FileName& file, const Kel_Key& key, const StringB
     return;
   }
   // An order that is empty only because its entries are bad is told for those.
-  const bool isGood = DiagnosticCollector::GetCurrent()->found.size() == before;
+  const auto& found = DiagnosticCollector::GetCurrent()->found;
+  const bool isGood =
+      std::all_of(found.begin() + static_cast<std::ptrdiff_t>(before), found.end(),
+                  [](const KelDiagnostic& one) { return one.code == Codes::kIgnoredPurpose.code; });
   // Mostly the same list twice. What is found twice is told once, at the end of the check.
   CheckSources(order.GetSynthesis());
   CheckSources(order.GetSimulation());
