@@ -55,15 +55,19 @@ void SpellAlike(const SourceList& list, Names& names) {
   }
 }
 
+void TellClash(const std::string& key, const std::string& other, const std::string& name) {
+  Messages::Error(key + " and " + other + " would both be the library '" + name +
+                  "'. Give one of them another name with --hdl-library KEY=NAME, or call "
+                  "libraries by their keys with --library-names key");
+}
+
 bool VersionsDiffer(const Names& names) {
   std::map<std::pair<std::string, std::string>, std::string> versions;
   const std::map<std::string, std::string> sorted(names.begin(), names.end());
   for (const auto& [key, name] : sorted) {
     const auto [other, isFirst] = versions.try_emplace({BaseName(key), name}, key);
     if (isFirst) continue;
-    Messages::Error(other->second + " and " + key + " would both be the library '" + name +
-                    "'. Give one of them another name with --hdl-library KEY=NAME, or call "
-                    "libraries by their keys with --library-names key");
+    TellClash(other->second, key, name);
     return false;
   }
   return true;

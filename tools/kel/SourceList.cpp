@@ -55,7 +55,7 @@ bool AskForSources(const KelIP& ip, const Request& request, std::vector<KelSourc
   for (const KelSource& source : synthesised) kept.insert(Text(source.path));
   const std::string own = Normal(ip.GetLocation()) + "/";
   std::erase_if(sources, [&](const KelSource& source) {
-    return kept.count(Text(source.path)) == 0 && !Normal(source.place.file).starts_with(own);
+    return !kept.contains(Text(source.path)) && !Normal(source.place.file).starts_with(own);
   });
   return true;
 }
@@ -110,7 +110,7 @@ class Collection {
   }
 
   std::string StatedStandard(const std::string& key) const {
-    const std::string stated = options.Value(key, "VHDL_STANDARD");
+    std::string stated = options.Value(key, "VHDL_STANDARD");
     const std::vector<std::string> choices = NamesOf(VhdlStandards());
     if (std::find(choices.begin(), choices.end(), stated) != choices.end()) return stated;
     if (!stated.empty()) {
