@@ -32,6 +32,10 @@ std::string OwnName(const CoreOptions& options, const std::string& key, const st
 bool SetName(const std::string& setting, Names& names) {
   const std::size_t equals = setting.find('=');
   const std::string core = setting.substr(0, equals);
+  if (equals + 1 == setting.size()) {
+    Messages::Error("--hdl-library gives '" + core + "' no name");
+    return false;
+  }
   std::set<std::string> known;
   bool isSet = false;
   for (auto& [key, name] : names) {
