@@ -40,7 +40,8 @@ expect_ports() { # PROGRAM
 }
 
 expect_command() { # KEL
-  [ "$("$1" -L examples/repository list | wc -l)" -eq 9 ]
+  diff <("$1" -L examples/repository list | cut -f 1 | sed 's/_v[0-9].*//') \
+    <(printf '%s\n' examples/repository/ipmods/* | sed 's/.*\///; s/_v[0-9].*//' | sort -u)
 }
 
 say "packages"
